@@ -1,0 +1,34 @@
+#include "cli/cli_context.h"
+
+#include "app/install_root.h"
+#include "platform/files.h"
+
+#include <unistd.h>
+
+namespace kori::cli {
+
+CliContext::CliContext() = default;
+CliContext::~CliContext() = default;
+
+app::Session& CliContext::OpenSession(bool mustExist) {
+    if (m_session) return *m_session;
+    const auto rootPath = app::FindInstallRoot(root);
+    if (mustExist && !platform::FileExists(rootPath / "Kori.ini")) {
+        throw CliError{"No library at " + rootPath.string() +
+                       " (no Kori.ini). Make one with: kori init --sample --root " +
+                       rootPath.string()};
+    }
+    m_dialogs = std::make_unique<platform::ConsoleDialogs>(::isatty(0) != 0);
+    m_progress = std::make_unique<platform::TerminalProgress>();
+    m_settings = std::make_unique<platform::SettingsStore>(rootPath / "settings.ini");
+    m_session = std::make_unique<app::Session>(
+        rootPath, platform::Services{*m_dialogs, *m_progress, *m_settings, m_clock});
+    m_session->ReadFolders();
+    if (data) {
+        m_session->folders.DataFolder = platform::FolderWithSlash(*data);
+        m_session->folders.IndicesFolder = m_session->folders.DataFolder;
+    }
+    return *m_session;
+}
+
+} // namespace kori::cli

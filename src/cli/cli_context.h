@@ -1,0 +1,48 @@
+#pragma once
+// What every subcommand of the kori tool shares: the global options and the session they open.
+#include "app/session.h"
+#include "platform/clock.h"
+#include "platform/dialogs.h"
+#include "platform/progress.h"
+#include "platform/settings_store.h"
+
+#include <memory>
+#include <optional>
+#include <string>
+
+namespace CLI {
+class App;
+}
+
+namespace kori::cli {
+
+// Thrown by a subcommand to end with a message on standard error and a non-zero exit.
+struct CliError {
+    std::string message;
+    int exitCode = 1;
+};
+
+class CliContext {
+public:
+    CliContext();
+    ~CliContext();
+
+    std::optional<std::string> root; // --root
+    std::optional<std::string> data; // --data
+
+    // Opens the session over the install root. With `mustExist`, a root without Kori.ini is an
+    // error that tells the user how to make one.
+    app::Session& OpenSession(bool mustExist = true);
+
+private:
+    std::unique_ptr<platform::ConsoleDialogs> m_dialogs;
+    std::unique_ptr<platform::TerminalProgress> m_progress;
+    std::unique_ptr<platform::SettingsStore> m_settings;
+    platform::SystemClock m_clock;
+    std::unique_ptr<app::Session> m_session;
+};
+
+// One function per subcommand; each adds itself to the app.
+void AddInitCommand(CLI::App& app, CliContext& ctx);
+
+} // namespace kori::cli

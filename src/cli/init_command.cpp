@@ -1,0 +1,36 @@
+#include "cli/cli_context.h"
+
+#include "app/session.h"
+#include "platform/files.h"
+
+#include <CLI/CLI.hpp>
+
+#include <iostream>
+#include <memory>
+
+namespace kori::cli {
+
+void AddInitCommand(CLI::App& app, CliContext& ctx) {
+    auto* cmd = app.add_subcommand("init", "Create the install root, Kori.ini and folders");
+    auto sample = std::make_shared<bool>(false);
+    cmd->add_flag("--sample", *sample, "Also make the invented sample library");
+    cmd->callback([&ctx, sample] {
+        auto& session = ctx.OpenSession(false);
+        const auto& f = session.folders;
+        for (const auto& folder : {f.SystemFolder, f.DataFolder, f.PFMData, f.ChartBackupFolder,
+                                   f.PFMBackUp, f.DownloadFolder, f.ChtMiscFolder, f.ChtSaveFolder})
+            if (!platform::CreateFolder(folder)) throw CliError{"Cannot create " + folder};
+        auto& ini = session.ini();
+        ini.Write("KoriPaths", "System", f.SystemFolder);
+        ini.Write("KoriPaths", "ChtData", f.DataFolder);
+        ini.Write("KoriPaths", "ChtBackUp", f.ChartBackupFolder);
+        ini.Write("KoriPaths", "PFMData", f.PFMData);
+        ini.Write("KoriPaths", "PFMBackUp", f.PFMBackUp);
+        ini.Write("Download", "DLPath", f.DownloadFolder);
+        ini.Write("KoriDisk", "KoriDrv", "OK");
+        if (*sample) throw CliError{"the sample library is not built yet"};
+        std::cout << "Install root ready at " << session.root().string() << "\n";
+    });
+}
+
+} // namespace kori::cli

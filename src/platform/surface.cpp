@@ -1,0 +1,69 @@
+#include "platform/surface.h"
+
+#include <cstdio>
+
+namespace kori::platform {
+
+namespace {
+std::string Num(double v) {
+    char buf[32];
+    std::snprintf(buf, sizeof buf, "%g", v);
+    return buf;
+}
+std::string Four(const char* name, double a, double b, double c, double d, Colour col) {
+    return std::string(name) + " " + Num(a) + "," + Num(b) + "," + Num(c) + "," + Num(d) + " #" +
+           std::to_string(col);
+}
+const char* StyleName(LineStyle s) {
+    switch (s) {
+    case LineStyle::Solid: return "solid";
+    case LineStyle::Dash: return "dash";
+    case LineStyle::Dot: return "dot";
+    }
+    return "?";
+}
+} // namespace
+
+void RecordingSurface::Clear() { Add("Clear #" + std::to_string(m_back)); }
+void RecordingSurface::SetBackColour(Colour c) { m_back = c; }
+void RecordingSurface::SetLineWidth(int width) {
+    m_lineWidth = width;
+    Add("Width " + std::to_string(width));
+}
+void RecordingSurface::SetLineStyle(LineStyle style) {
+    m_style = style;
+    Add(std::string("Style ") + StyleName(style));
+}
+void RecordingSurface::SetForeColour(Colour c) { m_fore = c; }
+void RecordingSurface::Line(double x1, double y1, double x2, double y2, Colour c) {
+    Add(Four("Line", x1, y1, x2, y2, c));
+}
+void RecordingSurface::Box(double x1, double y1, double x2, double y2, Colour c) {
+    Add(Four("Box", x1, y1, x2, y2, c));
+}
+void RecordingSurface::FilledBox(double x1, double y1, double x2, double y2, Colour c) {
+    Add(Four("FilledBox", x1, y1, x2, y2, c));
+}
+void RecordingSurface::Point(double x, double y, Colour c) {
+    Add("Point " + Num(x) + "," + Num(y) + " #" + std::to_string(c));
+}
+void RecordingSurface::SetFontName(std::string_view name) { m_fontName = name; }
+void RecordingSurface::SetFontSize(double points) { m_fontSize = points; }
+void RecordingSurface::SetFontBold(bool bold) { m_bold = bold; }
+void RecordingSurface::SetFontItalic(bool italic) { m_italic = italic; }
+void RecordingSurface::SetTextPosition(double x, double y) {
+    m_textX = x;
+    m_textY = y;
+}
+void RecordingSurface::PrintText(std::string_view text) {
+    Add("Text " + Num(m_textX) + "," + Num(m_textY) + " size " + Num(m_fontSize) +
+        (m_bold ? " bold" : "") + (m_italic ? " italic" : "") + " #" + std::to_string(m_fore) +
+        " [" + std::string(text) + "]");
+    m_textY += TextHeight(text);
+}
+double RecordingSurface::TextWidth(std::string_view text) {
+    return 0.6 * m_fontSize * static_cast<double>(text.size());
+}
+double RecordingSurface::TextHeight(std::string_view) { return 1.5 * m_fontSize; }
+
+} // namespace kori::platform

@@ -1,0 +1,44 @@
+#include "platform/text.h"
+
+#include <gtest/gtest.h>
+
+using namespace kori::platform;
+
+TEST(Text, StrGivesTheClassicLeadingBlankAndNoLeadingZero) {
+    EXPECT_EQ(Str(5), " 5");
+    EXPECT_EQ(Str(-5), "-5");
+    EXPECT_EQ(Str(0), " 0");
+    EXPECT_EQ(Str(0.5), " .5");
+    EXPECT_EQ(Str(-0.25), "-.25");
+    EXPECT_EQ(Str(123.456), " 123.456");
+    EXPECT_EQ(StrSingle(8.25f), " 8.25");
+    EXPECT_EQ(StrSingle(0.1f), " .1"); // 7 digits hide the float's binary tail
+    EXPECT_EQ(StrSingle(1e20f), " 1E+20");
+    EXPECT_EQ(Str(1e-20), " 1E-20");
+}
+
+TEST(Text, ValReadsTheLeadingNumberElseZero) {
+    EXPECT_EQ(Val("  12.5abc"), 12.5);
+    EXPECT_EQ(Val("-3"), -3);
+    EXPECT_EQ(Val(" .5"), 0.5);
+    EXPECT_EQ(Val("abc"), 0);
+    EXPECT_EQ(Val(""), 0);
+    EXPECT_EQ(Val("1E3"), 1000);
+    EXPECT_EQ(Val("1E"), 1);
+    EXPECT_EQ(Val("&HFF"), 255);
+    EXPECT_EQ(Val("-"), 0);
+}
+
+TEST(Text, TrimPadAndCase) {
+    EXPECT_EQ(Trim("  ab c \r\n"), "ab c");
+    EXPECT_EQ(PadRight("BHP", 6), "BHP   ");
+    EXPECT_EQ(PadRight("ABCDEFGH", 6), "ABCDEF");
+    EXPECT_TRUE(EqualsNoCase("Names.DAT", "names.dat"));
+    EXPECT_FALSE(EqualsNoCase("names.da", "names.dat"));
+}
+
+TEST(Text, FloatTextReadsBackToTheSameFloat) {
+    for (float f : {0.1f, 12.345f, 1e20f, -3.5f, 0.0f, 123456.789f}) {
+        EXPECT_EQ(std::stof(FloatText(f)), f) << FloatText(f);
+    }
+}
