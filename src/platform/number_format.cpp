@@ -1,5 +1,6 @@
 #include "platform/number_format.h"
 
+#include "platform/date_text.h"
 #include "platform/text.h"
 
 #include <array>
@@ -293,37 +294,6 @@ constexpr std::array<const char*, 12> kMonthNames = {
 constexpr std::array<const char*, 7> kDayNames = {"Sunday",   "Monday", "Tuesday", "Wednesday",
                                                   "Thursday", "Friday", "Saturday"};
 
-struct CivilDate {
-    int year, month, day;
-};
-
-int DaysInMonth(int year, int month) {
-    static constexpr std::array<int, 12> days = {31, 28, 31, 30, 31, 30, 31, 31, 30, 31, 30, 31};
-    const bool leap = (year % 4 == 0 && year % 100 != 0) || year % 400 == 0;
-    return month == 2 && leap ? 29 : days[static_cast<std::size_t>(month - 1)];
-}
-
-bool ParseDate(std::string_view text, CivilDate& out) {
-    if (text.size() != 8) return false;
-    for (char c : text)
-        if (c < '0' || c > '9') return false;
-    auto num = [&](std::size_t pos, std::size_t len) {
-        int v = 0;
-        for (std::size_t i = pos; i < pos + len; ++i) v = v * 10 + (text[i] - '0');
-        return v;
-    };
-    out = {num(0, 4), num(4, 2), num(6, 2)};
-    return out.year >= 1 && out.month >= 1 && out.month <= 12 && out.day >= 1 &&
-           out.day <= DaysInMonth(out.year, out.month);
-}
-
-// 0 = Sunday (Sakamoto's method).
-int DayOfWeek0(CivilDate d) {
-    static constexpr std::array<int, 12> t = {0, 3, 2, 5, 0, 3, 5, 1, 4, 6, 2, 4};
-    int y = d.year - (d.month < 3 ? 1 : 0);
-    return (y + y / 4 - y / 100 + y / 400 + t[static_cast<std::size_t>(d.month - 1)] + d.day) % 7;
-}
-
 std::string TwoDigits(int v) {
     char buf[8];
     std::snprintf(buf, sizeof buf, "%02d", v % 100);
@@ -340,7 +310,8 @@ std::size_t RunLength(std::string_view s, std::size_t i) {
 std::string DayField(CivilDate d, std::size_t run) {
     if (run == 1) return std::to_string(d.day);
     if (run == 2) return TwoDigits(d.day);
-    const std::string name = kDayNames[static_cast<std::size_t>(DayOfWeek0(d))];
+    const int weekday = Weekday(DateText(d)).value_or(1);
+    const std::string name = kDayNames[static_cast<std::size_t>(weekday - 1)];
     return run == 3 ? name.substr(0, 3) : name;
 }
 
@@ -369,8 +340,9 @@ std::string FormatSingle(float value, std::string_view pattern) {
 }
 
 std::string FormatDate(std::string_view yyyymmdd, std::string_view pattern) {
-    CivilDate d{};
-    if (!ParseDate(yyyymmdd, d)) return {};
+    const auto parsed = ParseDateText(yyyymmdd);
+    if (!parsed) return {};
+    const CivilDate d = *parsed;
     if (EqualsNoCase(pattern, "Medium Date")) pattern = "dd-mmm-yy";
     std::string out;
     for (std::size_t i = 0; i < pattern.size();) {
