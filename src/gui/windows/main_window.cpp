@@ -77,6 +77,15 @@ void MainWindow::RebuildMenus() {
         return item && m_actions.count(item->opens) > 0;
     };
     app::KeepAvailable(m_tops, available);
+    // Old menus go later (a rebuild may run from one of their own actions); their names go now
+    // so that nothing finds them by name in the meantime.
+    for (QAction* a : menuBar()->actions()) {
+        if (QMenu* m = a->menu()) {
+            for (QObject* o : m->findChildren<QObject*>()) o->setObjectName(QString());
+            m->setObjectName(QString());
+            m->deleteLater();
+        }
+    }
     menuBar()->clear();
     for (const auto& top : m_tops) {
         if (!top.visible) continue;
