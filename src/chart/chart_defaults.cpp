@@ -137,8 +137,10 @@ void SaveChartDefaults(platform::IniFile& ini, const ChartDefaults& d) {
     ini.Write(kCharts, "ShowOsc", Bool(d.ShowOscSettings));
     ini.Write(kCharts, "NoClassicMACD", Bool(!d.ClassicMACD));
     std::string mma;
-    for (std::size_t i = 0; i < d.MMAPeriods.size(); ++i)
-        mma += (i ? "," : "") + Number(d.MMAPeriods[i]);
+    for (std::size_t i = 0; i < d.MMAPeriods.size(); ++i) {
+        if (i > 0) mma += ',';
+        mma += Number(d.MMAPeriods[i]);
+    }
     ini.Write(kCharts, "MMASet", mma);
     ini.Write(kCharts, "CompFile", d.CompFile);
     ini.Write(kCharts, "EFact", Single(d.PrintScale));
