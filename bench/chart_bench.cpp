@@ -29,7 +29,8 @@ public:
             std::snprintf(date, sizeof date, "%04d%02d%02d", 1900 + i / 250, 1 + (i / 21) % 12,
                           1 + i % 21);
             b.SetDate(date);
-            const float mid = 20 + 8 * std::sin(static_cast<float>(i) / 300) + static_cast<float>(i % 7) * 0.1f;
+            const float mid =
+                20 + 8 * std::sin(static_cast<float>(i) / 300) + static_cast<float>(i % 7) * 0.1f;
             b.Open = mid - 0.2f;
             b.High = mid + 0.5f;
             b.Low = mid - 0.5f;
@@ -40,7 +41,9 @@ public:
     }
     std::string FileName() const override { return "BENCH.WDT"; }
     std::int16_t RecordCount() override { return static_cast<std::int16_t>(kRecords); }
-    std::string DateOf(std::int16_t rec) override { return std::string(m_bars[static_cast<std::size_t>(rec - 1)].DateText()); }
+    std::string DateOf(std::int16_t rec) override {
+        return std::string(m_bars[static_cast<std::size_t>(rec - 1)].DateText());
+    }
     std::string NoteText(std::int16_t) override { return {}; }
     platform::Status Load(const chart::LoadRequest& req, store::ChartSeries& s) override {
         s.ChartBars.assign(m_bars.begin() + (req.FirstRecord - 1), m_bars.begin() + req.LastRecord);
@@ -54,7 +57,8 @@ public:
             r.LowestVolume = std::min(r.LowestVolume, b.Volume);
             sum += b.Volume;
         }
-        r.AverageVolume = static_cast<std::int32_t>(sum / static_cast<std::int64_t>(s.ChartBars.size()));
+        r.AverageVolume =
+            static_cast<std::int32_t>(sum / static_cast<std::int64_t>(s.ChartBars.size()));
         r.VolumesPresent = req.WantVolume;
         s.Results = r;
         return platform::Status::Ok();
@@ -75,7 +79,8 @@ struct Setup {
     HistorySource source;
     std::filesystem::path stream = std::filesystem::temp_directory_path() / "kori-bench-TCht.Tmp";
     Setup() {
-        for (std::size_t i = 0; i < palette.size(); ++i) palette[i] = static_cast<platform::Colour>(i * 0x10101);
+        for (std::size_t i = 0; i < palette.size(); ++i)
+            palette[i] = static_cast<platform::Colour>(i * 0x10101);
         request.ChartStyle = 'B';
         request.BarSpacing = 2;
         request.ShowVolume = true;
@@ -86,7 +91,8 @@ struct Setup {
 void BM_BuildChart(benchmark::State& state) {
     Setup s;
     chart::Chart c;
-    const chart::ChartBuild build{s.request, s.defaults, s.name, s.palette, s.fonts, s.dialogs, s.stream};
+    const chart::ChartBuild build{s.request, s.defaults, s.name,  s.palette,
+                                  s.fonts,   s.dialogs,  s.stream};
     for (auto _ : state) {
         s.surface.ClearCalls();
         if (!chart::BuildChart(c, build, s.source, s.surface)) state.SkipWithError("build failed");
@@ -106,7 +112,8 @@ void BM_DrawLoadedChart(benchmark::State& state) {
     const chart::DrawInputs in{s.request, s.defaults, s.name, s.palette, s.fonts};
     for (auto _ : state) {
         s.surface.ClearCalls();
-        if (!chart::DrawLoadedChart(c, in, g, s.dialogs, s.surface)) state.SkipWithError("draw failed");
+        if (!chart::DrawLoadedChart(c, in, g, s.dialogs, s.surface))
+            state.SkipWithError("draw failed");
     }
     c.Stream.Close();
 }
@@ -131,7 +138,9 @@ public:
     void SetFontItalic(bool) override {}
     void SetTextPosition(double, double) override {}
     void PrintText(std::string_view) override {}
-    double TextWidth(std::string_view t) override { return 0.6 * m_size * static_cast<double>(t.size()); }
+    double TextWidth(std::string_view t) override {
+        return 0.6 * m_size * static_cast<double>(t.size());
+    }
     double TextHeight(std::string_view) override { return 1.5 * m_size; }
     double ScaleWidth() const override { return 1000; }
     double ScaleHeight() const override { return 700; }
@@ -149,7 +158,8 @@ void BM_DrawLoadedChartNullSurface(benchmark::State& state) {
     (void)c.Stream.Open(s.stream, false);
     const chart::DrawInputs in{s.request, s.defaults, s.name, s.palette, s.fonts};
     for (auto _ : state)
-        if (!chart::DrawLoadedChart(c, in, g, s.dialogs, surface)) state.SkipWithError("draw failed");
+        if (!chart::DrawLoadedChart(c, in, g, s.dialogs, surface))
+            state.SkipWithError("draw failed");
     c.Stream.Close();
 }
 BENCHMARK(BM_DrawLoadedChartNullSurface)->Unit(benchmark::kMicrosecond);

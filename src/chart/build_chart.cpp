@@ -26,8 +26,8 @@ private:
 };
 
 DrawInputs InputsOf(const ChartBuild& b, PriceSource& source) {
-    return DrawInputs{b.Request, b.Defaults, b.Name, b.Palette, b.Fonts,
-                      b.PrintBold, b.VolumeDivisor, &source};
+    return DrawInputs{b.Request, b.Defaults,  b.Name,          b.Palette,
+                      b.Fonts,   b.PrintBold, b.VolumeDivisor, &source};
 }
 
 platform::Status OpenStream(Chart& c, const ChartRequest& r, const std::filesystem::path& path) {
@@ -82,7 +82,8 @@ platform::Status BuildOneChart(Chart& c, const ChartBuild& b, PriceSource& sourc
     c.Failed = false;
     const char style = EffectiveStyle(b.Request, b.Name);
     if (style == 'P')
-        return platform::Status::Error("Point and figure charts are not drawn by the price chart builder.");
+        return platform::Status::Error(
+            "Point and figure charts are not drawn by the price chart builder.");
     if (auto s = OpenStream(c, b.Request, b.StreamPath); !s) return s;
     c.AreaWidth = surface.ScaleWidth();
     c.AreaHeight = surface.ScaleHeight();
@@ -97,7 +98,8 @@ platform::Status BuildOneChart(Chart& c, const ChartBuild& b, PriceSource& sourc
 
 } // namespace
 
-void WorkOutPrinterMargins(PrinterPage& page, double areaWidth, double areaHeight, float printScale) {
+void WorkOutPrinterMargins(PrinterPage& page, double areaWidth, double areaHeight,
+                           float printScale) {
     if (!(page.Width > 0 && page.Height > 0)) return;
     auto scale16 = [printScale](double twips) {
         const double v = std::nearbyint(twips * static_cast<double>(printScale));

@@ -20,8 +20,8 @@ namespace kori::chart {
 struct PrinterPage {
     bool Known = false;
     double TwipsPerPixelX = 15, TwipsPerPixelY = 15;
-    double Width = 0, Height = 0;     // printable size in printer units
-    double SecondPanelHeight = 0;     // height of the oscillator panel when it shows
+    double Width = 0, Height = 0; // printable size in printer units
+    double SecondPanelHeight = 0; // height of the oscillator panel when it shows
     std::int32_t PageLeft = 0, PageTop = 0;
 };
 
@@ -42,6 +42,7 @@ platform::Status BuildChart(Chart& chart, const ChartBuild& build, PriceSource& 
                             platform::Surface& surface);
 
 // The first build of a run fills the page origin; later builds leave it.
-void WorkOutPrinterMargins(PrinterPage& page, double areaWidth, double areaHeight, float printScale);
+void WorkOutPrinterMargins(PrinterPage& page, double areaWidth, double areaHeight,
+                           float printScale);
 
 } // namespace kori::chart

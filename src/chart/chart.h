@@ -39,7 +39,7 @@ struct Chart {
     std::int16_t GridCount = 0;
     float MaxHigh = 0, MinLow = 0;
     std::int32_t MinVolume = 0, MaxVolume = 0, AvgVolume = 0;
-    bool HasVolume = false;         // a volume panel is drawn
+    bool HasVolume = false; // a volume panel is drawn
 
     // What the build settled: the style drawn (types 1 to 3 always 'L') and the scale kind.
     char Style = 'B';
@@ -48,9 +48,9 @@ struct Chart {
 
     std::vector<std::int16_t> BarCloseY; // y of each close; sized LastBar + 10
     float ChartLastClose = 0;
-    bool Failed = false;                 // the last build stopped on a failure
+    bool Failed = false; // the last build stopped on a failure
 
-    bool RedrawOnly = false;             // a repaint: nothing goes to the stream
+    bool RedrawOnly = false; // a repaint: nothing goes to the stream
     StreamWriter Stream;
     PriceMap Map;
     VolumeMap Volumes;

@@ -21,8 +21,10 @@ bool ReadBool(const platform::IniFile& ini, std::string_view key, bool whenUnkno
 
 std::int32_t IniInt32(const std::string& text) {
     const double v = std::nearbyint(platform::Val(text));
-    if (!(v >= std::numeric_limits<std::int32_t>::min())) return std::numeric_limits<std::int32_t>::min();
-    if (!(v <= std::numeric_limits<std::int32_t>::max())) return std::numeric_limits<std::int32_t>::max();
+    if (!(v >= std::numeric_limits<std::int32_t>::min()))
+        return std::numeric_limits<std::int32_t>::min();
+    if (!(v <= std::numeric_limits<std::int32_t>::max()))
+        return std::numeric_limits<std::int32_t>::max();
     return static_cast<std::int32_t>(v);
 }
 
@@ -48,9 +50,15 @@ std::array<std::int16_t, 12> ParseMMA(const std::string& text) {
     return out;
 }
 
-std::string Number(double v) { return platform::Trim(platform::Str(v)); }
-std::string Single(float v) { return platform::Trim(platform::StrSingle(v)); }
-const char* Bool(bool b) { return b ? "True" : "False"; }
+std::string Number(double v) {
+    return platform::Trim(platform::Str(v));
+}
+std::string Single(float v) {
+    return platform::Trim(platform::StrSingle(v));
+}
+const char* Bool(bool b) {
+    return b ? "True" : "False";
+}
 
 void LoadAverages(const platform::IniFile& ini, ChartDefaults& d) {
     d.MAPeriod1Daily = ReadPeriod(ini, "Av1D", d.MAPeriod1Daily);
@@ -163,9 +171,12 @@ void SaveChartDefaults(platform::IniFile& ini, const ChartDefaults& d) {
 
 void LoadChartRequestSettings(const platform::IniFile& ini, ChartRequest& r) {
     const std::string type = platform::Upper(platform::Trim(ini.Read(kCharts, "Type")));
-    if (type == "UNKNOWN") r.ChartStyle = 'B';
-    else if (type == "B" || type == "C" || type == "P") r.ChartStyle = type[0];
-    else r.ChartStyle = 'L';
+    if (type == "UNKNOWN")
+        r.ChartStyle = 'B';
+    else if (type == "B" || type == "C" || type == "P")
+        r.ChartStyle = type[0];
+    else
+        r.ChartStyle = 'L';
     const std::string period = platform::Upper(platform::Trim(ini.Read(kCharts, "Period")));
     r.ChartPeriod = (period == "W" || period == "M") ? period[0] : 'A';
     const std::int16_t bands = ReadInt16(ini, kCharts, "Bands");

@@ -24,31 +24,31 @@ struct ChartDefaults {
     bool MA2On = false;               // "AvTwo"
     bool MAExponential = false;       // "AvCalc"
     // Scales.
-    bool AutoScale = true;            // "ScMethod": unknown scales by itself
-    bool LogBars = false;             // "BCCalTp"
-    bool LogLine = false;             // "LCalTp"
-    bool LogVolume = false;           // "VCalTp"
-    bool LimitVolumeHeight = false;   // "CutVols"
-    bool ShowOscSettings = false;     // "ShowOsc"
-    bool ClassicMACD = true;          // "NoClassicMACD", stored inverted
+    bool AutoScale = true;          // "ScMethod": unknown scales by itself
+    bool LogBars = false;           // "BCCalTp"
+    bool LogLine = false;           // "LCalTp"
+    bool LogVolume = false;         // "VCalTp"
+    bool LimitVolumeHeight = false; // "CutVols"
+    bool ShowOscSettings = false;   // "ShowOsc"
+    bool ClassicMACD = true;        // "NoClassicMACD", stored inverted
     std::array<std::int16_t, 12> MMAPeriods = kDefaultMMAPeriods; // "MMASet"
-    std::string CompFile;             // "CompFile": RMO/RMX compare file
+    std::string CompFile; // "CompFile": RMO/RMX compare file
     // Keys of the chart window's section.
-    float PrintScale = 1.5f;          // "EFact"
-    std::int16_t PrintLineWidth = 2;  // "Line Width", 1 to 10
-    std::int16_t BlankRight = 0;      // "DBlank"
-    double VerticalGridSpace = 0;     // "VGSpace": 0 turns the vertical grid off
-    double MidGrid = 0;               // "MidGrid": price grid at half steps when not 0
-    bool ShowPriceGrid = false;       // "Grid"
-    std::int16_t VolumeMultiple = 1;  // "VHeight"
-    float WeeksFactor = 4.75f;        // "WeekFactor"
-    bool StopLossOn = false;          // "StopLoss"
-    bool StopPercentOn = false;       // "SL Percent" above 0
-    float StopPercent = 0;            // "SL Percent"
+    float PrintScale = 1.5f;               // "EFact"
+    std::int16_t PrintLineWidth = 2;       // "Line Width", 1 to 10
+    std::int16_t BlankRight = 0;           // "DBlank"
+    double VerticalGridSpace = 0;          // "VGSpace": 0 turns the vertical grid off
+    double MidGrid = 0;                    // "MidGrid": price grid at half steps when not 0
+    bool ShowPriceGrid = false;            // "Grid"
+    std::int16_t VolumeMultiple = 1;       // "VHeight"
+    float WeeksFactor = 4.75f;             // "WeekFactor"
+    bool StopLossOn = false;               // "StopLoss"
+    bool StopPercentOn = false;            // "SL Percent" above 0
+    float StopPercent = 0;                 // "SL Percent"
     std::int32_t ChartW = 0, ChartH = 0;   // "Cw", "Ch": printer chart size
     std::int32_t ScreenW = 0, ScreenH = 0; // "SW", "SH": the screen they relate to
-    std::int16_t Zoom = 100;          // [ChartForms] "Zoom": display scale in per cent
-    std::int16_t Divs = 0;            // [Adjustments] "Divs": divisions of a multi-chart page
+    std::int16_t Zoom = 100;               // [ChartForms] "Zoom": display scale in per cent
+    std::int16_t Divs = 0;                 // [Adjustments] "Divs": divisions of a multi-chart page
 };
 
 // Reads every key in the order of the tables; absent keys take the defaults above.

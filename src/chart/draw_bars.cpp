@@ -13,7 +13,9 @@ namespace kori::chart {
 
 namespace {
 
-bool Outside(const BarYs& b, const BarYs& prev) { return b.High < prev.High && b.Low > prev.Low; }
+bool Outside(const BarYs& b, const BarYs& prev) {
+    return b.High < prev.High && b.Low > prev.Low;
+}
 
 // Stop-loss colouring of bar charts; its read-out stays off the stream.
 struct StopLoss {
@@ -69,7 +71,8 @@ struct TenBarTrace {
         if (Count < 10) return std::nullopt;
         if (!exponential || Count == 10) {
             int sum = 0;
-            for (std::int16_t v : Ring) sum += v;
+            for (std::int16_t v : Ring)
+                sum += v;
             Y = std::nearbyint(static_cast<float>(sum) / 10);
         } else {
             Y = std::nearbyint(static_cast<float>(closeY) * 2 / 11 + Y * (1 - 2.0f / 11));
@@ -89,7 +92,8 @@ public:
             const store::ChartBar& bar = bars[static_cast<std::size_t>(i)];
             if (bar.High == 0) {
                 // No column drawn; the close y of the bar before stands for it.
-                m_c.BarCloseY[static_cast<std::size_t>(i)] = i > 0 ? m_c.BarCloseY[static_cast<std::size_t>(i - 1)] : 0;
+                m_c.BarCloseY[static_cast<std::size_t>(i)] =
+                    i > 0 ? m_c.BarCloseY[static_cast<std::size_t>(i - 1)] : 0;
             } else {
                 DrawOne(i, bar, x);
             }
@@ -100,15 +104,22 @@ public:
 
 private:
     BarYs YsOf(const store::ChartBar& b) const {
-        return {m_c.PriceToY(b.High), m_c.PriceToY(b.Open), m_c.PriceToY(b.Low), m_c.PriceToY(b.Close)};
+        return {m_c.PriceToY(b.High), m_c.PriceToY(b.Open), m_c.PriceToY(b.Low),
+                m_c.PriceToY(b.Close)};
     }
 
     void DrawOne(int i, const store::ChartBar& bar, double x) {
         const BarYs ys = YsOf(bar);
         switch (m_c.Style) {
-        case 'B': DrawBar(bar, ys, x); break;
-        case 'C': DrawCandle(ys, x); break;
-        default: DrawLinePoint(ys, x); break;
+        case 'B':
+            DrawBar(bar, ys, x);
+            break;
+        case 'C':
+            DrawCandle(ys, x);
+            break;
+        default:
+            DrawLinePoint(ys, x);
+            break;
         }
         m_prev2 = m_prev;
         m_prev = ys;
@@ -215,7 +226,8 @@ BarClass ClassifyBar(const BarYs& b, const BarYs* prev, const BarYs* prev2) {
     if (b.High > p.High && b.Low < p.Low) {
         const int m = p.Low - (p.Low - p.High) / 2;
         const int n = b.Low - (b.Low - b.High) / 2;
-        if ((p.Close > m && b.Close < n) || (p.Close < m && b.Close > n)) cls.Entry = pal::HookReversal;
+        if ((p.Close > m && b.Close < n) || (p.Close < m && b.Close > n))
+            cls.Entry = pal::HookReversal;
     }
     if ((b.Low < p.High && b.Open < b.Close) || (b.High > p.Low && b.Open > b.Close))
         cls.Entry = pal::OpenCloseReversal;

@@ -27,9 +27,13 @@ void ChartPainter::Box(double x1, double y1, double x2, double y2, int entry) {
     stream.Shape('B', x1, y1, x2, y2, Col(entry));
 }
 
-TextFont ChartPainter::Font1(bool bold) const { return {1, in.Fonts.Size1, bold, false}; }
+TextFont ChartPainter::Font1(bool bold) const {
+    return {1, in.Fonts.Size1, bold, false};
+}
 
-TextFont ChartPainter::Font2() const { return {2, in.Fonts.Size2, false, false}; }
+TextFont ChartPainter::Font2() const {
+    return {2, in.Fonts.Size2, false, false};
+}
 
 double ChartPainter::Width(std::string_view text, const TextFont& f) {
     screen.SetFontName(f.Number == 2 ? in.Fonts.Font2 : in.Fonts.Font1);
@@ -54,8 +58,10 @@ void ChartPainter::ScreenText(double x, double y, std::string_view text, int ent
 
 void ChartPainter::StreamT(double x, double y, std::string_view text, int entry, double dxBold,
                            double dyBold) {
-    if (in.PrintBold) stream.Text('T', in.Fonts.Size1, x + dxBold, y + dyBold, text, Col(entry));
-    else stream.Text('T', 8.25, x, y, text, Col(entry));
+    if (in.PrintBold)
+        stream.Text('T', in.Fonts.Size1, x + dxBold, y + dyBold, text, Col(entry));
+    else
+        stream.Text('T', 8.25, x, y, text, Col(entry));
 }
 
 } // namespace kori::chart

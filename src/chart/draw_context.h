@@ -21,9 +21,9 @@ struct DrawInputs {
     const ChartName& Name;
     const platform::Palette& Palette;
     const platform::ChartFonts& Fonts;
-    bool PrintBold = false;           // print option: chart text prints bold
-    std::int32_t VolumeDivisor = 1;   // "Volume divisor" of the download settings
-    PriceSource* Notes = nullptr;     // fetches the text of note records; none: no note text
+    bool PrintBold = false;         // print option: chart text prints bold
+    std::int32_t VolumeDivisor = 1; // "Volume divisor" of the download settings
+    PriceSource* Notes = nullptr;   // fetches the text of note records; none: no note text
 };
 
 // Font of a piece of screen text.
@@ -36,8 +36,8 @@ struct TextFont {
 
 // Palette entries the price chart draws in.
 namespace pal {
-inline constexpr int StopLine = 10, StopBroken = 11, PreviousStopBroken = 13, Frame = 16,
-                     Bars = 18, Trace = 19, Volume = 22, Notes = 24, Heading = 26, Labels = 27,
+inline constexpr int StopLine = 10, StopBroken = 11, PreviousStopBroken = 13, Frame = 16, Bars = 18,
+                     Trace = 19, Volume = 22, Notes = 24, Heading = 26, Labels = 27,
                      DownCandle = 28, Reversal = 29, KeyReversal = 30, HookReversal = 31,
                      OpenCloseReversal = 32, PivotPoint = 33, YearLine = 34, Grid = 35;
 }

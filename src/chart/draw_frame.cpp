@@ -9,7 +9,9 @@ namespace kori::chart {
 
 namespace {
 
-std::int16_t BandPercent(std::int16_t v) { return (v >= 1 && v <= 100) ? v : std::int16_t{5}; }
+std::int16_t BandPercent(std::int16_t v) {
+    return (v >= 1 && v <= 100) ? v : std::int16_t{5};
+}
 
 const char* PeriodWord(char period) {
     if (period == 'W') return "WEEKLY";
@@ -30,7 +32,8 @@ void DrawTitle(ChartPainter& p) {
         p.stream.Text('T', 9.75, x, y, code, p.Col(pal::Heading));
         return;
     }
-    const std::string title = platform::PadRight(p.in.Name.Code, 6) + (p.in.PrintBold ? "  " : "    ") +
+    const std::string title = platform::PadRight(p.in.Name.Code, 6) +
+                              (p.in.PrintBold ? "  " : "    ") +
                               platform::PadRight(p.in.Name.Name, 35);
     p.ScreenText(20, 2, title, pal::Heading, p.Font1());
     p.StreamT(20, 2, title, pal::Heading);
@@ -56,7 +59,11 @@ void DrawVolumeScale(ChartPainter& p) {
     }
     // "VOL" down the right edge, one letter a division, under the divisor's code.
     const std::int32_t d = p.in.VolumeDivisor;
-    const char* code = d == 10 ? "10" : d == 100 ? "100" : d == 1000 ? "K" : d == 10000 ? "10K" : "";
+    const char* code = d == 10      ? "10"
+                       : d == 100   ? "100"
+                       : d == 1000  ? "K"
+                       : d == 10000 ? "10K"
+                                    : "";
     const char* letters[] = {code, "V", "O", "L"};
     for (int i = 0; i < 4; ++i) {
         if (!*letters[i]) continue;
@@ -77,7 +84,8 @@ void DrawPriceLine(ChartPainter& p, int n, float value, std::int16_t y, bool& sk
     const Chart& c = p.chart;
     p.Line('L', c.PlotRight, y, c.PlotRight + 4, y, pal::Frame);
     if (LabelShows(n, c.GridCount, skip)) {
-        const std::string label = PriceLabel(value, c.ChartCeiling - c.ChartBase, p.in.Name.RecordType);
+        const std::string label =
+            PriceLabel(value, c.ChartCeiling - c.ChartBase, p.in.Name.RecordType);
         const TextFont f1 = p.Font1();
         const double x = c.PlotRight + 5 + 40 - p.Width(label, f1);
         p.ScreenText(x, y - 6, label, pal::Labels, f1);
@@ -87,7 +95,8 @@ void DrawPriceLine(ChartPainter& p, int n, float value, std::int16_t y, bool& sk
     if (!p.in.Defaults.ShowPriceGrid || n == 0) return;
     p.Dotted(c.PlotLeft, y, c.PlotRight, y, pal::Grid);
     if (p.in.Defaults.MidGrid != 0) {
-        const std::int16_t mid = c.PriceToY((static_cast<float>(n) - 0.5f) * c.GridStep + c.ChartBase);
+        const std::int16_t mid =
+            c.PriceToY((static_cast<float>(n) - 0.5f) * c.GridStep + c.ChartBase);
         p.Dotted(c.PlotLeft, mid, c.PlotRight, mid, pal::Grid);
     }
 }
@@ -107,12 +116,15 @@ void DrawVerticalGrid(ChartPainter& p) {
 std::string HeadingLine(const ChartRequest& r, const ChartName& name, bool logarithmic,
                         bool lineChart) {
     std::string s = PeriodWord(r.ChartPeriod);
-    if (logarithmic) s += lineChart ? " - LOGARITHMIC - " : " - LOGARITHMIC -";
-    else s += " - ARITHMETIC -";
+    if (logarithmic)
+        s += lineChart ? " - LOGARITHMIC - " : " - LOGARITHMIC -";
+    else
+        s += " - ARITHMETIC -";
     if (r.UpsideDown) s += std::string(20, ' ') + "UPSIDE-DOWN CHART";
     if (r.ChartBands == 1) {
-        s += std::string(6, ' ') + "Percentage Bands  &" + platform::Str(BandPercent(name.PercentBandUp)) +
-             "%    -" + platform::Str(BandPercent(name.PercentBandDown)) + "%";
+        s += std::string(6, ' ') + "Percentage Bands  &" +
+             platform::Str(BandPercent(name.PercentBandUp)) + "%    -" +
+             platform::Str(BandPercent(name.PercentBandDown)) + "%";
         return s;
     }
     for (const std::string* avg : {&r.AverageName1, &r.AverageName2})

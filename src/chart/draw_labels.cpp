@@ -33,7 +33,8 @@ void DrawTrailingLabels(ChartPainter& p) {
         p.ScreenText(380, y, text, pal::Labels, f1);
         if (!p.in.PrintBold) p.stream.Text('T', 8.25, 380, y, text, p.Col(pal::Labels));
     }
-    const float previous = c.LastBar() >= 1 ? bars[static_cast<std::size_t>(c.LastBar() - 1)].Close : 0.0f;
+    const float previous =
+        c.LastBar() >= 1 ? bars[static_cast<std::size_t>(c.LastBar() - 1)].Close : 0.0f;
     const std::string closing = ClosingPriceText(last.Close, previous, p.in.Name.RecordType);
     const double y = lowerHalf ? c.TitleTop + 20 : 20;
     p.ScreenText(380, y, closing, pal::Labels, f1);
@@ -47,7 +48,8 @@ void DrawTrailingLabels(ChartPainter& p) {
         p.stream.Text('Z', p.in.Fonts.Size1, c.PlotRight - 50 - w, c.TitleTop - 20, kChartStamp,
                       p.Col(pal::Labels));
     else
-        p.stream.Text('Z', 7, c.PlotRight - 30 - w, c.TitleTop - 10, kChartStamp, p.Col(pal::Labels));
+        p.stream.Text('Z', 7, c.PlotRight - 30 - w, c.TitleTop - 10, kChartStamp,
+                      p.Col(pal::Labels));
 }
 
 } // namespace kori::chart

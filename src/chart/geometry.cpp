@@ -46,7 +46,9 @@ std::int16_t FinishRecord(const WindowInputs& in,
 
 } // namespace
 
-std::int16_t PlotRightFor(double width) { return Clamp16(Part(width, 99) - 42L); }
+std::int16_t PlotRightFor(double width) {
+    return Clamp16(Part(width, 99) - 42L);
+}
 
 PlotGeometry ComputePlotGeometry(double width, double height, const ChartRequest& r) {
     PlotGeometry g;

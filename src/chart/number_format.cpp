@@ -10,9 +10,9 @@ namespace kori::chart {
 namespace {
 
 struct Pattern {
-    int minInt = 0;      // '0's before the point
-    int minFrac = 0;     // leading '0's after the point
-    int maxFrac = 0;     // all digit places after the point
+    int minInt = 0;  // '0's before the point
+    int minFrac = 0; // leading '0's after the point
+    int maxFrac = 0; // all digit places after the point
     bool point = false;
     bool grouping = false;
 };
@@ -65,7 +65,8 @@ void RoundedDigits(double value, int significant, int decimals, std::string& who
     digits.resize(static_cast<std::size_t>(want));
     if (up) {
         int i = want - 1;
-        while (i >= 0 && digits[static_cast<std::size_t>(i)] == '9') digits[static_cast<std::size_t>(i--)] = '0';
+        while (i >= 0 && digits[static_cast<std::size_t>(i)] == '9')
+            digits[static_cast<std::size_t>(i--)] = '0';
         if (i >= 0) {
             ++digits[static_cast<std::size_t>(i)];
         } else {
@@ -94,7 +95,8 @@ std::string Format(double value, int significant, std::string_view pattern) {
     const Pattern p = Parse(pattern);
     std::string whole, fraction;
     RoundedDigits(value, significant, p.maxFrac, whole, fraction);
-    while (static_cast<int>(fraction.size()) > p.minFrac && fraction.back() == '0') fraction.pop_back();
+    while (static_cast<int>(fraction.size()) > p.minFrac && fraction.back() == '0')
+        fraction.pop_back();
     if (static_cast<int>(whole.size()) < p.minInt)
         whole.insert(0, static_cast<std::size_t>(p.minInt) - whole.size(), '0');
     if (p.grouping) whole = Group(whole);

@@ -12,8 +12,12 @@ namespace {
 float RoundTo(float v, double unitsPerOne) {
     return static_cast<float>(std::nearbyint(static_cast<double>(v) * unitsPerOne) / unitsPerOne);
 }
-float Round(float v) { return std::nearbyint(v); }
-float Floor(float v) { return std::floor(v); }
+float Round(float v) {
+    return std::nearbyint(v);
+}
+float Floor(float v) {
+    return std::floor(v);
+}
 
 // Upper end. `f` is the widening factor, which the lower end keeps when the low is 0.
 void UpperEnd(float& hi, float& lo, float& f) {
@@ -73,14 +77,19 @@ void LowerEnd(float hi, float& lo, float& f) {
 
 void LargeAndNegative(float& hi, float& lo) {
     if (!(lo > 600 || lo < 0)) return;
-    if (-100 < lo && lo < -10) lo = Floor(lo / 10) * 10;
-    else if (-10 <= lo && lo < 0) { /* stays */ }
-    else lo = Floor(lo / 100) * 100;
+    if (-100 < lo && lo < -10)
+        lo = Floor(lo / 10) * 10;
+    else if (-10 <= lo && lo < 0) { /* stays */
+    } else
+        lo = Floor(lo / 100) * 100;
 
-    if (-100 < hi && hi < 0) hi = Floor(hi / 10) * 10;
-    else if (0.5f < hi && hi < 100) hi = Floor(hi / 10) * 10;
-    else if (0 < hi && hi <= 0.5f) { /* stays */ }
-    else hi = (Floor(hi / 100) + 1) * 100;
+    if (-100 < hi && hi < 0)
+        hi = Floor(hi / 10) * 10;
+    else if (0.5f < hi && hi < 100)
+        hi = Floor(hi / 10) * 10;
+    else if (0 < hi && hi <= 0.5f) { /* stays */
+    } else
+        hi = (Floor(hi / 100) + 1) * 100;
 }
 
 std::int16_t ToInt16(double v) {
@@ -93,10 +102,10 @@ float StepForRange(float range) {
     struct Row {
         float from, to, step;
     };
-    static constexpr Row kRows[] = {
-        {0.1001f, 0.5f, 0.02f}, {0.5001f, 1, 0.05f},   {1.0001f, 2, 0.1f},  {2.0001f, 3, 0.2f},
-        {3.0001f, 4, 0.3f},     {4.0001f, 5, 0.4f},    {5.0001f, 10, 0.5f}, {10.0001f, 20, 1},
-        {20.0001f, 50, 5},      {50.0001f, 80, 10},    {80.0001f, 100, 15}};
+    static constexpr Row kRows[] = {{0.1001f, 0.5f, 0.02f}, {0.5001f, 1, 0.05f}, {1.0001f, 2, 0.1f},
+                                    {2.0001f, 3, 0.2f},     {3.0001f, 4, 0.3f},  {4.0001f, 5, 0.4f},
+                                    {5.0001f, 10, 0.5f},    {10.0001f, 20, 1},   {20.0001f, 50, 5},
+                                    {50.0001f, 80, 10},     {80.0001f, 100, 15}};
     if (range > 0 && range < 0.11f) return 0.005f;
     for (const Row& r : kRows)
         if (range >= r.from && range <= r.to) return r.step;
@@ -120,7 +129,8 @@ ScaleEnds AutoScaleEnds(float high, float low) {
 
 GridSteps ComputeGridStep(float chartBase, float chartCeiling) {
     // The range goes through the two-decimal label format and back.
-    float range = static_cast<float>(platform::Val(FormatNumber(chartCeiling - chartBase, "#####0.00")));
+    float range =
+        static_cast<float>(platform::Val(FormatNumber(chartCeiling - chartBase, "#####0.00")));
     float step = 0;
     if (range > 100) {
         range = range < 1000 ? Floor(range / 10) * 10 : Floor(range / 100) * 100;
@@ -151,9 +161,10 @@ std::string ManualScaleMessage(std::string_view code) {
     return c +
            " MANUAL SCALING has been selected but there are no chart scale definitions in the "
            "Name File for " +
-           c + "\nUse <Change Scales> in the Set Defaults window or add these scales directly to "
-               "the Name File\nDo not use 0(zero) as chart base or ceiling\nOTHERWISE USE "
-               "AUTOMATIC SCALING";
+           c +
+           "\nUse <Change Scales> in the Set Defaults window or add these scales directly to "
+           "the Name File\nDo not use 0(zero) as chart base or ceiling\nOTHERWISE USE "
+           "AUTOMATIC SCALING";
 }
 
 std::int16_t ToY16(double v, std::int16_t fallback) {
@@ -188,19 +199,24 @@ bool PriceMap::Prepare(bool logarithmic, bool lineChart, float chartBase, float 
 
 std::int16_t PriceMap::PriceToY(double value) const {
     if (!m_log) {
-        const float y = static_cast<float>(m_bottom) - (static_cast<float>(value) - m_base) / m_unitsPerY;
+        const float y =
+            static_cast<float>(m_bottom) - (static_cast<float>(value) - m_base) / m_unitsPerY;
         return ToY16(std::nearbyint(static_cast<double>(y)), m_bottom);
     }
     // Values of 0 and below have no logarithm; these stand-ins are part of the chart.
     double lnValue;
-    if (value < 0) lnValue = std::log(10.0) / std::log(-value);
-    else if (value == 0) lnValue = std::log(10.0);
-    else lnValue = std::log(value);
+    if (value < 0)
+        lnValue = std::log(10.0) / std::log(-value);
+    else if (value == 0)
+        lnValue = std::log(10.0);
+    else
+        lnValue = std::log(value);
     return ToY16(std::floor(m_bottom + (lnValue - m_logBase) * m_logFactor), m_bottom);
 }
 
 double PriceMap::YToPrice(double y) const {
-    if (!m_log) return static_cast<double>(m_base) + (m_bottom - y) * static_cast<double>(m_unitsPerY);
+    if (!m_log)
+        return static_cast<double>(m_base) + (m_bottom - y) * static_cast<double>(m_unitsPerY);
     return std::exp(m_logBase + (y - m_bottom) / m_logFactor);
 }
 

@@ -15,7 +15,7 @@ struct ScaleEnds {
 };
 
 struct GridSteps {
-    float GridStep = 0;        // 0 when the range fits no row: no gridlines
+    float GridStep = 0; // 0 when the range fits no row: no gridlines
     std::int16_t GridCount = 0;
 };
 

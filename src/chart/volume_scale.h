@@ -8,7 +8,7 @@ namespace kori::chart {
 
 struct VolumeScaleInputs {
     bool Logarithmic = false;
-    bool LimitHeight = false;     // bars stop at VolTop instead of reaching into the prices
+    bool LimitHeight = false; // bars stop at VolTop instead of reaching into the prices
     std::int16_t VolTop = 0, VolBottom = 0, PlotTop = 0;
     std::int32_t MinVolume = 0, MaxVolume = 0, AvgVolume = 0;
     std::int16_t VolumeMultiple = 1;

@@ -93,7 +93,8 @@ TEST(BuildChart, DegenerateInputsEndTidily) {
     {
         ChartRig r; // no prices at all: an upside-down automatic scale, no bars, no crash
         r.defaults.AutoScale = true;
-        for (int i = 0; i < 5; ++i) r.Add("2024030" + std::to_string(i + 1), 0, 0, 0, 0);
+        for (int i = 0; i < 5; ++i)
+            r.Add("2024030" + std::to_string(i + 1), 0, 0, 0, 0);
         EXPECT_TRUE(r.Build().ok());
         EXPECT_TRUE(Starting(r.Lines(), "H,").empty());
         EXPECT_EQ(r.chart.GridStep, 0);
@@ -133,10 +134,12 @@ TEST(BuildChart, SplitBuildsBothHalvesIntoOneStream) {
     EXPECT_EQ(r.request.SplitHalf, 1);
     const auto titles = Starting(r.Lines(), "T, 9.75,");
     // Upper half from 10, lower half from 1000 x 51% = 510; the code at 4 x PlotLeft.
-    EXPECT_EQ(titles, (std::vector<std::string>{"T, 9.75, 20, 12,BHP, 26", "T, 9.75, 20, 512,BHP, 26"}));
+    EXPECT_EQ(titles,
+              (std::vector<std::string>{"T, 9.75, 20, 12,BHP, 26", "T, 9.75, 20, 512,BHP, 26"}));
     EXPECT_TRUE(HasRun(r.Lines(), {"T, 8.25, 380, 512,Last date processed 04-03-24, 27"}));
     int clears = 0;
-    for (const auto& c : r.Calls()) clears += c.rfind("Clear", 0) == 0;
+    for (const auto& c : r.Calls())
+        clears += c.rfind("Clear", 0) == 0;
     EXPECT_EQ(clears, 1);
 }
 

@@ -71,9 +71,9 @@ TEST(RecordWindow, BarsThatFitByPeriod) {
     EXPECT_EQ(ComputeRecordWindow(w, nullptr).FirstRecord, 2760);
     w.WeeksFactor = 5.3f; // outside 4 to 5.25: 4.75 stands
     EXPECT_EQ(ComputeRecordWindow(w, nullptr).FirstRecord, 2760);
-    w.WeeksFactor = 5;    // 5 x 943 / 2 = 2357.5 -> 2358
+    w.WeeksFactor = 5; // 5 x 943 / 2 = 2357.5 -> 2358
     EXPECT_EQ(ComputeRecordWindow(w, nullptr).FirstRecord, 2642);
-    w.ChartPeriod = 'M';  // 20 x 943 / 2 = 9430
+    w.ChartPeriod = 'M'; // 20 x 943 / 2 = 9430
     w.RecordCount = 20000;
     EXPECT_EQ(ComputeRecordWindow(w, nullptr).FirstRecord, 10570);
     w.RecordCount = 3000;

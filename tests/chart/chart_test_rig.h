@@ -44,12 +44,13 @@ struct ChartRig {
 
     void Add(std::string date, float open, float high, float low, float close,
              std::int32_t volume = 0, std::string note = {}) {
-        source.Records.push_back({std::move(date), open, high, low, close, volume, std::move(note)});
+        source.Records.push_back(
+            {std::move(date), open, high, low, close, volume, std::move(note)});
     }
 
     platform::Status Build() {
-        const chart::ChartBuild b{request, defaults,   name,          palette, fonts, dialogs,
-                                  streamPath, printBold, volumeDivisor, page};
+        const chart::ChartBuild b{request, defaults,   name,      palette,       fonts,
+                                  dialogs, streamPath, printBold, volumeDivisor, page};
         return chart::BuildChart(chart, b, source, surface);
     }
     std::vector<std::string> Lines() const { return ReadLines(streamPath); }

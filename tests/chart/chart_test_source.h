@@ -64,7 +64,9 @@ public:
     }
 
 private:
-    const DayRecord& At(std::int16_t rec) const { return Records[static_cast<std::size_t>(rec - 1)]; }
+    const DayRecord& At(std::int16_t rec) const {
+        return Records[static_cast<std::size_t>(rec - 1)];
+    }
 
     static void SettleVolumes(bool wanted, int counted, std::int64_t sum, store::LoadResults& r) {
         if (!wanted) {
@@ -87,7 +89,8 @@ private:
 // Palette whose colour values are the entry numbers, so stream lines name their entries.
 inline platform::Palette NumberedPalette() {
     platform::Palette p{};
-    for (std::size_t i = 0; i < p.size(); ++i) p[i] = static_cast<platform::Colour>(i);
+    for (std::size_t i = 0; i < p.size(); ++i)
+        p[i] = static_cast<platform::Colour>(i);
     return p;
 }
 

@@ -10,8 +10,8 @@ namespace {
 // Seven bars 20 units apart (x 5, 25, ..., 125) across a month, a year and a month again.
 void AddDates(ChartRig& r) {
     r.request.BarSpacing = 20;
-    for (const char* d : {"20231128", "20231129", "20231201", "20231204", "20240102", "20240103",
-                          "20240201"})
+    for (const char* d :
+         {"20231128", "20231129", "20231201", "20231204", "20240102", "20240103", "20240201"})
         r.Add(d, 15, 20, 12.5f, 17);
 }
 } // namespace
@@ -24,8 +24,8 @@ TEST(DateAxis, DailyTicksMonthLettersYearLinesAndLabels) {
     // December at x 45: column 6 is 5 past column 1 of the first bar.
     EXPECT_TRUE(HasRun(lines, {"L, 45, 950, 45, 955, 27", "T, 8.25, 45, 952,D, 27"}));
     // The new year: tick, the year line (dashed on paper, in the label colour), the year.
-    EXPECT_TRUE(HasRun(lines, {"L, 85, 950, 85, 955, 27", "D, 85, 130, 85, 952, 27",
-                               "T, 8.25, 85, 952,24, 27"}));
+    EXPECT_TRUE(HasRun(
+        lines, {"L, 85, 950, 85, 955, 27", "D, 85, 130, 85, 952, 27", "T, 8.25, 85, 952,24, 27"}));
     EXPECT_TRUE(HasRun(lines, {"L, 125, 950, 125, 955, 27", "T, 8.25, 125, 952,F, 27"}));
     EXPECT_EQ(Starting(lines, "D,").size(), 1u);
     // On the screen the year line is dotted, in the year-line colour.
@@ -38,7 +38,8 @@ TEST(DateAxis, CloseMonthsGetNoTick) {
     r.request.BarSpacing = 10; // December at x 25: column 3, only 2 past the first
     ASSERT_TRUE(r.Build().ok());
     const auto lines = r.Lines();
-    for (const auto& l : lines) EXPECT_EQ(l.find(",D, 27"), std::string::npos) << l;
+    for (const auto& l : lines)
+        EXPECT_EQ(l.find(",D, 27"), std::string::npos) << l;
     EXPECT_TRUE(HasRun(lines, {"L, 45, 950, 45, 955, 27", "D, 45, 130, 45, 952, 27"}))
         << "a new year always ticks";
 }
@@ -53,7 +54,8 @@ TEST(DateAxis, WeeklyChartsMarkYearsOnly) {
     for (const auto& l : lines)
         if (l.find(", 955, 27") != std::string::npos || l.find(", 952,") != std::string::npos)
             axis.push_back(l);
-    EXPECT_EQ(axis, (std::vector<std::string>{"L, 85, 950, 85, 955, 27", "T, 8.25, 85, 952,24, 27"}));
+    EXPECT_EQ(axis,
+              (std::vector<std::string>{"L, 85, 950, 85, 955, 27", "T, 8.25, 85, 952,24, 27"}));
     EXPECT_TRUE(Starting(lines, "D,").empty());
 }
 
@@ -76,7 +78,8 @@ TEST(TrailingLabels, LastDateClosingPriceAndStamp) {
     ASSERT_TRUE(r.Build().ok());
     lines = r.Lines();
     EXPECT_EQ(lines.back(), "Z, 8, 249.4, 110,KORI Charting, 27");
-    for (const auto& l : lines) EXPECT_EQ(l.find("Closing"), std::string::npos);
+    for (const auto& l : lines)
+        EXPECT_EQ(l.find("Closing"), std::string::npos);
     EXPECT_TRUE(HasRun(r.Calls(), {"Text 380,20 size 8 #27 [Closing Price : 17.00  (15.00)]"}));
 }
 

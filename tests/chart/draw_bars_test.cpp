@@ -8,7 +8,9 @@ using kori::test::Starting;
 
 namespace {
 // Open 15, high 20, low 12.5, close 17: y 900, 850, 925, 880.
-void AddUpBar(ChartRig& r, const char* date = "20240305") { r.Add(date, 15, 20, 12.5f, 17); }
+void AddUpBar(ChartRig& r, const char* date = "20240305") {
+    r.Add(date, 15, 20, 12.5f, 17);
+}
 } // namespace
 
 TEST(DrawBars, TicksByBarSpacing) {
@@ -20,8 +22,8 @@ TEST(DrawBars, TicksByBarSpacing) {
         // Screen ticks 3 long; paper ticks 1.5 long.
         EXPECT_TRUE(HasRun(r.Lines(), {"H, 5, 850, 5, 925, 18", "H, 3.5, 900, 5, 900, 18",
                                        "H, 5, 880, 6.5, 880, 18"}));
-        EXPECT_TRUE(HasRun(r.Calls(), {"Line 5,850,5,925 #18", "Line 2,900,5,900 #18",
-                                       "Line 5,880,8,880 #18"}));
+        EXPECT_TRUE(HasRun(
+            r.Calls(), {"Line 5,850,5,925 #18", "Line 2,900,5,900 #18", "Line 5,880,8,880 #18"}));
         EXPECT_TRUE(Starting(r.Lines(), "P,").empty());
     }
     {
@@ -102,7 +104,8 @@ TEST(DrawBars, PivotRedrawsThePreviousBarOnTheScreenOnly) {
     r.Add("20240306", ChartRig::P(105), ChartRig::P(103), ChartRig::P(130), ChartRig::P(126));
     ASSERT_TRUE(r.Build().ok());
     EXPECT_TRUE(HasRun(r.Calls(), {"Line 15,120,15,100 #33", "Line 25,103,25,130 #18"}));
-    for (const auto& l : r.Lines()) EXPECT_EQ(l.find(", 33"), std::string::npos) << l;
+    for (const auto& l : r.Lines())
+        EXPECT_EQ(l.find(", 33"), std::string::npos) << l;
 }
 
 TEST(DrawBars, StopLossIsColouredAndReadOutOnTheScreenOnly) {
@@ -118,7 +121,8 @@ TEST(DrawBars, StopLossIsColouredAndReadOutOnTheScreenOnly) {
     EXPECT_TRUE(HasRun(r.Lines(), {"H, 25, 840, 25, 920, 18"}));
     EXPECT_TRUE(HasRun(r.Calls(), {"Line 15,942,354,942 #10",
                                    "Text 234,30 size 8 #10 [Current Stop Loss : 10.80]"}));
-    for (const auto& l : r.Lines()) EXPECT_EQ(l.find("Stop"), std::string::npos) << l;
+    for (const auto& l : r.Lines())
+        EXPECT_EQ(l.find("Stop"), std::string::npos) << l;
 
     r.Add("20240307", 11, 12, 10, 10); // closes under the stop
     ASSERT_TRUE(r.Build().ok());
@@ -131,12 +135,14 @@ TEST(DrawBars, NotesMarkTheBarAndReachPaperOnlyWithoutBoldPrint) {
     AddUpBar(r, "20240304");
     r.Add("20240305", 15, 20, 12.5f, 17, 0, "1 for 2 issue");
     ASSERT_TRUE(r.Build().ok());
-    EXPECT_TRUE(HasRun(r.Lines(), {"V, 15, 130, 15, 950, 24", "T, 8.25, 15, 132,1 for 2 issue , 24"}));
+    EXPECT_TRUE(
+        HasRun(r.Lines(), {"V, 15, 130, 15, 950, 24", "T, 8.25, 15, 132,1 for 2 issue , 24"}));
     EXPECT_TRUE(HasRun(r.Calls(), {"Style dot", "Line 15,130,15,950 #24", "Style solid",
                                    "Text 15,132 size 8 #24 [1 for 2 issue]"}));
     r.printBold = true;
     ASSERT_TRUE(r.Build().ok());
-    for (const auto& l : r.Lines()) EXPECT_EQ(l.find("issue"), std::string::npos) << l;
+    for (const auto& l : r.Lines())
+        EXPECT_EQ(l.find("issue"), std::string::npos) << l;
 }
 
 TEST(DrawBars, TenBarTraceSimpleAndExponential) {
@@ -181,8 +187,8 @@ TEST(DrawBars, FlatVolumeDrawsBarsAThirdHigh) {
     // Divisions of 41: the bottom one labelled with the lowest volume, then 1 + 41 x 21.42.
     EXPECT_TRUE(HasRun(lines, {"S, 8, 379.2, 946,1, 27", "V, 354, 909, 356, 909, 24",
                                "S, 8, 369.6, 905,879, 27"}));
-    EXPECT_TRUE(HasRun(lines, {"S, 8, 395.6, 827,V, 27", "S, 8, 395.6, 868,O, 27",
-                               "S, 8, 395.6, 909,L, 27"}));
+    EXPECT_TRUE(HasRun(
+        lines, {"S, 8, 395.6, 827,V, 27", "S, 8, 395.6, 868,O, 27", "S, 8, 395.6, 909,L, 27"}));
 }
 
 TEST(VolumeMap, LimitsLogarithmAndDegenerateVolumes) {

@@ -33,7 +33,8 @@ TEST(DrawHeading, TitleOtherDetailsAndSecondLine) {
     ASSERT_GE(lines.size(), 4u);
     EXPECT_EQ(lines[0], "T, 8.25, 20, 2,BHP       BHP GROUP" + std::string(26, ' ') + ", 26");
     // Under the title (2 + 12); in the stream with fifteen blanks ahead.
-    EXPECT_EQ(lines[1], "T, 8.25, 20, 14," + std::string(15, ' ') + "ORD" + std::string(12, ' ') + ", 26");
+    EXPECT_EQ(lines[1],
+              "T, 8.25, 20, 14," + std::string(15, ' ') + "ORD" + std::string(12, ' ') + ", 26");
     EXPECT_EQ(lines[2], "T, 8.25, 7, 112,DAILY - ARITHMETIC -, 26");
     EXPECT_EQ(lines[3], "B, 4, 130, 354, 950, 16");
     EXPECT_TRUE(HasRun(r.Calls(), {"Text 7,112 size 8 bold #26 [DAILY - ARITHMETIC -]"}));
@@ -93,9 +94,8 @@ TEST(DrawGrid, LabelThinning) {
                                         "16.00", "18.00", "20.00", "22.00"}));
     r.name.Top = 23; // 13 intervals: every second from the first
     ASSERT_TRUE(r.Build().ok());
-    EXPECT_EQ(PriceLabels(r.Lines()),
-              (std::vector<std::string>{"10.00", "12.00", "14.00", "16.00", "18.00", "20.00",
-                                        "22.00"}));
+    EXPECT_EQ(PriceLabels(r.Lines()), (std::vector<std::string>{"10.00", "12.00", "14.00", "16.00",
+                                                                "18.00", "20.00", "22.00"}));
     bool skip = false;
     EXPECT_TRUE(LabelShows(0, 12, skip));
     EXPECT_TRUE(LabelShows(1, 12, skip));

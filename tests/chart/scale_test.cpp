@@ -63,10 +63,10 @@ TEST(GridStep, TableRowsAndTheirEdges) {
         float range, step;
         int count;
     } cases[] = {
-        {0.10f, 0.005f, 20}, {0.11f, 0.02f, 5},  {0.5f, 0.02f, 25}, {0.51f, 0.05f, 10},
-        {1, 0.05f, 20},      {1.01f, 0.1f, 10},  {3, 0.2f, 15},     {3.5f, 0.3f, 11},
-        {4.5f, 0.4f, 11},    {7, 0.5f, 14},      {15, 1, 15},       {40, 5, 8},
-        {60, 10, 6},         {100, 15, 6},       {157.3f, 15, 10},  {1234, 120, 10},
+        {0.10f, 0.005f, 20}, {0.11f, 0.02f, 5}, {0.5f, 0.02f, 25}, {0.51f, 0.05f, 10},
+        {1, 0.05f, 20},      {1.01f, 0.1f, 10}, {3, 0.2f, 15},     {3.5f, 0.3f, 11},
+        {4.5f, 0.4f, 11},    {7, 0.5f, 14},     {15, 1, 15},       {40, 5, 8},
+        {60, 10, 6},         {100, 15, 6},      {157.3f, 15, 10},  {1234, 120, 10},
         {0, 0, 0},           {-3, 0, 0},
     };
     for (const Case& c : cases) {
@@ -107,7 +107,8 @@ TEST(PriceMap, ArithmeticRoundsHalvesToEvenAndRoundTrips) {
     EXPECT_EQ(m.PriceToY(20), 100);
     EXPECT_EQ(m.PriceToY(15), 350);
     EXPECT_NEAR(m.YToPrice(350), 15.0, 1e-6); // UnitsPerY is a 32-bit 0.02
-    for (int y = 100; y <= 600; y += 7) EXPECT_EQ(m.PriceToY(m.YToPrice(y)), y);
+    for (int y = 100; y <= 600; y += 7)
+        EXPECT_EQ(m.PriceToY(m.YToPrice(y)), y);
 
     PriceMap unit;
     ASSERT_TRUE(unit.Prepare(false, false, 0, 500, 0, 500));
@@ -131,18 +132,19 @@ TEST(PriceMap, LogarithmicFloorsAndKeepsTheZeroAndNegativeStandIns) {
     EXPECT_EQ(m.PriceToY(150), 24);  // 24.99 floors to 24
     EXPECT_EQ(m.PriceToY(0), 260);   // ln 10 stands in: 260.21
     EXPECT_EQ(m.PriceToY(-20), 393); // ln 10 / ln 20 stands in: 393.44
-    for (int y = 10; y <= 400; y += 13) EXPECT_NEAR(m.PriceToY(m.YToPrice(y + 0.5)), y, 0);
+    for (int y = 10; y <= 400; y += 13)
+        EXPECT_NEAR(m.PriceToY(m.YToPrice(y + 0.5)), y, 0);
     EXPECT_NEAR(m.YToPrice(m.PriceToY(50)), 50, 50 * 0.012);
 }
 
 TEST(PriceMap, DegenerateScalesAreRefusedNotDividedBy) {
     PriceMap m;
-    EXPECT_FALSE(m.Prepare(false, false, 5, 5, 100, 600));   // equal ends
-    EXPECT_FALSE(m.Prepare(false, false, 5, 10, 300, 300));  // no height
-    EXPECT_FALSE(m.Prepare(true, false, 0, 10, 100, 600));   // log of 0
-    EXPECT_FALSE(m.Prepare(true, false, -5, 10, 100, 600));  // log of a negative
-    EXPECT_FALSE(m.Prepare(true, false, 5, 5, 100, 600));    // log with equal ends
-    EXPECT_FALSE(m.Prepare(true, false, 5, -10, 100, 600));  // bar chart: no log of the ceiling
+    EXPECT_FALSE(m.Prepare(false, false, 5, 5, 100, 600));  // equal ends
+    EXPECT_FALSE(m.Prepare(false, false, 5, 10, 300, 300)); // no height
+    EXPECT_FALSE(m.Prepare(true, false, 0, 10, 100, 600));  // log of 0
+    EXPECT_FALSE(m.Prepare(true, false, -5, 10, 100, 600)); // log of a negative
+    EXPECT_FALSE(m.Prepare(true, false, 5, 5, 100, 600));   // log with equal ends
+    EXPECT_FALSE(m.Prepare(true, false, 5, -10, 100, 600)); // bar chart: no log of the ceiling
 }
 
 TEST(PriceMap, LineChartCeilingOfZeroKeepsTheFactorOfTheChartBefore) {
