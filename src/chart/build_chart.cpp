@@ -91,6 +91,7 @@ platform::Status BuildOneChart(Chart& c, const ChartBuild& b, PriceSource& sourc
     if (auto s = LoadWindow(c, b, source, style, g); !s) return s;
     const DrawInputs in = InputsOf(b, source);
     if (auto s = DrawLoadedChart(c, in, g, b.Dialogs, surface); !s) return s;
+    if (b.DrawOverlays) b.DrawOverlays(c, surface);
     if (b.Page && !b.Page->Known)
         WorkOutPrinterMargins(*b.Page, c.AreaWidth, c.AreaHeight, b.Defaults.PrintScale);
     return platform::Status::Ok();

@@ -12,6 +12,7 @@
 #include "platform/surface.h"
 
 #include <filesystem>
+#include <functional>
 
 namespace kori::chart {
 
@@ -36,6 +37,9 @@ struct ChartBuild {
     bool PrintBold = false;
     std::int32_t VolumeDivisor = 1;
     PrinterPage* Page = nullptr;
+    // Overlays, trendlines and target lines go on after the trailing labels, into the same
+    // stream while it is still open.
+    std::function<void(Chart&, platform::Surface&)> DrawOverlays;
 };
 
 platform::Status BuildChart(Chart& chart, const ChartBuild& build, PriceSource& source,

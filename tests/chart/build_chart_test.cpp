@@ -166,3 +166,27 @@ TEST(BuildChart, PrinterMarginsOncePerRun) {
     ASSERT_TRUE(r.Build().ok());
     EXPECT_EQ(fresh.PageLeft, 7) << "worked out once per run";
 }
+
+TEST(BuildChart, OverlaysFollowTheTrailingLabelsInTheSameStream) {
+    ChartRig r;
+    r.Add("20240304", 15, 20, 12.5f, 17);
+    ChartRequest& q = r.request;
+    const ChartBuild b{q,
+                       r.defaults,
+                       r.name,
+                       r.palette,
+                       r.fonts,
+                       r.dialogs,
+                       r.streamPath,
+                       false,
+                       1,
+                       nullptr,
+                       [](Chart& c, kori::platform::Surface&) {
+                           c.Stream.Shape('L', 5, c.PriceToY(15), 354, c.PriceToY(15), 20);
+                       }};
+    ASSERT_TRUE(BuildChart(r.chart, b, r.source, r.surface).ok());
+    const auto lines = r.Lines();
+    ASSERT_GE(lines.size(), 2u);
+    EXPECT_EQ(lines[lines.size() - 2], "Z, 7, 269.4, 120,KORI Charting, 27");
+    EXPECT_EQ(lines.back(), "L, 5, 900, 354, 900, 20");
+}
