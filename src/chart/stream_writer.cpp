@@ -2,7 +2,49 @@
 
 #include "platform/text.h"
 
+#include <charconv>
+#include <cmath>
+#include <cstdlib>
+
 namespace kori::chart {
+
+namespace {
+
+// Nearly every number of a chart is whole or has at most two decimals (half-unit ticks, font
+// sizes such as 8.25): those are written directly, exactly as the classic conversion writes
+// them ("-3", " 12", " .5", " 8.25"); anything else goes the long way.
+void AppendNumber(std::string& out, double v) {
+    const double hundredths = v * 100;
+    if (!(std::fabs(v) < 1e12) || hundredths != std::trunc(hundredths)) {
+        out += platform::Str(v);
+        return;
+    }
+    const long long n = std::llabs(static_cast<long long>(hundredths));
+    if (n == 0) {
+        out += " 0";
+        return;
+    }
+    out += v < 0 ? '-' : ' ';
+    const long long whole = n / 100;
+    const int frac = static_cast<int>(n % 100);
+    if (whole != 0 || frac == 0) {
+        char buf[24];
+        const auto r = std::to_chars(buf, buf + sizeof buf, whole);
+        out.append(buf, r.ptr);
+    }
+    if (frac != 0) {
+        out += '.';
+        out += static_cast<char>('0' + frac / 10);
+        if (frac % 10 != 0) out += static_cast<char>('0' + frac % 10);
+    }
+}
+
+void AppendText(std::string& out, std::string_view text) {
+    for (char c : text)
+        if (c != ',' && c != '\r' && c != '\n') out += c;
+}
+
+} // namespace
 
 platform::Status StreamWriter::Open(const std::filesystem::path& path, bool append) {
     Close();
@@ -16,39 +58,58 @@ void StreamWriter::Close() {
 }
 
 std::string StreamWriter::Number(double v) {
-    return platform::Str(v);
+    std::string s;
+    AppendNumber(s, v);
+    return s;
 }
 
 std::string StreamWriter::StripCommas(std::string_view text) {
     std::string r;
     r.reserve(text.size());
-    for (char c : text)
-        if (c != ',' && c != '\r' && c != '\n') r += c;
+    AppendText(r, text);
     return r;
 }
 
 void StreamWriter::WriteLine(const std::string& line) {
     if (RedrawOnly || !m_out.is_open()) return;
-    m_out << line << "\r\n";
+    m_out.write(line.data(), static_cast<std::streamsize>(line.size()));
+    m_out.write("\r\n", 2);
 }
 
 void StreamWriter::Shape(char letter, double x1, double y1, double x2, double y2,
                          platform::Colour colour) {
     if (RedrawOnly || !m_out.is_open()) return;
-    WriteLine(std::string(1, letter) + "," + Number(x1) + "," + Number(y1) + "," + Number(x2) +
-              "," + Number(y2) + "," + Number(colour));
+    std::string line(1, letter);
+    for (double v : {x1, y1, x2, y2, static_cast<double>(colour)}) {
+        line += ',';
+        AppendNumber(line, v);
+    }
+    WriteLine(line);
 }
 
 void StreamWriter::Dot(char letter, double x, double y, platform::Colour colour) {
     if (RedrawOnly || !m_out.is_open()) return;
-    WriteLine(std::string(1, letter) + "," + Number(x) + "," + Number(y) + "," + Number(colour));
+    std::string line(1, letter);
+    for (double v : {x, y, static_cast<double>(colour)}) {
+        line += ',';
+        AppendNumber(line, v);
+    }
+    WriteLine(line);
 }
 
 void StreamWriter::Text(char letter, double size, double x, double y, std::string_view text,
                         platform::Colour colour) {
     if (RedrawOnly || !m_out.is_open()) return;
-    WriteLine(std::string(1, letter) + "," + Number(size) + "," + Number(x) + "," + Number(y) +
-              "," + StripCommas(text) + "," + Number(colour));
+    std::string line(1, letter);
+    for (double v : {size, x, y}) {
+        line += ',';
+        AppendNumber(line, v);
+    }
+    line += ',';
+    AppendText(line, text);
+    line += ',';
+    AppendNumber(line, static_cast<double>(colour));
+    WriteLine(line);
 }
 
 } // namespace kori::chart

@@ -8,6 +8,7 @@
 int main(int argc, char** argv) {
     CLI::App app{"kori - KORI Charting from the command line"};
     app.require_subcommand(1);
+    app.fallthrough(); // global options may follow the subcommand: kori names --root DIR
     app.set_version_flag("--version", "kori 8.0");
     kori::cli::CliContext ctx;
     app.add_option("--root", ctx.root, "Install root (holds Kori.ini); default $KORI_ROOT or ~/.local/share/kori")

@@ -1,11 +1,14 @@
 #include "platform/surface.h"
 
+#include <cmath>
 #include <cstdio>
 
 namespace kori::platform {
 
 namespace {
 std::string Num(double v) {
+    // Whole numbers, the bulk of every chart, skip printf; "%g" would print them the same.
+    if (v != 0 && std::fabs(v) < 1e6 && v == std::trunc(v)) return std::to_string(static_cast<long>(v));
     char buf[32];
     std::snprintf(buf, sizeof buf, "%g", v);
     return buf;

@@ -1,0 +1,88 @@
+// kori-charting: the desktop program.
+#include "app/install_root.h"
+#include "app/session.h"
+#include "gui/services/qt_dialogs.h"
+#include "gui/services/qt_progress.h"
+#include "gui/windows/main_window.h"
+#include "platform/clock.h"
+#include "platform/files.h"
+#include "platform/settings_store.h"
+
+#include <QApplication>
+#include <QCommandLineParser>
+#include <QPainter>
+#include <QPixmap>
+#include <QScreen>
+#include <QSplashScreen>
+#include <QTimer>
+
+namespace {
+
+// The logo window shown while the program initialises.
+QPixmap LogoPixmap() {
+    QPixmap pm(420, 220);
+    pm.fill(QColor(16, 32, 64));
+    QPainter p(&pm);
+    p.setPen(QColor(255, 214, 0));
+    QFont f(QStringLiteral("Liberation Sans"), 30, QFont::Bold);
+    p.setFont(f);
+    p.drawText(pm.rect().adjusted(0, 0, 0, -60), Qt::AlignCenter, QStringLiteral("KORI Charting 8"));
+    p.setPen(Qt::white);
+    p.setFont(QFont(QStringLiteral("Liberation Sans"), 11));
+    p.drawText(pm.rect().adjusted(0, 90, 0, 0), Qt::AlignCenter,
+               QStringLiteral("End-of-day share-market charting"));
+    return pm;
+}
+
+} // namespace
+
+int main(int argc, char** argv) {
+    QApplication qapp(argc, argv);
+    QApplication::setApplicationName(QStringLiteral("kori-charting"));
+    QCommandLineParser parser;
+    parser.addHelpOption();
+    QCommandLineOption rootOpt(QStringLiteral("root"), QStringLiteral("Install root (holds Kori.ini)."),
+                               QStringLiteral("DIR"));
+    parser.addOption(rootOpt);
+    QCommandLineOption shotOpt(QStringLiteral("screenshot"),
+                               QStringLiteral("Save a picture of the main window to FILE and quit."),
+                               QStringLiteral("FILE"));
+    parser.addOption(shotOpt);
+    parser.addPositionalArgument(QStringLiteral("word"), QStringLiteral("RM, A, N or GD"));
+    parser.process(qapp);
+
+    std::optional<std::string> rootArg;
+    if (parser.isSet(rootOpt)) rootArg = parser.value(rootOpt).toStdString();
+    const auto root = kori::app::FindInstallRoot(rootArg);
+    kori::platform::CreateFolder(root);
+
+    kori::gui::QtDialogs dialogs;
+    kori::platform::NullProgress startupProgress;
+    kori::platform::SettingsStore settings(root / "settings.ini");
+    kori::platform::SystemClock clock;
+    kori::app::Session session(root, kori::platform::Services{dialogs, startupProgress, settings, clock});
+
+    QSplashScreen logo(LogoPixmap());
+    logo.show();
+    QApplication::setOverrideCursor(Qt::WaitCursor);
+    session.ReadFolders();
+    QApplication::restoreOverrideCursor();
+    QApplication::processEvents();
+
+    kori::gui::MainWindow main(session);
+    dialogs.SetParent(&main);
+    const QStringList words = parser.positionalArguments();
+    main.SetHideDownloadProgram(!words.isEmpty() && words.first().trimmed() == QStringLiteral("A"));
+    // The main window comes up from an event, after the logo window has painted.
+    QTimer::singleShot(300, &main, [&] {
+        main.show();
+        logo.finish(&main);
+        if (parser.isSet(shotOpt)) {
+            QTimer::singleShot(700, &main, [&] {
+                main.grab().save(parser.value(shotOpt));
+                QApplication::quit();
+            });
+        }
+    });
+    return QApplication::exec();
+}

@@ -1,0 +1,152 @@
+#include "gui/windows/main_window.h"
+
+#include "gui/services/qt_progress.h"
+#include "platform/files.h"
+#include "platform/text.h"
+
+#include <QAction>
+#include <QApplication>
+#include <QCloseEvent>
+#include <QMdiArea>
+#include <QMdiSubWindow>
+#include <QMenuBar>
+#include <QMessageBox>
+#include <QStatusBar>
+
+namespace kori::gui {
+
+namespace {
+QString Q(const std::string& s) { return QString::fromStdString(s); }
+// Sizes in the settings store are twips; fifteen twips make a pixel at 96 dots per inch.
+int TwipsToPixels(const std::string& text, int fallback) {
+    const double v = platform::Val(text);
+    return v > 0 ? static_cast<int>(v / 15.0) : fallback / 15;
+}
+} // namespace
+
+MainWindow::MainWindow(app::Session& session, QWidget* parent)
+    : QMainWindow(parent), m_session(session), m_mdi(new QMdiArea(this)),
+      m_progress(new QtProgress(statusBar())) {
+    setObjectName(QStringLiteral("Main"));
+    setCentralWidget(m_mdi);
+    m_mdi->setViewMode(QMdiArea::SubWindowView);
+    auto& store = m_session.services().settings;
+    const int h = TwipsToPixels(store.Get("Height", "6645"), 6645);
+    const int w = TwipsToPixels(store.Get("Width", "9045"), 9045);
+    resize(std::max(w, 640), std::max(h, 480));
+    SetAction("Exit", [this] {
+        m_ending = true;
+        ULForms();
+        close();
+    });
+    SetAction("AbtKori", [this] { ShowAbout(); });
+    UpdateCaption();
+    RebuildMenus();
+}
+
+MainWindow::~MainWindow() = default;
+
+void MainWindow::UpdateCaption() {
+    setWindowTitle(Q("Kori Charting 8 " + std::string("  -   Current Data Folder ") +
+                     platform::Trim(m_session.folders.DataFolder)));
+}
+
+void MainWindow::SetAction(const std::string& opens, std::function<void()> action) {
+    m_actions[opens] = std::move(action);
+}
+
+app::MenuConditions MainWindow::Conditions() const {
+    app::MenuConditions c;
+    c.DataService = static_cast<int>(platform::Val(
+        const_cast<app::Session&>(m_session).ini().Read("Download", "DataService")));
+    c.HideDownloadProgram = m_hideDownloadProgram;
+    const std::string sys = m_session.folders.SystemFolder;
+    c.MaxScanPresent = platform::FileExists(sys + "KoriMaxScan.exe");
+    c.SecurityDetailsPresent = false; // the company details window is not in this build
+    return c;
+}
+
+void MainWindow::RebuildMenus() {
+    m_tops = app::BuildMenuTree();
+    app::ApplyMenuConditions(m_tops, Conditions());
+    if (m_modal) app::SetModalToolRunning(m_tops, true, Conditions(), m_ending);
+    std::map<std::string, std::string> opensByName;
+    auto available = [this](const std::string& name) {
+        auto tops = app::BuildMenuTree();
+        const auto* item = app::FindItem(tops, name);
+        return item && m_actions.count(item->opens) > 0;
+    };
+    app::KeepAvailable(m_tops, available);
+    // Old menus go later (a rebuild may run from one of their own actions); their names go now
+    // so that nothing finds them by name in the meantime.
+    for (QAction* a : menuBar()->actions()) {
+        if (QMenu* m = a->menu()) {
+            for (QObject* o : m->findChildren<QObject*>()) o->setObjectName(QString());
+            m->setObjectName(QString());
+            m->deleteLater();
+        }
+    }
+    menuBar()->clear();
+    for (const auto& top : m_tops) {
+        if (!top.visible) continue;
+        QMenu* menu = menuBar()->addMenu(Q(top.caption));
+        menu->setObjectName(Q(top.name));
+        AddItems(menu, top.items);
+    }
+}
+
+void MainWindow::AddItems(QMenu* menu, const std::vector<app::MenuItem>& items) {
+    for (const auto& item : items) {
+        if (!item.visible) continue;
+        if (item.separatorBefore) menu->addSeparator();
+        if (!item.items.empty()) {
+            QMenu* sub = menu->addMenu(Q(item.caption));
+            sub->setObjectName(Q(item.name));
+            AddItems(sub, item.items);
+            continue;
+        }
+        QAction* a = menu->addAction(Q(item.caption));
+        a->setObjectName(Q(item.name));
+        a->setEnabled(item.enabled);
+        const std::string name = item.name;
+        connect(a, &QAction::triggered, this, [this, name] { Trigger(name); });
+    }
+}
+
+bool MainWindow::Trigger(const std::string& itemName) {
+    const auto* item = app::FindItem(m_tops, itemName);
+    if (!item || !item->enabled) return false;
+    auto it = m_actions.find(item->opens);
+    if (it == m_actions.end()) return false;
+    it->second();
+    return true;
+}
+
+void MainWindow::SetModalToolRunning(bool running) {
+    m_modal = running;
+    if (!running && m_ending) return;
+    RebuildMenus();
+}
+
+void MainWindow::ULForms() { m_mdi->closeAllSubWindows(); }
+
+void MainWindow::closeEvent(QCloseEvent* e) {
+    // Unloading saves the main window's size (in twips, as the settings hold it).
+    auto& store = m_session.services().settings;
+    if (!isMaximized() && !isMinimized()) {
+        store.Save("Height", std::to_string(height() * 15));
+        store.Save("Width", std::to_string(width() * 15));
+    }
+    m_ending = true;
+    ULForms();
+    e->accept();
+}
+
+void MainWindow::ShowAbout() {
+    QMessageBox::about(this, QStringLiteral("About KORI"),
+                       QStringLiteral("KORI Charting 8\n\nEnd-of-day share-market charting.\n\n"
+                                      "System folder: %1\nData folder: %2")
+                           .arg(Q(m_session.folders.SystemFolder), Q(m_session.folders.DataFolder)));
+}
+
+} // namespace kori::gui

@@ -1,0 +1,64 @@
+#pragma once
+// Main: the frame that holds the menus and every other window as a child.
+#include "app/menu_model.h"
+#include "app/session.h"
+
+#include <QMainWindow>
+
+#include <functional>
+#include <map>
+#include <string>
+
+class QMdiArea;
+class QMenu;
+
+namespace kori::gui {
+
+class QtProgress;
+
+class MainWindow : public QMainWindow {
+    Q_OBJECT
+public:
+    explicit MainWindow(app::Session& session, QWidget* parent = nullptr);
+    ~MainWindow() override;
+
+    QMdiArea* mdiArea() const { return m_mdi; }
+    QtProgress& progress() { return *m_progress; }
+
+    // Sets the caption from the current data folder.
+    void UpdateCaption();
+    // Rebuilds the menus from the tree and the conditions of the moment.
+    void RebuildMenus();
+    // Hides the tops while a tool that must not be interrupted runs.
+    void SetModalToolRunning(bool running);
+    // Closes every child window.
+    void ULForms();
+    // Runs the action behind a menu item by its control name (used by tests and start-up).
+    bool Trigger(const std::string& itemName);
+
+    // Registers what a menu item opens; items without an action are left out of the menus.
+    void SetAction(const std::string& opens, std::function<void()> action);
+
+    app::Session& session() { return m_session; }
+    bool ending() const { return m_ending; }
+    void SetHideDownloadProgram(bool hide) { m_hideDownloadProgram = hide; }
+
+protected:
+    void closeEvent(QCloseEvent* e) override;
+
+private:
+    void AddItems(QMenu* menu, const std::vector<app::MenuItem>& items);
+    app::MenuConditions Conditions() const;
+    void ShowAbout();
+
+    app::Session& m_session;
+    QMdiArea* m_mdi;
+    QtProgress* m_progress;
+    std::vector<app::MenuItem> m_tops;
+    std::map<std::string, std::function<void()>> m_actions; // by `opens`
+    bool m_modal = false;
+    bool m_ending = false;
+    bool m_hideDownloadProgram = false;
+};
+
+} // namespace kori::gui
