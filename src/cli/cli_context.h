@@ -44,5 +44,8 @@ private:
 
 // One function per subcommand; each adds itself to the app.
 void AddInitCommand(CLI::App& app, CliContext& ctx);
+void AddNamesCommand(CLI::App& app, CliContext& ctx);
+void AddBarsCommand(CLI::App& app, CliContext& ctx);
+void AddListsCommand(CLI::App& app, CliContext& ctx);
 
 } // namespace kori::cli

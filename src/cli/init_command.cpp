@@ -1,5 +1,6 @@
 #include "cli/cli_context.h"
 
+#include "app/sample_library.h"
 #include "app/session.h"
 #include "platform/files.h"
 
@@ -28,8 +29,16 @@ void AddInitCommand(CLI::App& app, CliContext& ctx) {
         ini.Write("KoriPaths", "PFMBackUp", f.PFMBackUp);
         ini.Write("Download", "DLPath", f.DownloadFolder);
         ini.Write("KoriDisk", "KoriDrv", "OK");
-        if (*sample) throw CliError{"the sample library is not built yet"};
         std::cout << "Install root ready at " << session.root().string() << "\n";
+        if (*sample) {
+            app::SampleSummary summary;
+            auto st = app::MakeSampleLibrary(f.SystemFolder, f.DataFolder,
+                                             session.services().settings, summary);
+            if (!st) throw CliError{st.message()};
+            std::cout << "Sample library: " << summary.Securities << " securities, "
+                      << summary.Records << " daily records to " << summary.LastDate << " in "
+                      << f.DataFolder << "\n";
+        }
     });
 }
 

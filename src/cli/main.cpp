@@ -17,6 +17,9 @@ int main(int argc, char** argv) {
         ->option_text("DIR");
 
     kori::cli::AddInitCommand(app, ctx);
+    kori::cli::AddNamesCommand(app, ctx);
+    kori::cli::AddBarsCommand(app, ctx);
+    kori::cli::AddListsCommand(app, ctx);
 
     try {
         app.parse(argc, argv);

@@ -1,0 +1,270 @@
+#include "app/sample_library.h"
+
+#include "platform/date_text.h"
+#include "platform/files.h"
+#include "store/chart_list.h"
+#include "store/name_file.h"
+#include "store/price_file.h"
+
+#include <algorithm>
+#include <cmath>
+#include <cstdint>
+#include <vector>
+
+namespace kori::app {
+
+namespace {
+
+constexpr const char* kLastDate = "20261120"; // a Friday
+constexpr int kYears = 6;
+
+// A small generator of our own, so the library is the same on every machine.
+class Random {
+public:
+    explicit Random(std::uint64_t seed) : m_state(seed) {}
+    std::uint64_t Next() {
+        std::uint64_t z = (m_state += 0x9E3779B97F4A7C15ull);
+        z = (z ^ (z >> 30)) * 0xBF58476D1CE4E5B9ull;
+        z = (z ^ (z >> 27)) * 0x94D049BB133111EBull;
+        return z ^ (z >> 31);
+    }
+    double Uniform() { return static_cast<double>(Next() >> 11) * (1.0 / 9007199254740992.0); }
+    double Normal() {
+        const double u1 = std::max(Uniform(), 1e-12), u2 = Uniform();
+        return std::sqrt(-2.0 * std::log(u1)) * std::cos(6.283185307179586 * u2);
+    }
+
+private:
+    std::uint64_t m_state;
+};
+
+struct Security {
+    const char* code;
+    const char* name;
+    std::int16_t type;
+    const char* industry; // three digits or ""
+    const char* gics;     // four digits or ""
+    double start;         // price six years ago
+    double drift;         // yearly
+    double volatility;    // yearly
+    double volume;        // typical daily volume
+    std::int16_t category = 0;
+};
+
+const std::vector<Security>& Securities() {
+    static const std::vector<Security> list = {
+        {"XAO", "All Ordinaries Index (sample)", 1, "", "", 5200, 0.05, 0.14, 900000},
+        {"XJO", "Top 200 Index (sample)", 2, "", "", 5100, 0.05, 0.15, 0},
+        {"ADVDEC", "Advance Decline Line (sample)", 3, "", "", 0, 0, 0, 0},
+        {"KRM", "Karoo Minerals", 4, "121", "1510", 3.20, 0.12, 0.38, 2400000},
+        {"ALX", "Alexandra Resources", 4, "121", "1510", 12.40, 0.06, 0.30, 1100000},
+        {"BWG", "Bowen Gold Fields", 4, "122", "1510", 0.84, 0.18, 0.55, 5200000},
+        {"CPR", "Copperline Holdings", 4, "121", "1510", 1.95, -0.04, 0.45, 3100000},
+        {"DLT", "Delta Lithium Works", 4, "123", "1510", 0.36, 0.25, 0.70, 9800000},
+        {"EMB", "Emberton Energy", 4, "131", "1010", 7.80, 0.03, 0.33, 1500000},
+        {"FRG", "Forge Gas Pipelines", 4, "132", "1010", 4.15, 0.04, 0.24, 800000},
+        {"GLN", "Glenmore Oil Search", 4, "131", "1010", 22.10, 0.02, 0.29, 650000},
+        {"HBK", "Harbour Bank Group", 5, "211", "4010", 31.00, 0.07, 0.20, 1900000},
+        {"IRB", "Ironbark Savings Bank", 4, "211", "4010", 9.45, 0.05, 0.22, 1200000},
+        {"JNS", "Jarrah National Securities", 4, "212", "4020", 5.60, 0.08, 0.28, 700000},
+        {"KST", "Kestrel Insurance", 4, "213", "4030", 6.75, 0.06, 0.21, 950000},
+        {"LMT", "Lamington Trust", 4, "221", "6010", 2.85, 0.03, 0.18, 1400000},
+        {"MRW", "Marrow Property Fund", 4, "221", "6010", 1.42, 0.02, 0.17, 2600000},
+        {"NTL", "Nullarbor Telecom", 4, "311", "5010", 4.90, -0.02, 0.23, 4200000},
+        {"OCR", "Ochre Media", 4, "312", "5020", 0.72, 0.01, 0.40, 1800000},
+        {"PNS", "Pinnacle Software", 4, "321", "4510", 18.30, 0.20, 0.42, 500000},
+        {"QRY", "Quarry Digital", 4, "321", "4510", 0.155, 0.30, 0.80, 12000000},
+        {"RVH", "Riverhead Health", 5, "411", "3510", 88.00, 0.09, 0.24, 300000},
+        {"SLM", "Salmon Gum Pharmaceuticals", 4, "412", "3520", 2.35, 0.11, 0.48, 2100000},
+        {"TWR", "Tower Hill Retail", 4, "511", "2550", 3.95, 0.03, 0.27, 1700000},
+        {"UBT", "Ubirr Tourism", 4, "512", "2530", 1.10, 0.05, 0.36, 900000},
+        {"VNT", "Vantage Transport", 4, "611", "2030", 5.25, 0.04, 0.26, 1300000},
+        {"WLB", "Wallaby Airlines", 4, "611", "2030", 2.65, -0.03, 0.41, 6100000},
+        {"XTN", "Xanthe Construction", 4, "621", "2010", 1.88, 0.06, 0.31, 1000000},
+        {"YRA", "Yarra Water Utilities", 4, "711", "5510", 4.40, 0.04, 0.15, 600000},
+        {"ZNC", "Zinc Coast Smelters", 4, "121", "1510", 0.48, 0.07, 0.52, 4800000},
+        {"ARG", "Argyle Agriculture", 4, "811", "3020", 3.05, 0.05, 0.29, 750000},
+        {"BLV", "Bellevue Beverages", 4, "812", "3020", 8.60, 0.04, 0.22, 450000},
+        {"CSW", "Coastwide Steel", 4, "124", "1510", 2.05, 0.02, 0.34, 2300000},
+        {"DRN", "Darling Renewables", 4, "133", "5510", 0.92, 0.15, 0.50, 3900000},
+        {"ESK", "Eskdale Chemicals", 4, "125", "1510", 6.30, 0.03, 0.25, 520000},
+        {"FLN", "Flinders Logistics", 4, "611", "2030", 3.70, 0.06, 0.28, 880000},
+        {"GRN", "Greenhide Foods", 4, "811", "3020", 1.58, 0.04, 0.33, 1250000},
+        {"HLT", "Highland Timber", 4, "126", "1510", 0.265, 0.00, 0.58, 7300000},
+        {"KRMWOA", "Karoo Minerals Warrant A", 4, "121", "1510", 0.42, 0.10, 0.90, 350000, 84},
+        {"ALXWOB", "Alexandra Resources Warrant B", 4, "121", "1510", 1.05, 0.04, 0.85, 210000, 84},
+        {"HBKWOC", "Harbour Bank Warrant C", 4, "211", "4010", 2.10, 0.06, 0.75, 160000, 84},
+        {"PNSWOD", "Pinnacle Software Warrant D", 4, "321", "4510", 0.66, 0.18, 0.95, 420000, 84},
+    };
+    return list;
+}
+
+std::vector<std::string> Weekdays() {
+    std::vector<std::string> dates;
+    const std::int32_t last = *platform::DaySerial(kLastDate);
+    const std::int32_t first = last - 365 * kYears - kYears / 4;
+    for (std::int32_t d = first; d <= last; ++d) {
+        const auto text = platform::DateTextFromSerial(d);
+        const int wd = *platform::Weekday(*text);
+        if (wd != 1 && wd != 7) dates.push_back(*text);
+    }
+    return dates;
+}
+
+float RoundPrice(double p, std::int16_t type) {
+    if (type == 5 || p >= 1000) return static_cast<float>(std::round(p));
+    if (p < 0.1) return static_cast<float>(std::round(p * 1000) / 1000);
+    if (p < 2) return static_cast<float>(std::round(p * 200) / 200); // half cents
+    return static_cast<float>(std::round(p * 100) / 100);
+}
+
+std::vector<store::PriceRecord> PriceHistory(const Security& s, const std::vector<std::string>& dates,
+                                             Random& rng) {
+    std::vector<store::PriceRecord> out;
+    out.reserve(dates.size());
+    const double dt = 1.0 / 252;
+    double price = s.start;
+    double regime = 0;
+    for (std::size_t i = 0; i < dates.size(); ++i) {
+        // A slowly changing trend over the fixed drift gives charts visible swings.
+        if (i % 60 == 0) regime = rng.Normal() * 0.35;
+        const double ret = (s.drift + regime) * dt + s.volatility * std::sqrt(dt) * rng.Normal();
+        const double open = price * (1 + 0.25 * s.volatility * std::sqrt(dt) * rng.Normal());
+        const double close = std::max(price * std::exp(ret), 0.005);
+        const double span = s.volatility * std::sqrt(dt) * std::fabs(price);
+        const double high = std::max(open, close) + std::fabs(rng.Normal()) * span * 0.6;
+        const double low = std::max(std::min(open, close) - std::fabs(rng.Normal()) * span * 0.6, 0.001);
+        store::PriceRecord r;
+        r.Date = dates[i];
+        r.Open = RoundPrice(open, s.type);
+        r.High = std::max({RoundPrice(high, s.type), r.Open, RoundPrice(close, s.type)});
+        r.Low = std::min({RoundPrice(low, s.type), r.Open, RoundPrice(close, s.type)});
+        r.Close = RoundPrice(close, s.type);
+        if (s.volume > 0) {
+            const double v = s.volume * std::exp(0.5 * rng.Normal()) *
+                             (1 + 3 * std::fabs(ret) / std::max(s.volatility * std::sqrt(dt), 1e-9) / 10);
+            r.Volume = static_cast<std::int32_t>(std::min(v, 2.0e9));
+        }
+        if (s.type == 2) r.Volume = 0;
+        out.push_back(r);
+        price = close;
+    }
+    return out;
+}
+
+std::vector<store::PriceRecord> AdvanceDecline(const std::vector<std::string>& dates, Random& rng) {
+    std::vector<store::PriceRecord> out;
+    double total = 10000;
+    for (const auto& d : dates) {
+        const int advances = 300 + static_cast<int>(rng.Uniform() * 500);
+        const int declines = 300 + static_cast<int>(rng.Uniform() * 500);
+        total += advances - declines;
+        store::PriceRecord r;
+        r.Date = d;
+        r.High = static_cast<float>(advances);
+        r.Low = static_cast<float>(declines);
+        r.Close = static_cast<float>(total);
+        out.push_back(r);
+    }
+    return out;
+}
+
+// Illiquid securities miss some days: those records stand with a close of 0.
+void AddNoTradeDays(std::vector<store::PriceRecord>& recs, Random& rng) {
+    for (std::size_t i = 5; i < recs.size(); ++i) {
+        if (rng.Uniform() < 0.01) {
+            recs[i].Open = recs[i].High = recs[i].Low = recs[i].Close = 0;
+            recs[i].Volume = 0;
+        }
+    }
+}
+
+// A two-for-one split a year before the end: earlier prices halved, the record noted.
+void AddSplit(std::vector<store::PriceRecord>& recs) {
+    const std::size_t at = recs.size() - 252;
+    for (std::size_t i = 0; i < at; ++i) {
+        recs[i].Open /= 2;
+        recs[i].High /= 2;
+        recs[i].Low /= 2;
+        recs[i].Close /= 2;
+        recs[i].Volume *= 2;
+    }
+    recs[at].AdjFactor = 0.5f;
+    recs[at].AdjDesc = "Split 2 for 1";
+}
+
+platform::Status WriteClassFiles(const std::string& systemFolder) {
+    const std::string indClass =
+        "121,Base Metals\r\n122,Gold\r\n123,Battery Metals\r\n124,Steel\r\n125,Chemicals\r\n"
+        "126,Forestry\r\n131,Oil and Gas\r\n132,Gas Transport\r\n133,Renewable Energy\r\n"
+        "211,Banks\r\n212,Stockbroking\r\n213,Insurance\r\n221,Property Trusts\r\n"
+        "311,Telecommunications\r\n312,Media\r\n321,Software\r\n411,Hospitals\r\n"
+        "412,Pharmaceuticals\r\n511,Retail\r\n512,Tourism\r\n611,Transport\r\n"
+        "621,Construction\r\n711,Water\r\n811,Food\r\n812,Beverages\r\n";
+    const std::string gics =
+        "1010,Energy,Energy\r\n1510,Materials,Materials\r\n2010,Industrials,Capital Goods\r\n"
+        "2030,Industrials,Transportation\r\n2530,Consumer Discretionary,Consumer Services\r\n"
+        "2550,Consumer Discretionary,Retailing\r\n3020,Consumer Staples,Food Beverage and Tobacco\r\n"
+        "3510,Health Care,Equipment and Services\r\n3520,Health Care,Pharmaceuticals\r\n"
+        "4010,Financials,Banks\r\n4020,Financials,Diversified Financials\r\n"
+        "4030,Financials,Insurance\r\n4510,Information Technology,Software and Services\r\n"
+        "5010,Communication Services,Telecommunication\r\n5020,Communication Services,Media\r\n"
+        "5510,Utilities,Utilities\r\n6010,Real Estate,Real Estate\r\n";
+    if (auto s = platform::WriteFileAtomic(platform::ResolveIn(systemFolder, "IndClass.dat"), indClass); !s)
+        return s;
+    return platform::WriteFileAtomic(platform::ResolveIn(systemFolder, "Gics.dat"), gics);
+}
+
+} // namespace
+
+platform::Status MakeSampleLibrary(const std::string& systemFolder, const std::string& dataFolder,
+                                   platform::SettingsStore& settings, SampleSummary& summary) {
+    platform::CreateFolder(dataFolder);
+    const auto dates = Weekdays();
+    Random rng(20261120);
+    std::vector<store::NameRecord> names;
+    summary = SampleSummary{};
+    for (const auto& s : Securities()) {
+        store::NameRecord n;
+        n.Code = s.code;
+        n.Name = s.name;
+        n.RecordType = s.type;
+        n.IndustryClass = s.industry;
+        n.GicsSector = s.gics;
+        n.Category = s.category != 0 ? s.category : std::int16_t{1};
+        names.push_back(n);
+
+        std::vector<store::PriceRecord> recs =
+            s.type == 3 ? AdvanceDecline(dates, rng) : PriceHistory(s, dates, rng);
+        if (std::string(s.code).size() == 6 || std::string(s.code) == "HLT") AddNoTradeDays(recs, rng);
+        if (std::string(s.code) == "ALX") AddSplit(recs);
+        store::PriceFile pf(store::PriceFile::PathFor(dataFolder, s.code));
+        if (auto st = pf.WriteAll(recs); !st) return st;
+        summary.Records += static_cast<int>(recs.size());
+    }
+    names[names.size() - 4].OtherDetails = "Exp 30/06/27"; // a warrant's details
+    names[3].PercentBandUp = 8;
+    names[3].PercentBandDown = 8;
+    store::NameFile nf(store::NameFile::PathIn(dataFolder));
+    if (auto st = nf.WriteAll(names); !st) return st;
+    summary.Securities = static_cast<int>(names.size());
+    summary.LastDate = kLastDate;
+
+    if (auto st = WriteClassFiles(systemFolder); !st) return st;
+    if (auto st = store::SaveListFromCodes(dataFolder, 'A', {"HBK", "IRB", "JNS", "KST", "LMT"}); !st)
+        return st;
+    if (auto st = store::SaveListFromCodes(dataFolder, 'B',
+                                           {"KRM", "ALX", "BWG", "CPR", "DLT", "ZNC", "CSW", "ESK"});
+        !st)
+        return st;
+    if (auto st = store::SaveListFromCodes(dataFolder, 'C', {"XAO", "PNS", "QRY", "DRN", "KRMWOA"}); !st)
+        return st;
+    auto listNames = store::GetSubLists(settings);
+    listNames[0] = "Banks and Finance";
+    listNames[1] = "Resources";
+    listNames[2] = "Watching";
+    store::SaveSLNames(settings, listNames);
+    return platform::Status::Ok();
+}
+
+} // namespace kori::app
