@@ -15,13 +15,6 @@ inline constexpr const char* kFormatInvalidText =
     "There is problem displaying this chart - format invalid.";
 inline constexpr const char* kShowSavedChartTitle = "Show Saved Chart";
 
-enum class PlayOutcome {
-    Played,        // at least one instruction was drawn
-    NothingPlayed, // no recognised instruction
-    Malformed,     // a line of more than six fields, or a number out of range
-    Unreadable,    // the file could not be read
-};
-
 // Plays every instruction of `reader` onto `area` by the screen's rules. What was drawn before
 // a failure stays drawn.
 PlayOutcome PlayOnScreen(StreamReader& reader, platform::Surface& area,

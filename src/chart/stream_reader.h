@@ -64,6 +64,15 @@ private:
     std::size_t m_lineNumber = 0;
 };
 
+// How a play-back of a stream ended.
+enum class PlayOutcome {
+    Played,        // at least one instruction was drawn
+    NothingPlayed, // no recognised instruction
+    Malformed,     // a line of more than six fields, or a number out of range
+    Unreadable,    // the file could not be read
+    PrinterFailed, // the page could not be finished
+};
+
 // Colour text of a field as the packed 32-bit value; false when it does not fit 32 bits.
 [[nodiscard]] bool ReadStreamColour(std::string_view field, platform::Colour& colour);
 
