@@ -1,0 +1,59 @@
+#pragma once
+// The number rules the file formats and charts were built on: rounding to nearest with halves
+// to even, the classic conversions to 16- and 32-bit integers (which report an overflow rather
+// than wrap), integer parts, and a fixed-point currency of four decimals.
+#include <compare>
+#include <cstdint>
+#include <optional>
+
+namespace kori::platform {
+
+// Nearest whole number, halves to the even one (2.5 -> 2, 3.5 -> 4, -2.5 -> -2), whatever the
+// floating-point rounding mode in force.
+double RoundHalfEven(double x);
+// To `decimals` places, halves to even, on the scaled binary value (so 2.675, held as
+// 2.67499..., gives 2.67).
+double RoundHalfEven(double x, int decimals);
+
+// Classic CInt and CLng: round half to even, then fit the width; nullopt when it does not fit
+// (or for NaN), where the classic routine raised an overflow.
+std::optional<std::int16_t> CInt(double x);
+std::optional<std::int32_t> CLng(double x);
+
+// Integer parts: Fix truncates toward zero, Int floors (Int(-2.5) is -3, Fix(-2.5) is -2).
+double Fix(double x);
+double Int(double x);
+// Fix, then fit the width; nullopt when it does not fit.
+std::optional<std::int16_t> FixToInt16(double x);
+std::optional<std::int32_t> FixToInt32(double x);
+
+// Currency: a 64-bit count of ten-thousandths. Conversions and products round ties to even.
+class Money {
+public:
+    static constexpr std::int64_t kScale = 10000;
+
+    constexpr Money() = default;
+    static constexpr Money FromRaw(std::int64_t tenThousandths) { return Money(tenThousandths); }
+    // Rounded to four decimals on the decimal digits of the value (15 significant), halves to
+    // even; nullopt when the value is out of range or not a number.
+    static std::optional<Money> FromDouble(double value);
+
+    constexpr std::int64_t raw() const { return m_raw; }
+    double ToDouble() const { return static_cast<double>(m_raw) / kScale; }
+
+    constexpr Money operator+(Money o) const { return Money(m_raw + o.m_raw); }
+    constexpr Money operator-(Money o) const { return Money(m_raw - o.m_raw); }
+    constexpr Money operator-() const { return Money(-m_raw); }
+    // Product rounded to four decimals, halves to even; nullopt on overflow.
+    std::optional<Money> Times(Money o) const;
+    // Quotient as a double, as mixed currency arithmetic gives it; nullopt for a zero divisor.
+    std::optional<double> DividedBy(Money o) const;
+
+    constexpr auto operator<=>(const Money&) const = default;
+
+private:
+    constexpr explicit Money(std::int64_t raw) : m_raw(raw) {}
+    std::int64_t m_raw = 0;
+};
+
+} // namespace kori::platform
