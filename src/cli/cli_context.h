@@ -44,5 +44,6 @@ private:
 
 // One function per subcommand; each adds itself to the app.
 void AddInitCommand(CLI::App& app, CliContext& ctx);
+void AddPlayCommand(CLI::App& app, CliContext& ctx);
 
 } // namespace kori::cli

@@ -17,6 +17,7 @@ int main(int argc, char** argv) {
         ->option_text("DIR");
 
     kori::cli::AddInitCommand(app, ctx);
+    kori::cli::AddPlayCommand(app, ctx);
 
     try {
         app.parse(argc, argv);
