@@ -47,5 +47,6 @@ void AddInitCommand(CLI::App& app, CliContext& ctx);
 void AddNamesCommand(CLI::App& app, CliContext& ctx);
 void AddBarsCommand(CLI::App& app, CliContext& ctx);
 void AddListsCommand(CLI::App& app, CliContext& ctx);
+void AddPlayCommand(CLI::App& app, CliContext& ctx);
 
 } // namespace kori::cli

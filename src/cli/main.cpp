@@ -20,6 +20,7 @@ int main(int argc, char** argv) {
     kori::cli::AddNamesCommand(app, ctx);
     kori::cli::AddBarsCommand(app, ctx);
     kori::cli::AddListsCommand(app, ctx);
+    kori::cli::AddPlayCommand(app, ctx);
 
     try {
         app.parse(argc, argv);
