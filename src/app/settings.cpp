@@ -82,7 +82,7 @@ FontSettings ReadFontSettings(const IniFile& ini) {
     f.SFontSize = Trim(ini.Read("Chart Fonts", "SFontSize"));
     // The default for the scale font size tests and sets the chart font size instead, which
     // by now is never unset: an unset SFontSize stays "unknown". Kept as the program has it.
-    if (IsUnknownOrEmpty(f.CFontSize)) f.CFontSize = "6";
+    if (IsUnknownOrEmpty(f.CFontSize)) f.CFontSize = std::string(1, '6');
     return f;
 }
 

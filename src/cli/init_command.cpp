@@ -1,6 +1,8 @@
 #include "cli/cli_context.h"
 
+#include "app/folder_config.h"
 #include "app/session.h"
+#include "app/start_up.h"
 #include "platform/files.h"
 
 #include <CLI/CLI.hpp>
@@ -20,14 +22,11 @@ void AddInitCommand(CLI::App& app, CliContext& ctx) {
         for (const auto& folder : {f.SystemFolder, f.DataFolder, f.PFMData, f.ChartBackupFolder,
                                    f.PFMBackUp, f.DownloadFolder, f.ChtMiscFolder, f.ChtSaveFolder})
             if (!platform::CreateFolder(folder)) throw CliError{"Cannot create " + folder};
-        auto& ini = session.ini();
-        ini.Write("KoriPaths", "System", f.SystemFolder);
-        ini.Write("KoriPaths", "ChtData", f.DataFolder);
-        ini.Write("KoriPaths", "ChtBackUp", f.ChartBackupFolder);
-        ini.Write("KoriPaths", "PFMData", f.PFMData);
-        ini.Write("KoriPaths", "PFMBackUp", f.PFMBackUp);
-        ini.Write("Download", "DLPath", f.DownloadFolder);
-        ini.Write("KoriDisk", "KoriDrv", "OK");
+        app::WritePaths(session);
+        // Colours as start-up has them: an existing koriclr.dat stays, else the "Black" scheme.
+        app::LoadColours(session);
+        if (!platform::FileExists(platform::ResolveIn(f.SystemFolder, "koriclr.dat")))
+            throw CliError{"Cannot write " + f.SystemFolder + "koriclr.dat"};
         if (*sample) throw CliError{"the sample library is not built yet"};
         std::cout << "Install root ready at " << session.root().string() << "\n";
     });

@@ -71,14 +71,6 @@ TEST(ColourTable, SchemeFileWinsOverTheBuiltInColours) {
     EXPECT_EQ(root.Read("koriclr.dat"), root.Read("KORICLR.wht"));
 }
 
-TEST(ColourTable, RoleNamesInWindowOrder) {
-    const auto& names = ColourRoleNames();
-    EXPECT_EQ(names.front(), "Background");
-    EXPECT_EQ(names[2], "Scales / text");
-    EXPECT_EQ(names[19], "Oscillator Line 1");
-    EXPECT_EQ(names.back(), "End of year marker");
-}
-
 TEST(PrinterFile, OneRecordOfTwoSixteenBitValues) {
     TempRoot root;
     const std::string file = root.folder() + "koriprn.dat";

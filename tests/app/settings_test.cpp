@@ -108,13 +108,6 @@ TEST_F(IniCase, ScaleFontSizeDefaultSlipsOntoTheChartFontSize) {
     EXPECT_EQ(ReadFontSettings(ini).ToChartFonts().Size2, 7);
 }
 
-TEST_F(IniCase, FontsAreWrittenToEitherSection) {
-    WriteFontSettings(ini, {"Courier", "9", "Arial", "7"});
-    WriteFontSettings(ini, {"Courier", "9", "Arial", "7"}, "ChartFonts");
-    EXPECT_EQ(ini.Read("Chart Fonts", "SFontSize"), "7");
-    EXPECT_EQ(ini.Read("ChartFonts", "CFont"), "Courier");
-}
-
 TEST_F(IniCase, AdjustmentPageAndListSettingsReadBackWhatWasWritten) {
     EXPECT_FALSE(ReadAdjustmentSettings(ini).NoShortNames);
     Set("Adjustments", "NoShortNames", "yes"); // only the words count
