@@ -1,0 +1,29 @@
+#pragma once
+// LoadChartSeries: daily records of a price file into chart bars, daily, weekly or monthly.
+#include "platform/status.h"
+#include "store/chart_bars.h"
+
+#include <cstdint>
+#include <string>
+#include <string_view>
+
+namespace kori::store {
+
+struct SeriesRequest {
+    std::int16_t FirstRecord = 1;
+    std::int16_t LastRecord = 0;
+    char Period = 'A'; // 'A' daily, 'W' weekly, 'M' monthly
+    bool WantVolume = true;
+    std::int16_t RecordType = 4;
+};
+
+// Folds the records first..last held in `bytes` (50 bytes each, record FirstRecord first).
+// `fileName` names the file in an error about a malformed date.
+platform::Status LoadChartSeriesFromBytes(std::string_view bytes, const SeriesRequest& request,
+                                          std::string_view fileName, ChartSeries& series);
+
+// Opens the price file, reads the window in one read and folds it.
+platform::Status LoadChartSeries(const std::string& priceFilePath, const SeriesRequest& request,
+                                 ChartSeries& series);
+
+} // namespace kori::store

@@ -1,0 +1,96 @@
+#include "store/chart_list.h"
+#include "store/name_file.h"
+#include "store_builders.h"
+#include "support/temp_root.h"
+
+#include <gtest/gtest.h>
+
+using namespace kori::store;
+using kori::test::Name;
+
+namespace {
+void Names(const kori::test::TempRoot& root, std::vector<const char*> codes) {
+    std::vector<NameRecord> recs;
+    for (auto c : codes) recs.push_back(Name(c, c));
+    NameFile f(NameFile::PathIn(root.folder()));
+    ASSERT_TRUE(f.WriteAll(recs).ok());
+}
+} // namespace
+
+TEST(ChartList, SavingFromCodesDropsUnknownsAndKeepsDuplicates) {
+    kori::test::TempRoot root;
+    Names(root, {"AAA", "BBB", "CCC"});
+    ASSERT_TRUE(SaveListFromCodes(root.folder(), 'A', {" CCC ", "", "ZZZ", "AAA", "CCC"}).ok());
+    std::vector<ChartListEntry> list;
+    ASSERT_TRUE(ReadList(ListPath(root.folder(), 'A'), list).ok());
+    ASSERT_EQ(list.size(), 3u);
+    EXPECT_EQ(list[0].NameRecord, 3);
+    EXPECT_EQ(list[1].NameRecord, 1);
+    EXPECT_EQ(list[2].Code, "CCC   ");
+}
+
+TEST(ChartList, RelinkFollowsTheCodesAndKeepsAListThatWouldEmpty) {
+    kori::test::TempRoot root;
+    Names(root, {"AAA", "BBB", "CCC"});
+    ASSERT_TRUE(SaveListFromCodes(root.folder(), 'A', {"CCC", "AAA"}).ok());
+    ASSERT_TRUE(SaveListFromCodes(root.folder(), 'B', {"BBB"}).ok());
+    Names(root, {"CCC", "AAA"}); // re-sorted, BBB gone
+    kori::platform::NullProgress progress;
+    EXPECT_EQ(RelinkLists(root.folder(), progress), 1);
+    std::vector<ChartListEntry> a, b;
+    ASSERT_TRUE(ReadList(ListPath(root.folder(), 'A'), a).ok());
+    EXPECT_EQ(a[0].NameRecord, 1);
+    EXPECT_EQ(a[1].NameRecord, 2);
+    ASSERT_TRUE(ReadList(ListPath(root.folder(), 'B'), b).ok());
+    ASSERT_EQ(b.size(), 1u) << "an emptied list keeps its stale entry";
+    EXPECT_EQ(b[0].NameRecord, 2);
+}
+
+TEST(ChartList, RelinkStopsOnCancelAndNeedsTwoNames) {
+    kori::test::TempRoot root;
+    Names(root, {"AAA", "BBB"});
+    ASSERT_TRUE(SaveListFromCodes(root.folder(), 'A', {"BBB"}).ok());
+    Names(root, {"BBB", "AAA"});
+    kori::platform::NullProgress progress;
+    progress.RequestCancel();
+    EXPECT_EQ(RelinkLists(root.folder(), progress), 0);
+    Names(root, {"BBB"});
+    progress.ResetCancel();
+    EXPECT_EQ(RelinkLists(root.folder(), progress), 0) << "one name record: nothing is done";
+}
+
+TEST(ChartList, TmpNamesFollowTheListAndSkipEntriesPastTheEnd) {
+    kori::test::TempRoot root;
+    Names(root, {"AAA", "BBB"});
+    ASSERT_TRUE(WriteList(ListPath(root.folder(), 'C'), {{2, "BBB"}, {7, "XXX"}, {1, "ZZZ"}}).ok());
+    ASSERT_TRUE(BuildTmpNames(root.folder(), "SubListC.Dat").ok());
+    NameFile tmp(root.path() / "TmpNames.tmp");
+    ASSERT_TRUE(tmp.Open().ok());
+    ASSERT_EQ(tmp.Count(), 2);
+    NameRecord r;
+    ASSERT_TRUE(tmp.Read(2, r).ok());
+    EXPECT_EQ(r.TrimmedCode(), "AAA") << "the list's number is trusted over its code";
+    EXPECT_EQ(r.Base, 1.0f);
+}
+
+TEST(ChartList, ImportFilterNamesAndModes) {
+    EXPECT_TRUE(IsImportableCode("BHP"));
+    EXPECT_TRUE(IsImportableCode("abc123"));
+    EXPECT_FALSE(IsImportableCode("ABCDEFG"));
+    EXPECT_FALSE(IsImportableCode("BH P"));
+    EXPECT_FALSE(IsImportableCode(""));
+    EXPECT_EQ(ListLetterOfMode(2), 'A');
+    EXPECT_EQ(ListLetterOfMode(10), 'J');
+    EXPECT_EQ(ListLetterOfMode(12), 'Z');
+    EXPECT_EQ(ListLetterOfMode(1), 0);
+    kori::test::TempRoot root;
+    kori::platform::SettingsStore store(root.path() / "s.ini");
+    auto names = GetSubLists(store);
+    EXPECT_EQ(names[8], "Chart List J");
+    names[0] = "Banks";
+    SaveSLNames(store, names);
+    EXPECT_EQ(GetSubLists(store)[0], "Banks");
+    EXPECT_EQ(EmptyListMessage("Banks"),
+              " There are no records in Banks for this folder.\n At Main Menu click EDIT / Edit "
+              "Chart Lists to create your special interest list");
+}
