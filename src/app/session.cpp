@@ -1,5 +1,6 @@
 #include "app/session.h"
 
+#include "app/folder_config.h"
 #include "platform/files.h"
 #include "platform/text.h"
 
@@ -10,6 +11,7 @@ using platform::FolderWithSlash;
 Session::Session(std::filesystem::path root, platform::Services services)
     : m_root(std::move(root)), m_ini(m_root / "Kori.ini"), m_services(services) {
     folders = DefaultFolders();
+    fonts = fontSettings.ToChartFonts();
 }
 
 Folders Session::DefaultFolders() const {
@@ -37,10 +39,27 @@ void Session::ReadFolders() {
     folders.ChartBackupFolder = read("KoriPaths", "ChtBackUp", d.ChartBackupFolder);
     folders.PFMData = read("KoriPaths", "PFMData", d.PFMData);
     folders.PFMBackUp = read("KoriPaths", "PFMBackUp", d.PFMBackUp);
+    download = ReadDownloadSettings(m_ini);
     folders.DownloadFolder = read("Download", "DLPath", d.DownloadFolder);
-    folders.IndicesFolder = folders.DataFolder;
     folders.ChtMiscFolder = folders.SystemFolder + "chtmisc/";
     folders.ChtSaveFolder = folders.SystemFolder + "chtsave/";
+
+    chartDataPaths = {};
+    folders.IndicesFolder = folders.DataFolder;
+    if (download.DataService != 3) return;
+    // A missing list leaves the paths empty; the indices then stay in the DataFolder.
+    if (const auto paths = ReadChartPathsFile(folders.SystemFolder + "ChtPaths.lst"))
+        chartDataPaths = *paths;
+    if (!chartDataPaths[kIndicesPath].empty()) folders.IndicesFolder = chartDataPaths[kIndicesPath];
+}
+
+void Session::ReadSettings() {
+    fontSettings = ReadFontSettings(m_ini);
+    fonts = fontSettings.ToChartFonts();
+    page = ReadPageSettings(m_ini);
+    zoom = ReadZoom(m_ini);
+    adjustments = ReadAdjustmentSettings(m_ini);
+    subLists = ReadSubListSettings(m_ini);
 }
 
 } // namespace kori::app

@@ -1,7 +1,9 @@
 #include "cli/cli_context.h"
 
+#include "app/folder_config.h"
 #include "app/sample_library.h"
 #include "app/session.h"
+#include "app/start_up.h"
 #include "platform/files.h"
 
 #include <CLI/CLI.hpp>
@@ -21,14 +23,11 @@ void AddInitCommand(CLI::App& app, CliContext& ctx) {
         for (const auto& folder : {f.SystemFolder, f.DataFolder, f.PFMData, f.ChartBackupFolder,
                                    f.PFMBackUp, f.DownloadFolder, f.ChtMiscFolder, f.ChtSaveFolder})
             if (!platform::CreateFolder(folder)) throw CliError{"Cannot create " + folder};
-        auto& ini = session.ini();
-        ini.Write("KoriPaths", "System", f.SystemFolder);
-        ini.Write("KoriPaths", "ChtData", f.DataFolder);
-        ini.Write("KoriPaths", "ChtBackUp", f.ChartBackupFolder);
-        ini.Write("KoriPaths", "PFMData", f.PFMData);
-        ini.Write("KoriPaths", "PFMBackUp", f.PFMBackUp);
-        ini.Write("Download", "DLPath", f.DownloadFolder);
-        ini.Write("KoriDisk", "KoriDrv", "OK");
+        app::WritePaths(session);
+        // Colours as start-up has them: an existing koriclr.dat stays, else the "Black" scheme.
+        app::LoadColours(session);
+        if (!platform::FileExists(platform::ResolveIn(f.SystemFolder, "koriclr.dat")))
+            throw CliError{"Cannot write " + f.SystemFolder + "koriclr.dat"};
         std::cout << "Install root ready at " << session.root().string() << "\n";
         if (*sample) {
             app::SampleSummary summary;

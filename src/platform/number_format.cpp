@@ -267,11 +267,15 @@ std::string FormatSection(double magnitude, std::string_view section, int signif
 }
 
 std::string GeneralNumber(double value, int significant) {
-    std::string s = Trim(significant > 7 ? Str(value) : StrSingle(static_cast<float>(value)));
+    const std::string s =
+        Trim(significant > 7 ? Str(value) : StrSingle(static_cast<float>(value)));
     // The classic general form keeps the zero before the point that Str drops.
-    if (s.starts_with('.')) s.insert(0, "0");
-    if (s.starts_with("-.")) s.insert(1, "0");
-    return s;
+    const bool negative = s.starts_with('-');
+    const std::string_view body = std::string_view(s).substr(negative ? 1 : 0);
+    std::string out = negative ? "-" : "";
+    if (body.starts_with('.')) out += '0';
+    out += body;
+    return out;
 }
 
 std::string FormatWith(double value, std::string_view pattern, int significant) {
@@ -283,7 +287,9 @@ std::string FormatWith(double value, std::string_view pattern, int significant) 
         return FormatSection(0.0, sections[2], significant);
     if (negative && sections.size() >= 2 && !sections[1].empty())
         return FormatSection(-value, sections[1], significant);
-    return (negative ? "-" : "") + FormatSection(std::fabs(value), sections[0], significant);
+    std::string out = negative ? "-" : "";
+    out += FormatSection(std::fabs(value), sections[0], significant);
+    return out;
 }
 
 // ---- dates ----------------------------------------------------------------------------------

@@ -74,7 +74,8 @@ std::optional<Money> Money::FromDouble(double value) {
     std::string kept = digits.substr(0, std::min(keep, digits.size()));
     kept.append(keep - kept.size(), '0');
     const std::string rest = keep < digits.size() ? digits.substr(keep) : "";
-    const std::string half = "5" + std::string(rest.empty() ? 0 : rest.size() - 1, '0');
+    std::string half(rest.size(), '0'); // the remainder that is exactly one half
+    if (!half.empty()) half.front() = '5';
     unsigned long long units = kept.empty() ? 0 : std::stoull(kept);
     const int cmp = rest.empty() ? -1 : rest.compare(half);
     if (cmp > 0 || (cmp == 0 && units % 2 == 1)) ++units;
