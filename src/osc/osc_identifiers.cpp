@@ -29,11 +29,24 @@ constexpr OscIdentifier kIdentifiers[] = {
 };
 
 constexpr std::string_view kMultiOscChoices[] = {
-    "None",         "Average True Range", "Directional Movement", "Coppock",
-    "Elder Ray",    "FX",                 "Jones Holy Grail",     "OBV",
-    "MACD",         "Momentum",           "ROC",                  "ROC and FX",
-    "RMX",          "RSI",                "Stochastic (Fast)",    "Stochastic (Slow)",
-    "Volatility",   "Williams %R",
+    "None",
+    "Average True Range",
+    "Directional Movement",
+    "Coppock",
+    "Elder Ray",
+    "FX",
+    "Jones Holy Grail",
+    "OBV",
+    "MACD",
+    "Momentum",
+    "ROC",
+    "ROC and FX",
+    "RMX",
+    "RSI",
+    "Stochastic (Fast)",
+    "Stochastic (Slow)",
+    "Volatility",
+    "Williams %R",
 };
 
 std::string SlotText(std::string_view text) {
@@ -43,7 +56,9 @@ std::string SlotText(std::string_view text) {
 
 } // namespace
 
-std::span<const OscIdentifier> OscIdentifiers() { return kIdentifiers; }
+std::span<const OscIdentifier> OscIdentifiers() {
+    return kIdentifiers;
+}
 
 const OscIdentifier* FindOscIdentifier(std::string_view oscName) {
     const std::string name = platform::Trim(oscName);
@@ -65,15 +80,18 @@ std::optional<OscChoice> OscChoiceForListName(std::string_view listName) {
     const std::string name = platform::Trim(listName);
     for (const auto& id : kIdentifiers) {
         if (!id.ListName.empty() && id.ListName == name) return OscChoice{id.OscName, false};
-        if (!id.SlowListName.empty() && id.SlowListName == name)
-            return OscChoice{id.OscName, true};
+        if (!id.SlowListName.empty() && id.SlowListName == name) return OscChoice{id.OscName, true};
     }
     return std::nullopt;
 }
 
-std::span<const std::string_view> MultiOscChoices() { return kMultiOscChoices; }
+std::span<const std::string_view> MultiOscChoices() {
+    return kMultiOscChoices;
+}
 
-std::string MultiOscKey(int set) { return "Multi-Osc " + std::to_string(set); }
+std::string MultiOscKey(int set) {
+    return "Multi-Osc " + std::to_string(set);
+}
 
 MultiOscSet LoadMultiOscSet(const platform::SettingsStore& store, int set) {
     MultiOscSet result;

@@ -83,9 +83,13 @@ std::string ReadText(const platform::IniFile& ini, std::string_view key) {
     return ini.Read(kOscDefSection, key);
 }
 
-bool WeeklyColumn(std::string_view chartPeriod) { return platform::Trim(chartPeriod) != "A"; }
+bool WeeklyColumn(std::string_view chartPeriod) {
+    return platform::Trim(chartPeriod) != "A";
+}
 
-bool InRange(const OscPeriodKey& k, std::int16_t v) { return v >= k.Min && v <= k.Max; }
+bool InRange(const OscPeriodKey& k, std::int16_t v) {
+    return v >= k.Min && v <= k.Max;
+}
 
 // The first tested key of the oscillator whose value is out of range, if any.
 const OscPeriodKey* FirstFailingKey(const OscDef& def, std::string_view oscName, bool weekly,
@@ -100,7 +104,9 @@ const OscPeriodKey* FirstFailingKey(const OscDef& def, std::string_view oscName,
     return nullptr;
 }
 
-bool UsesCompareFile(std::string_view oscName) { return oscName == "RMO" || oscName == "RMX"; }
+bool UsesCompareFile(std::string_view oscName) {
+    return oscName == "RMO" || oscName == "RMX";
+}
 
 std::optional<OscMessage> CompareFileProblem(const OscDef& def) {
     if (platform::FileExists(platform::ResolvePath(platform::NormalisePath(def.CompFile))))
@@ -112,7 +118,9 @@ std::optional<OscMessage> CompareFileProblem(const OscDef& def) {
 
 } // namespace
 
-std::span<const OscPeriodKey> OscPeriodKeys() { return kPeriodKeys; }
+std::span<const OscPeriodKey> OscPeriodKeys() {
+    return kPeriodKeys;
+}
 
 const OscPeriodKey* FindOscPeriodKey(std::string_view dailyKey) {
     for (const auto& k : OscPeriodKeys())
@@ -212,8 +220,7 @@ bool CheckOscSettings(const OscDef& def, std::string_view oscName, std::string_v
     return false;
 }
 
-std::optional<OscMessage> OscFormProblem(const OscDef& def, std::string_view oscName,
-                                         bool weekly) {
+std::optional<OscMessage> OscFormProblem(const OscDef& def, std::string_view oscName, bool weekly) {
     if (FirstFailingKey(def, oscName, weekly, false) != nullptr)
         return OscMessage{" Periods must be between 1 - 200 ", "Oscillator Values"};
     if (!UsesCompareFile(oscName)) return std::nullopt;

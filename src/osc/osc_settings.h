@@ -90,8 +90,7 @@ bool CheckOscSettings(const OscDef& def, std::string_view oscName, std::string_v
                       std::string_view targetName, platform::Dialogs& dialogs);
 
 // Validation of the settings dialog's OK for the oscillator's own column.
-std::optional<OscMessage> OscFormProblem(const OscDef& def, std::string_view oscName,
-                                         bool weekly);
+std::optional<OscMessage> OscFormProblem(const OscDef& def, std::string_view oscName, bool weekly);
 // The point-and-figure form of the same dialog: its single "Box Value " field.
 std::optional<OscMessage> BoxValueProblem(std::string_view text);
 

@@ -16,9 +16,9 @@ TEST(OscSettings, MissingKeysReadAsZeroAndFalse) {
     root.Write("Kori.ini", "[OscDef]\r\nStochK=12abc\r\nRsiPW=70000\r\nFXRev=True\r\n"
                            "FillIn=-1\r\nCompFile=  C:\\data\\XAO.WDT  \r\n");
     const OscDef def = ReadOscSettings(platform::IniFile(root.path() / "Kori.ini"));
-    EXPECT_EQ(def.StochK, 12);  // the leading number of the text
-    EXPECT_EQ(def.RsiPW, 0);    // beyond 16 bits: not set
-    EXPECT_EQ(def.StochD, 0);   // absent
+    EXPECT_EQ(def.StochK, 12); // the leading number of the text
+    EXPECT_EQ(def.RsiPW, 0);   // beyond 16 bits: not set
+    EXPECT_EQ(def.StochD, 0);  // absent
     EXPECT_EQ(def.Md3W, 0);
     EXPECT_TRUE(def.FXRev);
     EXPECT_TRUE(def.FillIn);
@@ -134,7 +134,8 @@ TEST(OscSettings, BoxValueChecks) {
 
 TEST(OscIdentifiers, DispatcherOrderAndChoices) {
     std::string order;
-    for (const auto& id : OscIdentifiers()) order += std::string(id.OscName) + " ";
+    for (const auto& id : OscIdentifiers())
+        order += std::string(id.OscName) + " ";
     EXPECT_EQ(order, "ATR STO FX ROC RMX RMO R/F RSI MACD WMS ERY MOM DM JHG COP VTY OBV PARA "
                      "PARAV ");
     EXPECT_EQ(FindOscIdentifier("R/F")->Routine, "OscROC, OscStochFX");
