@@ -17,6 +17,8 @@ Series<float> RingValues(const Series<float>& ratios, int period) {
     Series<float> out(ratios.size());
     std::vector<float> taken;
     std::vector<std::size_t> places;
+    taken.reserve(ratios.size());
+    places.reserve(ratios.size());
     for (std::size_t i = 0; i < ratios.size(); ++i) {
         if (!ratios[i]) continue;
         taken.push_back(*ratios[i]);

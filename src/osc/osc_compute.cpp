@@ -35,10 +35,11 @@ public:
     }
 
     OscTable Build() {
-        m_table.rows.assign(m_bars, std::vector<std::optional<double>>(m_columns.size()));
-        for (std::size_t c = 0; c < m_columns.size(); ++c)
+        const std::size_t width = m_columns.size();
+        m_table.values.resize(m_bars * width);
+        for (std::size_t c = 0; c < width; ++c)
             for (std::size_t i = 0; i < m_bars; ++i)
-                m_table.rows[i][c] = m_columns[c][i];
+                m_table.values[i * width + c] = m_columns[c][i];
         return std::move(m_table);
     }
 

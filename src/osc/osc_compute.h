@@ -5,6 +5,7 @@
 #include "osc/osc_settings.h"
 
 #include <optional>
+#include <span>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -26,7 +27,13 @@ struct OscInputs {
 
 struct OscTable {
     std::vector<std::string> columns;
-    std::vector<std::vector<std::optional<double>>> rows; // one a bar, 0 to LastBar
+    // Row by row, one row a bar (0 to LastBar), one value a column.
+    std::vector<std::optional<double>> values;
+
+    std::size_t RowCount() const { return columns.empty() ? 0 : values.size() / columns.size(); }
+    std::span<const std::optional<double>> Row(std::size_t bar) const {
+        return std::span(values).subspan(bar * columns.size(), columns.size());
+    }
 };
 
 // The periods of an identifier for the chart period, in the order of its settings keys.

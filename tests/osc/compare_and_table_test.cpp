@@ -21,9 +21,8 @@ template <class T> int Computed(const Series<T>& s) {
 }
 int Computed(const OscTable& t) {
     int n = 0;
-    for (const auto& row : t.rows)
-        for (const auto& v : row)
-            n += v.has_value();
+    for (const auto& v : t.values)
+        n += v.has_value();
     return n;
 }
 } // namespace
@@ -131,16 +130,16 @@ TEST(ComputeOscillator, ColumnsPeriodsAndIdentifiers) {
     const auto sto = ComputeOscillator("STO", bars, def, in);
     ASSERT_TRUE(sto);
     EXPECT_EQ(sto->columns, (std::vector<std::string>{"k", "d", "slowd"}));
-    ASSERT_EQ(sto->rows.size(), 12u);
+    ASSERT_EQ(sto->RowCount(), 12u);
     const StochResult direct = ComputeStochFX(bars, 2, 2, true, 4);
-    EXPECT_EQ(sto->rows[5][2], std::optional<double>(*direct.slowd[5]));
+    EXPECT_EQ(sto->Row(5)[2], std::optional<double>(*direct.slowd[5]));
 
     in.ChartPeriod = "W";
     const auto rf = ComputeOscillator("R/F", bars, def, in); // weekly keys, FX always fast
     ASSERT_TRUE(rf);
     EXPECT_EQ(rf->columns, (std::vector<std::string>{"roc", "k", "d"}));
-    EXPECT_EQ(rf->rows[11][1], std::optional<double>(*ComputeStochFX(bars, 3, 1, false, 4).k[11]));
-    EXPECT_TRUE(rf->rows[3][0]);
+    EXPECT_EQ(rf->Row(11)[1], std::optional<double>(*ComputeStochFX(bars, 3, 1, false, 4).k[11]));
+    EXPECT_TRUE(rf->Row(3)[0]);
 
     // MACD stops on a daily key of 0 even on a weekly chart; an unknown period code has none.
     def.Md1W = 2, def.Md2W = 3, def.Md3W = 2;
@@ -154,7 +153,7 @@ TEST(ComputeOscillator, ColumnsPeriodsAndIdentifiers) {
     // Unset periods compute nothing but keep a row a bar; OBV has no period.
     in.ChartPeriod = "A";
     const auto rsi = ComputeOscillator("RSI", bars, def, in);
-    EXPECT_EQ(rsi->rows.size(), 12u);
+    EXPECT_EQ(rsi->RowCount(), 12u);
     EXPECT_EQ(Computed(*rsi), 0);
     EXPECT_EQ(ComputeOscillator("OBV", bars, def, in)->columns[0], "obv");
     EXPECT_FALSE(ComputeOscillator("PARA", bars, def, in));
