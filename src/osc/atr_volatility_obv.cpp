@@ -1,0 +1,123 @@
+#include "osc/atr_volatility_obv.h"
+
+#include <algorithm>
+#include <limits>
+
+namespace kori::osc {
+
+namespace {
+
+Money ToMoney(float v) {
+    return Money::FromDouble(v);
+}
+
+// The largest of the bar's range and the two gaps to the close before, the range taking ties;
+// the gaps keep their sign.
+Money TrueRange(const store::ChartBar& bar, const store::ChartBar& before) {
+    Money tr = ToMoney(bar.High - bar.Low);
+    const Money b = ToMoney(before.Close - bar.Low);
+    const Money c = ToMoney(bar.High - before.Close);
+    if (b > tr) tr = b;
+    if (c > tr) tr = c;
+    return tr;
+}
+
+// The routine's first scale stops it when every non-zero true range is the same.
+bool HasSpread(const Series<Money>& tr) {
+    std::optional<Money> hi, lo;
+    for (const auto& v : tr) {
+        if (!v || v->Raw == 0) continue;
+        hi = hi ? std::max(*hi, *v) : *v;
+        lo = lo ? std::min(*lo, *v) : *v;
+    }
+    return !hi || *hi != *lo;
+}
+
+std::int32_t AddVolume(std::int32_t obv, std::int64_t volume) {
+    const std::int64_t sum = obv + volume;
+    return static_cast<std::int32_t>(std::clamp<std::int64_t>(
+        sum, std::numeric_limits<std::int32_t>::min(), std::numeric_limits<std::int32_t>::max()));
+}
+
+} // namespace
+
+AtrResult ComputeATR(const store::ChartSeries& series, std::int16_t period) {
+    const int n = BarCount(series);
+    AtrResult r;
+    r.tr.assign(static_cast<std::size_t>(n), std::nullopt);
+    r.atr = r.tr;
+    const int p = period;
+    if (p <= 0) return r;
+    for (std::size_t i = 1; i < r.tr.size(); ++i)
+        r.tr[i] = TrueRange(series.ChartBars[i], series.ChartBars[i - 1]);
+    r.NoSpread = !HasSpread(r.tr);
+    if (r.NoSpread || n <= p) return r;
+
+    // Bars 1 to P fill the buffer; its mean is taken in float and back to currency.
+    float sum = 0.0f;
+    for (std::size_t i = 1; i <= static_cast<std::size_t>(p); ++i)
+        sum += r.tr[i]->ToFloat();
+    Money atr = ToMoney(sum / static_cast<float>(p));
+    for (std::size_t i = static_cast<std::size_t>(p) + 1; i < r.tr.size(); ++i) {
+        const Money before = atr;
+        atr = (*r.tr[i] + atr * p) / (p + 1);
+        if (before.Raw != 0) r.atr[i] = atr;
+    }
+    return r;
+}
+
+VolatilityResult ComputeVolatility(const store::ChartSeries& series, std::int16_t period) {
+    const int n = BarCount(series);
+    VolatilityResult r;
+    r.figure.assign(static_cast<std::size_t>(n), std::nullopt);
+    r.mean = r.figure;
+    if (period <= 0) return r;
+
+    std::vector<float> figures(static_cast<std::size_t>(n), 0.0f);
+    float v = 0.0f; // a bar without a positive close keeps the last figure
+    for (std::size_t i = 0; i < figures.size(); ++i) {
+        const store::ChartBar& b = series.ChartBars[i];
+        if (b.Close > 0) v = (b.High - b.Low) / b.Close * 100.0f;
+        if (v > 0)
+            figures[i] = v;
+        else if (i > 0)
+            figures[i] = 1.0f;
+        if (figures[i] != 0) r.figure[i] = figures[i];
+    }
+    const std::vector<float> sums = WindowSums(figures, period);
+    int counted = 0;
+    for (std::size_t i = 0; i < figures.size(); ++i) {
+        if (figures[i] == 0) continue;
+        if (++counted >= period) r.mean[i] = sums[i] / static_cast<float>(period);
+    }
+    return r;
+}
+
+ObvResult ComputeOBV(const store::ChartSeries& series) {
+    const int n = BarCount(series);
+    ObvResult r;
+    r.obv.assign(static_cast<std::size_t>(n), std::nullopt);
+    if (n <= 2) return r;
+
+    std::int32_t obv = 100000;
+    std::int32_t hi = 0;
+    std::int32_t lo = 200000;
+    for (std::size_t i = 1; i < r.obv.size(); ++i) {
+        const store::ChartBar& b = series.ChartBars[i];
+        const float before = series.ChartBars[i - 1].Close;
+        if (b.Close == 0 || before == 0) continue;
+        if (b.Close != before) {
+            obv = AddVolume(obv, b.Close > before ? b.Volume : -std::int64_t{b.Volume});
+            hi = std::max(hi, obv);
+            lo = std::min(lo, obv);
+        }
+        r.obv[i] = obv;
+    }
+    if (obv == 100000 && hi == 100000 && lo == 100000) {
+        r.NoVolumeData = true;
+        r.obv.assign(r.obv.size(), std::nullopt);
+    }
+    return r;
+}
+
+} // namespace kori::osc

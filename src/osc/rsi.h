@@ -1,0 +1,16 @@
+#pragma once
+// Relative Strength Index ("RSI"): a window re-added at every bar that ends one bar before the
+// bar in hand, holds P - 1 differences and is divided by the full period P.
+#include "osc/osc_series.h"
+
+namespace kori::osc {
+
+struct RsiResult {
+    // From bar P on, the figure the line stands at: a bar whose window has no fall keeps the
+    // last figure. Nothing before the first window with a fall.
+    Series<float> rsi;
+};
+
+RsiResult ComputeRSI(const store::ChartSeries& series, std::int16_t period);
+
+} // namespace kori::osc

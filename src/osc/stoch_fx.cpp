@@ -1,0 +1,75 @@
+#include "osc/stoch_fx.h"
+
+namespace kori::osc {
+
+namespace {
+
+struct Extremes {
+    std::vector<float> hi, lo; // per window ending at each bar
+};
+
+// Each bar's candidate for the window's high and low: the high and low of a bar that has
+// them, else a non-zero close; a zero is never taken. A bar with no candidate stands as the
+// starting value (0 for the high, 100000 for the low), which can never win.
+Extremes WindowExtremes(const store::ChartSeries& s, int n, int width, std::int16_t recordType) {
+    std::vector<float> hiC(static_cast<std::size_t>(n), 0.0f);
+    std::vector<float> loC(static_cast<std::size_t>(n), 100000.0f);
+    for (std::size_t j = 0; j < hiC.size(); ++j) {
+        const store::ChartBar& b = s.ChartBars[j];
+        if (b.High != 0 && recordType > 3)
+            hiC[j] = b.High;
+        else if (b.Close != 0)
+            hiC[j] = b.Close;
+        if (b.Low != 0 && recordType > 3)
+            loC[j] = b.Low;
+        else if (b.Close != 0)
+            loC[j] = b.Close;
+    }
+    return {WindowMax(hiC, width), WindowMin(loC, width)};
+}
+
+std::int32_t Percent(float part, float whole) {
+    return whole != 0 ? RoundToInt32(part / whole * 100.0f) : RoundToInt32(part * 100.0f);
+}
+
+} // namespace
+
+StochResult ComputeStochFX(const store::ChartSeries& series, std::int16_t periodK,
+                           std::int16_t periodD, bool slowStochastic, std::int16_t recordType) {
+    const int n = BarCount(series);
+    StochResult r;
+    r.k.assign(static_cast<std::size_t>(n), std::nullopt);
+    r.d = r.k;
+    r.slowd = r.k;
+    if (periodK <= 0 || n <= periodK + 1) return r;
+
+    const int first = periodK + 1;
+    const Extremes ex = WindowExtremes(series, n, periodK + 1, recordType);
+    std::vector<float> diff(static_cast<std::size_t>(n), 0.0f);
+    std::vector<float> range(static_cast<std::size_t>(n), 0.0f);
+    for (int i = first; i < n; ++i) {
+        const auto u = static_cast<std::size_t>(i);
+        diff[u] = series.ChartBars[u].Close - ex.lo[u];
+        range[u] = ex.hi[u] - ex.lo[u];
+        r.k[u] = Percent(diff[u], range[u]);
+    }
+    if (periodD <= 0) return r;
+
+    // The ring of the last D pairs starts empty: bars before the first count as 0.
+    const std::vector<float> diffSums = WindowSums(diff, periodD);
+    const std::vector<float> rangeSums = WindowSums(range, periodD);
+    std::int64_t ringSum = 0;
+    for (int i = first; i < n; ++i) {
+        const auto u = static_cast<std::size_t>(i);
+        const std::int32_t dpct = Percent(diffSums[u], rangeSums[u]);
+        r.d[u] = dpct;
+        if (!slowStochastic) continue;
+        ringSum += dpct;
+        if (i - periodD >= first) ringSum -= *r.d[static_cast<std::size_t>(i - periodD)];
+        if (i >= periodK + periodD)
+            r.slowd[u] = RoundToInt32(static_cast<double>(ringSum) / periodD);
+    }
+    return r;
+}
+
+} // namespace kori::osc
