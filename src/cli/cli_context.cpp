@@ -1,6 +1,7 @@
 #include "cli/cli_context.h"
 
 #include "app/install_root.h"
+#include "app/start_up.h"
 #include "platform/files.h"
 
 #include <unistd.h>
@@ -24,6 +25,12 @@ app::Session& CliContext::OpenSession(bool mustExist) {
     m_session = std::make_unique<app::Session>(
         rootPath, platform::Services{*m_dialogs, *m_progress, *m_settings, m_clock});
     m_session->ReadFolders();
+    m_session->ReadSettings();
+    if (mustExist) {
+        app::LoadColours(*m_session);
+        if (auto printer = app::ReadPrinterFile(m_session->folders.SystemFolder + "koriprn.dat"))
+            m_session->printer = *printer;
+    }
     if (data) {
         m_session->folders.DataFolder = platform::FolderWithSlash(*data);
         m_session->folders.IndicesFolder = m_session->folders.DataFolder;

@@ -48,5 +48,7 @@ void AddNamesCommand(CLI::App& app, CliContext& ctx);
 void AddBarsCommand(CLI::App& app, CliContext& ctx);
 void AddListsCommand(CLI::App& app, CliContext& ctx);
 void AddPlayCommand(CLI::App& app, CliContext& ctx);
+void AddChartCommand(CLI::App& app, CliContext& ctx);
+void AddScaleCommand(CLI::App& app, CliContext& ctx);
 
 } // namespace kori::cli

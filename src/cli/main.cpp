@@ -21,6 +21,8 @@ int main(int argc, char** argv) {
     kori::cli::AddBarsCommand(app, ctx);
     kori::cli::AddListsCommand(app, ctx);
     kori::cli::AddPlayCommand(app, ctx);
+    kori::cli::AddChartCommand(app, ctx);
+    kori::cli::AddScaleCommand(app, ctx);
 
     try {
         app.parse(argc, argv);

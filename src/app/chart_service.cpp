@@ -1,0 +1,65 @@
+#include "app/chart_service.h"
+
+#include "chart/file_price_source.h"
+#include "platform/files.h"
+#include "platform/text.h"
+#include "store/name_file.h"
+#include "store/price_file.h"
+
+namespace kori::app {
+
+std::filesystem::path TempFolder(const Session& session) {
+    const std::filesystem::path dir = session.folders.SystemFolder + "temp";
+    platform::CreateFolder(dir);
+    return dir;
+}
+
+std::filesystem::path ChartStreamPath(const Session& session) { return TempFolder(session) / "TCht.Tmp"; }
+
+chart::ChartName ChartNameOf(const store::NameRecord& r) {
+    chart::ChartName n;
+    n.Code = platform::Trim(r.Code);
+    n.Name = r.Name;
+    n.OtherDetails = r.OtherDetails;
+    n.RecordType = r.RecordType;
+    n.Base = r.Base;
+    n.Top = r.Top;
+    n.PercentBandUp = r.BandUp();
+    n.PercentBandDown = r.BandDown();
+    return n;
+}
+
+std::optional<std::pair<int, store::NameRecord>> FindSecurity(const Session& session,
+                                                              std::string_view code) {
+    store::NameFile nf(store::NameFile::PathIn(session.folders.DataFolder));
+    std::vector<store::NameRecord> names;
+    if (!platform::FileExists(nf.path()) || !nf.ReadAll(names)) return std::nullopt;
+    const std::string wanted = store::PadCode(code);
+    for (std::size_t i = 0; i < names.size(); ++i)
+        if (names[i].Code == wanted) return std::pair{static_cast<int>(i) + 1, names[i]};
+    return std::nullopt;
+}
+
+platform::Status BuildSecurityChart(Session& session, ChartJob& job, chart::Chart& chart,
+                                    platform::Surface& surface) {
+    chart::FilePriceSource source(store::PriceFile::PathFor(session.folders.DataFolder, job.Name.Code));
+    if (auto s = source.Open(); !s) {
+        session.dialogs().MsgBox(s.message(), "Chart Display");
+        return s;
+    }
+    const chart::ChartName name = ChartNameOf(job.Name);
+    chart::ChartBuild build{job.Request,
+                            job.Defaults,
+                            name,
+                            session.palette,
+                            session.fonts,
+                            session.dialogs(),
+                            job.WriteStream ? ChartStreamPath(session) : std::filesystem::path(),
+                            false, // no setting holds the bold-print option yet
+                            session.download.VolumeDivisor,
+                            job.Page,
+                            job.DrawOverlays};
+    return chart::BuildChart(chart, build, source, surface);
+}
+
+} // namespace kori::app

@@ -1,0 +1,182 @@
+// kori chart: one security's chart to a picture, an SVG drawing, a printed page, the stream,
+// and its chart numbers as JSON. kori scale: the automatic scale of a price range.
+#include "app/chart_service.h"
+#include "chart/print_chart.h"
+#include "chart/scale.h"
+#include "cli/cli_context.h"
+#include "cli/gui_app.h"
+#include "gui/paint/pdf_printer.h"
+#include "gui/paint/qt_surface.h"
+#include "platform/date_text.h"
+#include "platform/files.h"
+#include "platform/svg_surface.h"
+#include "platform/text.h"
+
+#include <CLI/CLI.hpp>
+#include <nlohmann/json.hpp>
+
+#include <iostream>
+#include <memory>
+
+namespace kori::cli {
+
+using json = nlohmann::ordered_json;
+
+namespace {
+
+struct ChartOptions {
+    std::string code;
+    std::string style, period;
+    int spacing = 0;
+    bool log = false, upsideDown = false, noVolume = false, json = false;
+    std::string finish;
+    std::string size = "1000x700";
+    std::string stream, png, svg, pdf;
+};
+
+std::pair<int, int> ParseArea(const std::string& text) {
+    const auto x = text.find_first_of("xX");
+    int w = 0, h = 0;
+    if (x != std::string::npos) {
+        w = static_cast<int>(platform::Val(text.substr(0, x)));
+        h = static_cast<int>(platform::Val(text.substr(x + 1)));
+    }
+    if (w < 100 || h < 100 || w > 16000 || h > 16000)
+        throw CliError{"--size wants WIDTHxHEIGHT in chart units from 100 to 16000, such as 1000x700"};
+    return {w, h};
+}
+
+json FloatJson(float v) { return json::parse(platform::FloatText(v)); }
+
+void ApplyOptions(const ChartOptions& o, app::ChartJob& job) {
+    auto& r = job.Request;
+    if (!o.style.empty()) r.ChartStyle = o.style[0];
+    if (!o.period.empty()) r.ChartPeriod = o.period[0];
+    if (o.spacing > 0) r.BarSpacing = static_cast<std::int16_t>(o.spacing);
+    if (o.noVolume) r.ShowVolume = false;
+    r.UpsideDown = o.upsideDown;
+    if (o.log) job.Defaults.LogBars = job.Defaults.LogLine = true;
+    if (!o.finish.empty()) {
+        if (!platform::IsValidDateText(o.finish)) throw CliError{"--finish wants a date as yyyymmdd"};
+        r.ByFinishDate = true;
+        r.FinishDate = o.finish;
+    }
+    r.AvOnePeriod = r.ChartPeriod == 'A' ? job.Defaults.MAPeriod1Daily : job.Defaults.MAPeriod1Long;
+    r.AvTwoPeriod = r.ChartPeriod == 'A' ? job.Defaults.MAPeriod2Daily : job.Defaults.MAPeriod2Long;
+}
+
+void PrintNumbers(const chart::Chart& c) {
+    json out = {{"first_record", c.FirstRecord}, {"last_record", c.LastRecord},
+                {"last_bar", c.LastBar()},       {"plot_left", c.PlotLeft},
+                {"plot_right", c.PlotRight},     {"plot_top", c.PlotTop},
+                {"plot_bottom", c.PlotBottom},   {"chart_base", FloatJson(c.ChartBase)},
+                {"chart_ceiling", FloatJson(c.ChartCeiling)}, {"grid_step", FloatJson(c.GridStep)},
+                {"grid_count", c.GridCount},     {"max_high", FloatJson(c.MaxHigh)},
+                {"min_low", FloatJson(c.MinLow)}};
+    std::cout << out.dump() << "\n";
+}
+
+void CopyStream(const app::Session& session, const std::string& to) {
+    const auto content = platform::ReadWholeFile(app::ChartStreamPath(session));
+    if (!content) throw CliError{"No chart stream was written"};
+    if (auto s = platform::WriteFileAtomic(to, *content); !s) throw CliError{s.message()};
+}
+
+void Run(CliContext& ctx, const ChartOptions& o) {
+    auto& session = ctx.OpenSession();
+    const auto found = app::FindSecurity(session, o.code);
+    if (!found) throw CliError{"No File For That Name: " + platform::Trim(o.code)};
+    const auto [w, h] = ParseArea(o.size);
+
+    app::ChartJob job;
+    job.Name = found->second;
+    job.Defaults = chart::LoadChartDefaults(session.ini());
+    chart::LoadChartRequestSettings(session.ini(), job.Request);
+    ApplyOptions(o, job);
+    chart::PrinterPage page;
+    job.Page = &page;
+
+    chart::Chart c;
+    platform::Status built;
+    if (!o.png.empty() || !o.pdf.empty()) EnsureGuiApplication();
+    if (!o.svg.empty()) {
+        platform::SvgSurface area(w, h);
+        built = app::BuildSecurityChart(session, job, c, area);
+        if (built) {
+            if (auto s = area.Save(o.svg); !s) throw CliError{s.message()};
+        }
+    }
+    if (built && (!o.png.empty() || o.svg.empty())) {
+        gui::ImageSurface area(w, h);
+        built = app::BuildSecurityChart(session, job, c, area);
+        const QImage& picture = area.Finish();
+        if (built && !o.png.empty()) {
+            if (auto s = gui::SavePng(picture, o.png); !s) throw CliError{s.message()};
+        }
+    }
+    if (!built) throw CliError{built.message()};
+    if (!o.pdf.empty()) {
+        chart::PrintSettings settings = chart::LoadPrintSettings(session.ini());
+        settings.PrintColour = session.printer.PrintColour;
+        settings.PrintColourLines = session.printer.PrintColourLines;
+        gui::PdfPrinter printer(o.pdf);
+        const chart::PaperJob paper{printer, session.palette, session.fonts, static_cast<double>(w),
+                                    static_cast<double>(h)};
+        if (chart::PrintChart(app::ChartStreamPath(session), paper, settings) !=
+            chart::PlayOutcome::Played)
+            throw CliError{"Cannot print the chart to " + o.pdf};
+    }
+    if (!o.stream.empty()) CopyStream(session, o.stream);
+    if (o.json) PrintNumbers(c);
+}
+
+} // namespace
+
+void AddChartCommand(CLI::App& app, CliContext& ctx) {
+    auto o = std::make_shared<ChartOptions>();
+    auto* cmd = app.add_subcommand("chart", "Draw the chart of a security");
+    cmd->add_option("CODE", o->code, "Security code")->required();
+    cmd->add_option("--style", o->style, "B bar, C candlestick, L line, P point and figure")
+        ->check(CLI::IsMember({"B", "C", "L", "P"}));
+    cmd->add_option("--period", o->period, "A daily, W weekly, M monthly")->check(CLI::IsMember({"A", "W", "M"}));
+    cmd->add_option("--spacing", o->spacing, "Chart units between bars (reversal on P)")->check(CLI::Range(1, 20));
+    cmd->add_flag("--log", o->log, "Logarithmic price scale");
+    cmd->add_flag("--upside-down", o->upsideDown, "High prices at the bottom");
+    cmd->add_flag("--no-volume", o->noVolume, "No volume panel");
+    cmd->add_option("--finish", o->finish, "Last date shown (yyyymmdd)");
+    cmd->add_option("--size", o->size, "Chart area in chart units (default 1000x700)")->option_text("WxH");
+    cmd->add_option("--stream", o->stream, "Copy of the chart instruction stream")->option_text("FILE");
+    cmd->add_option("--png", o->png, "Picture as the screen shows it")->option_text("FILE");
+    cmd->add_option("--svg", o->svg, "SVG drawing as the screen shows it")->option_text("FILE");
+    cmd->add_option("--pdf", o->pdf, "A4 page as the printer prints it")->option_text("FILE");
+    cmd->add_flag("--json", o->json, "Print the chart numbers as JSON");
+    cmd->callback([&ctx, o] { Run(ctx, *o); });
+}
+
+void AddScaleCommand(CLI::App& app, CliContext&) {
+    struct ScaleOptions {
+        float high = 0, low = 0;
+        bool json = false;
+    };
+    auto o = std::make_shared<ScaleOptions>();
+    auto* cmd = app.add_subcommand("scale", "The automatic price scale for a highest and lowest price");
+    cmd->add_option("--high", o->high, "Highest price")->required();
+    cmd->add_option("--low", o->low, "Lowest price")->required();
+    cmd->add_flag("--json", o->json, "JSON output");
+    cmd->callback([o] {
+        const chart::ChartScale s = chart::AutoScale(o->high, o->low);
+        if (o->json) {
+            json out = {{"chart_base", FloatJson(s.ChartBase)},
+                        {"chart_ceiling", FloatJson(s.ChartCeiling)},
+                        {"grid_step", FloatJson(s.GridStep)},
+                        {"grid_count", s.GridCount}};
+            std::cout << out.dump() << "\n";
+            return;
+        }
+        std::cout << "Base " << platform::FloatText(s.ChartBase) << "  ceiling "
+                  << platform::FloatText(s.ChartCeiling) << "  grid step "
+                  << platform::FloatText(s.GridStep) << " (" << s.GridCount << " lines)\n";
+    });
+}
+
+} // namespace kori::cli
