@@ -106,7 +106,12 @@ void Run(CliContext& ctx, const ChartOptions& o) {
             if (auto s = area.Save(o.svg); !s) throw CliError{s.message()};
         }
     }
-    if (built && (!o.png.empty() || o.svg.empty())) {
+    if (o.png.empty() && o.svg.empty()) {
+        // Numbers, stream or page only: the chart is built on a surface that draws nothing.
+        platform::RecordingSurface area(w, h);
+        built = app::BuildSecurityChart(session, job, c, area);
+    }
+    if (built && !o.png.empty()) {
         gui::ImageSurface area(w, h);
         built = app::BuildSecurityChart(session, job, c, area);
         const QImage& picture = area.Finish();
