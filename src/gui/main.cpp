@@ -1,6 +1,9 @@
 // kori-charting: the desktop program.
 #include "app/install_root.h"
+#include "app/instance_lock.h"
 #include "app/session.h"
+#include "app/start_up.h"
+#include "gui/windows/register_windows.h"
 #include "gui/services/qt_dialogs.h"
 #include "gui/services/qt_progress.h"
 #include "gui/windows/main_window.h"
@@ -15,6 +18,8 @@
 #include <QScreen>
 #include <QSplashScreen>
 #include <QTimer>
+
+#include <memory>
 
 namespace {
 
@@ -62,21 +67,28 @@ int main(int argc, char** argv) {
     kori::platform::SystemClock clock;
     kori::app::Session session(root, kori::platform::Services{dialogs, startupProgress, settings, clock});
 
+    std::unique_ptr<kori::app::InstanceLock> instance;
+    if (!kori::app::CheckSingleInstance(root, dialogs, instance)) return 0;
+
     QSplashScreen logo(LogoPixmap());
     logo.show();
     QApplication::setOverrideCursor(Qt::WaitCursor);
-    session.ReadFolders();
+    const QStringList words = parser.positionalArguments();
+    kori::app::InitialiseSession(session, words.isEmpty() ? std::string() : words.first().toStdString());
     QApplication::restoreOverrideCursor();
     QApplication::processEvents();
 
     kori::gui::MainWindow main(session);
     dialogs.SetParent(&main);
-    const QStringList words = parser.positionalArguments();
-    main.SetHideDownloadProgram(!words.isEmpty() && words.first().trimmed() == QStringLiteral("A"));
+    main.SetHideDownloadProgram(session.switches.A);
+    kori::gui::RegisterWindows(main);
     // The main window comes up from an event, after the logo window has painted.
     QTimer::singleShot(300, &main, [&] {
         main.show();
         logo.finish(&main);
+        // Files waiting in the download folder are offered once the main window stands; the
+        // update itself is not part of this build, so the answer opens nothing yet.
+        (void)kori::app::OfferPendingUpdate(session);
         if (parser.isSet(shotOpt)) {
             QTimer::singleShot(700, &main, [&] {
                 main.grab().save(parser.value(shotOpt));

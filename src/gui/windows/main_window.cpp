@@ -57,8 +57,7 @@ void MainWindow::SetAction(const std::string& opens, std::function<void()> actio
 
 app::MenuConditions MainWindow::Conditions() const {
     app::MenuConditions c;
-    c.DataService = static_cast<int>(platform::Val(
-        const_cast<app::Session&>(m_session).ini().Read("Download", "DataService")));
+    c.DataService = m_session.download.DataService;
     c.HideDownloadProgram = m_hideDownloadProgram;
     const std::string sys = m_session.folders.SystemFolder;
     c.MaxScanPresent = platform::FileExists(sys + "KoriMaxScan.exe");

@@ -1,0 +1,12 @@
+#include "gui/windows/register_windows.h"
+
+#include "gui/windows/main_window.h"
+
+namespace kori::gui {
+
+void RegisterWindows(MainWindow& main) {
+    // Each family of windows adds its actions here; the menus then show what is built.
+    main.RebuildMenus();
+}
+
+} // namespace kori::gui
