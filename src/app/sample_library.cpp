@@ -179,16 +179,10 @@ void AddNoTradeDays(std::vector<store::PriceRecord>& recs, Random& rng) {
     }
 }
 
-// A two-for-one split a year before the end: earlier prices halved, the record noted.
+// A two-for-one split a year before the end. The history stands adjusted (continuous); the
+// record of the split carries its factor and note.
 void AddSplit(std::vector<store::PriceRecord>& recs) {
     const std::size_t at = recs.size() - 252;
-    for (std::size_t i = 0; i < at; ++i) {
-        recs[i].Open /= 2;
-        recs[i].High /= 2;
-        recs[i].Low /= 2;
-        recs[i].Close /= 2;
-        recs[i].Volume *= 2;
-    }
     recs[at].AdjFactor = 0.5f;
     recs[at].AdjDesc = "Split 2 for 1";
 }
