@@ -4,6 +4,7 @@
 #include "platform/text.h"
 #include "store/name_file.h"
 #include "store/record_codec.h"
+#include "store/record_file.h"
 
 #include <cctype>
 
@@ -36,24 +37,11 @@ std::filesystem::path ListPath(std::string_view dataFolder, char letter) {
 }
 
 Status ReadList(const std::filesystem::path& path, std::vector<ChartListEntry>& out) {
-    out.clear();
-    std::int16_t count = 0;
-    if (auto s = CountRecords(path, ChartListEntry::kSize, count); !s) return s;
-    if (count == 0) return Status::Ok();
-    const auto bytes = platform::ReadWholeFile(path);
-    if (!bytes) return Status::Error("Cannot read " + path.string());
-    for (int i = 0; i < count; ++i)
-        out.push_back(ChartListEntry::Decode(bytes->data() + static_cast<std::size_t>(i) * ChartListEntry::kSize));
-    return Status::Ok();
+    return RecordFile<ChartListEntry>(path).ReadAll(out);
 }
 
 Status WriteList(const std::filesystem::path& path, const std::vector<ChartListEntry>& entries) {
-    std::string bytes;
-    for (const auto& e : entries) {
-        const auto b = e.Encode();
-        bytes.append(b.data(), b.size());
-    }
-    return platform::WriteFileAtomic(path, bytes);
+    return RecordFile<ChartListEntry>(path).WriteAll(entries);
 }
 
 std::array<std::string, 10> GetSubLists(const platform::SettingsStore& store) {

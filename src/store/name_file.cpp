@@ -4,91 +4,13 @@
 #include "platform/number_format.h"
 #include "platform/text.h"
 
-#include <fstream>
 
 namespace kori::store {
 
 using platform::Status;
 
-Status CountRecords(const std::filesystem::path& file, std::size_t recordSize, std::int16_t& count) {
-    const auto records = platform::FileSizeOr0(file) / recordSize;
-    if (records > static_cast<std::uintmax_t>(kMaxRecords)) {
-        count = 0;
-        return Status::Error(file.filename().string() + " holds " + std::to_string(records) +
-                             " records; a file can hold at most 32767.");
-    }
-    count = static_cast<std::int16_t>(records);
-    return Status::Ok();
-}
-
 std::filesystem::path NameFile::PathIn(std::string_view dataFolder) {
     return platform::ResolveIn(dataFolder, "Names.dat");
-}
-
-Status NameFile::Open() {
-    m_path = platform::ResolvePath(m_path);
-    if (!platform::FileExists(m_path)) {
-        std::ofstream create(m_path, std::ios::binary);
-        if (!create) return Status::Error("Cannot create " + m_path.string());
-    }
-    return CountRecords(m_path, NameRecord::kSize, m_count);
-}
-
-Status NameFile::Read(int recordNumber, NameRecord& out) const {
-    if (recordNumber < 1 || recordNumber > m_count)
-        return Status::Error("Record " + std::to_string(recordNumber) + " is not in " +
-                             m_path.filename().string());
-    std::ifstream in(m_path, std::ios::binary);
-    char buf[NameRecord::kSize];
-    in.seekg(static_cast<std::streamoff>(recordNumber - 1) * static_cast<std::streamoff>(NameRecord::kSize));
-    if (!in.read(buf, sizeof buf)) return Status::Error("Cannot read " + m_path.string());
-    out = NameRecord::Decode(buf);
-    return Status::Ok();
-}
-
-Status NameFile::Write(int recordNumber, const NameRecord& r) {
-    if (recordNumber < 1 || recordNumber > m_count + 1)
-        return Status::Error("Record " + std::to_string(recordNumber) + " is past the end of " +
-                             m_path.filename().string());
-    if (recordNumber > kMaxRecords) return Status::Error("The name file is full (32767 records).");
-    const auto bytes = r.Encode();
-    if (recordNumber == m_count + 1) {
-        if (auto s = platform::AppendToFile(m_path, {bytes.data(), bytes.size()}); !s) return s;
-        ++m_count;
-        return Status::Ok();
-    }
-    std::fstream f(m_path, std::ios::in | std::ios::out | std::ios::binary);
-    f.seekp(static_cast<std::streamoff>(recordNumber - 1) * static_cast<std::streamoff>(NameRecord::kSize));
-    if (!f.write(bytes.data(), static_cast<std::streamsize>(bytes.size())))
-        return Status::Error("Cannot write " + m_path.string());
-    return Status::Ok();
-}
-
-Status NameFile::ReadAll(std::vector<NameRecord>& out) const {
-    out.clear();
-    std::int16_t count = 0;
-    if (auto s = CountRecords(m_path, NameRecord::kSize, count); !s) return s;
-    if (count == 0) return Status::Ok();
-    const auto bytes = platform::ReadWholeFile(m_path);
-    if (!bytes) return Status::Error("Cannot read " + m_path.string());
-    out.reserve(static_cast<std::size_t>(count));
-    for (int i = 0; i < count; ++i)
-        out.push_back(NameRecord::Decode(bytes->data() + static_cast<std::size_t>(i) * NameRecord::kSize));
-    return Status::Ok();
-}
-
-Status NameFile::WriteAll(const std::vector<NameRecord>& records) {
-    if (records.size() > static_cast<std::size_t>(kMaxRecords))
-        return Status::Error("A name file can hold at most 32767 records.");
-    std::string bytes;
-    bytes.reserve(records.size() * NameRecord::kSize);
-    for (const auto& r : records) {
-        const auto b = r.Encode();
-        bytes.append(b.data(), b.size());
-    }
-    if (auto s = platform::WriteFileAtomic(m_path, bytes); !s) return s;
-    m_count = static_cast<std::int16_t>(records.size());
-    return Status::Ok();
 }
 
 namespace {

@@ -4,6 +4,7 @@
 #include "platform/dialogs.h"
 #include "platform/status.h"
 #include "store/name_record.h"
+#include "store/record_file.h"
 
 #include <cstdint>
 #include <filesystem>
@@ -14,36 +15,11 @@
 
 namespace kori::store {
 
-inline constexpr std::int32_t kMaxRecords = 32767;
-
-// Number of whole records of `size` bytes in a file, refused when over 32,767.
-platform::Status CountRecords(const std::filesystem::path& file, std::size_t recordSize,
-                              std::int16_t& count);
-
-class NameFile {
+// Names.dat in a data folder, found whatever the case of its name.
+class NameFile : public RecordFile<NameRecord> {
 public:
+    using RecordFile::RecordFile;
     static std::filesystem::path PathIn(std::string_view dataFolder);
-
-    explicit NameFile(std::filesystem::path path) : m_path(std::move(path)) {}
-    const std::filesystem::path& path() const { return m_path; }
-
-    // Creates the file when absent and takes the count.
-    platform::Status Open();
-    std::int16_t Count() const { return m_count; }
-
-    platform::Status Read(int recordNumber, NameRecord& out) const;
-    // Writes at a place; one past the end appends.
-    platform::Status Write(int recordNumber, const NameRecord& r);
-    platform::Status Append(const NameRecord& r) { return Write(m_count + 1, r); }
-
-    // Every record in one read.
-    platform::Status ReadAll(std::vector<NameRecord>& out) const;
-    // Replaces the whole file (written beside, then renamed).
-    platform::Status WriteAll(const std::vector<NameRecord>& records);
-
-private:
-    std::filesystem::path m_path;
-    std::int16_t m_count = 0;
 };
 
 struct FoundCode {

@@ -1,6 +1,7 @@
 #pragma once
 // <code>.WDT: the daily records of one security, 50 bytes each, oldest first.
 #include "platform/status.h"
+#include "store/record_file.h"
 
 #include <array>
 #include <cstdint>
@@ -26,32 +27,13 @@ struct PriceRecord {
     static PriceRecord Decode(const char* bytes);
 };
 
-class PriceFile {
+class PriceFile : public RecordFile<PriceRecord> {
 public:
+    using RecordFile::RecordFile;
     // <DataFolder><code>.WDT, found whatever its case.
     static std::filesystem::path PathFor(std::string_view dataFolder, std::string_view code);
-
-    explicit PriceFile(std::filesystem::path path) : m_path(std::move(path)) {}
-    const std::filesystem::path& path() const { return m_path; }
-
-    // Opening for random access creates an absent file empty.
-    platform::Status Open();
-    std::int16_t Count() const { return m_count; }
-
-    platform::Status Read(int recordNumber, PriceRecord& out) const;
-    platform::Status Write(int recordNumber, const PriceRecord& r);
-    platform::Status Append(const PriceRecord& r) { return Write(m_count + 1, r); }
-    // Records first..last (1-based, inclusive) as raw bytes in one read.
-    platform::Status ReadRange(int first, int last, std::string& bytes) const;
-    platform::Status ReadAll(std::vector<PriceRecord>& out) const;
-    platform::Status WriteAll(const std::vector<PriceRecord>& records);
-
     // Orders the records by the number their date reads as, through Temp.Wk2 beside the file.
     platform::Status SortByDate();
-
-private:
-    std::filesystem::path m_path;
-    std::int16_t m_count = 0;
 };
 
 } // namespace kori::store
