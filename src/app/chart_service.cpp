@@ -26,6 +26,7 @@ chart::ChartName ChartNameOf(const store::NameRecord& r) {
     n.Top = r.Top;
     n.PercentBandUp = r.BandUp();
     n.PercentBandDown = r.BandDown();
+    n.PFIncrement = r.PFIncrement;
     return n;
 }
 
