@@ -2,6 +2,8 @@
 
 #include "chart/number_format.h"
 
+#include <algorithm>
+
 namespace kori::chart {
 
 namespace {
@@ -76,9 +78,10 @@ struct Walk {
         if (Accel < 0.18) Accel += 0.02;
     }
 
+    // The extreme follows the bar first, so a flip on this bar starts from it.
     void Up(const ParabolicBar& b, const ParabolicBar& prev) {
-        if (b.High < Stop) return FlipDown();
         if (b.High > HighExt) HighExt = b.High;
+        if (b.High < Stop) return FlipDown();
         Speed();
         // The stop closes on the bar's own high, not on the extreme.
         Stop += (b.High - Stop) * Accel;
@@ -86,22 +89,21 @@ struct Walk {
         if (Stop > b.Low) {
             const double bound = b.Low < prev.Low ? b.Low : prev.Low;
             Stop += (bound - Stop) * Accel;
-            // The kept bound of a rising walk is the reset low, so a stop inside the bar
-            // always turns it.
-            if (Stop < LowExt) FlipDown();
+            // Still inside the bar after the pull towards the lows: the rise is over.
+            if (Stop > b.Low) FlipDown();
         }
     }
 
     void Down(const ParabolicBar& b, const ParabolicBar& prev) {
-        if (b.Low > Stop) return FlipUp();
         if (b.Low < LowExt) LowExt = b.Low;
+        if (b.Low > Stop) return FlipUp();
         Speed();
         Stop += (b.Low - Stop) * Accel;
         if (Stop < b.Low) return FlipUp();
         if (Stop < b.High) {
             const double bound = b.High > prev.High ? b.High : prev.High;
             Stop += (bound - Stop) * Accel;
-            if (Stop > 0) FlipUp();
+            if (Stop < b.High) FlipUp();
         }
     }
 };
@@ -167,8 +169,10 @@ void DrawParabolic(ChartPainter& p, bool onAverage) {
     const double y = c.PriceToY(end.Stop);
     TextFont f = p.Font1(false);
     f.Size = 8.25;
-    p.ScreenText(c.PlotRight + 2, y, text, entry, f);
-    p.stream.Text('T', 8.25, c.PlotRight + 2, y, text, p.Col(entry));
+    // Right of the plot; on a narrow margin it ends at the area's edge.
+    const double x = std::min(c.PlotRight + 2.0, c.AreaWidth - p.Width(text, f) - 2);
+    p.ScreenText(x, y, text, entry, f);
+    p.stream.Text('T', 8.25, x, y, text, p.Col(entry));
 }
 
 } // namespace kori::chart
