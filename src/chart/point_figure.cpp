@@ -185,11 +185,13 @@ private:
         m_boxX = m_c.PlotLeft + pf::CellSize;
     }
 
+    // A new month (yyyymm) ticks the date axis; a new year marks the next box.
     void DateMark(std::string_view date) {
-        const long yyyymm = std::lround(platform::Val(date.substr(0, 6)));
-        if (yyyymm == m_lastMonth) return;
-        if (m_lastMonth != 0 && yyyymm / 100 != m_lastMonth / 100) m_monthMarker = true;
-        m_lastMonth = yyyymm;
+        const std::string_view month = date.substr(0, 6);
+        if (month == m_lastMonth) return;
+        if (!m_lastMonth.empty() && month.substr(0, 4) != m_lastMonth.substr(0, 4))
+            m_monthMarker = true;
+        m_lastMonth.assign(month);
         m_axis.Bar(m_boxX, date);
     }
 
@@ -221,7 +223,7 @@ private:
     int m_rows;
     DateAxis m_axis;
     double m_boxX = 0;
-    long m_lastMonth = 0;
+    std::string m_lastMonth;
     bool m_monthMarker = false;
 };
 
