@@ -172,3 +172,29 @@ TEST(PointFigureChart, NothingToDrawIsNoCrash) {
     EXPECT_TRUE(Starting(a.Lines(), "B, 9,").empty());
     EXPECT_EQ(Starting(a.Lines(), "L, 354, ").size(), 13u);
 }
+
+TEST(PointFigureChart, ColumnsReachingTheRightEdgeWipeAndStartAgain) {
+    ChartRig r;
+    PointFigureRig(r);
+    // A negative blank lets more columns "fit" than the plot holds, so the drawing reaches
+    // the right edge: the plot is wiped, framed and labelled again, and columns go on from
+    // the left.
+    r.defaults.BlankRight = -120;
+    r.dialogs.QueueInput(std::string("1"));
+    for (int i = 0; i < 80; ++i)
+        r.Add("2024" + std::string(i / 28 + 1 < 10 ? "0" : "") + std::to_string(i / 28 + 1) +
+                  (i % 28 + 1 < 10 ? "0" : "") + std::to_string(i % 28 + 1),
+              20, 25, 19, i % 2 ? 24.0f : 20.0f);
+    ASSERT_TRUE(r.Build().ok());
+    const auto lines = r.Lines();
+    const auto wipe = std::find(lines.begin(), lines.end(), "F, 5, 130, 354, 950, 17");
+    ASSERT_NE(wipe, lines.end());
+    EXPECT_EQ(*(wipe + 1), "B, 5, 130, 354, 950, 16");
+    // After the wipe the next column stands at the first column's x again.
+    const auto boxes = Starting(std::vector<std::string>(wipe, lines.end()), "B, 9,");
+    const auto falls = Starting(std::vector<std::string>(wipe, lines.end()), "X, 9,");
+    EXPECT_FALSE(boxes.empty() && falls.empty());
+    // Nothing was drawn beyond the edge.
+    for (const auto& l : Starting(lines, "X,"))
+        EXPECT_LT(std::stoi(l.substr(3)), 354 - 8) << l;
+}
