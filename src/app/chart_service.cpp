@@ -1,6 +1,7 @@
 #include "app/chart_service.h"
 
 #include "chart/file_price_source.h"
+#include "chart/targets.h"
 #include "platform/files.h"
 #include "platform/text.h"
 #include "store/name_file.h"
@@ -26,6 +27,7 @@ chart::ChartName ChartNameOf(const store::NameRecord& r) {
     n.Top = r.Top;
     n.PercentBandUp = r.BandUp();
     n.PercentBandDown = r.BandDown();
+    n.PFIncrement = r.PFIncrement;
     return n;
 }
 
@@ -58,7 +60,14 @@ platform::Status BuildSecurityChart(Session& session, ChartJob& job, chart::Char
                             false, // no setting holds the bold-print option yet
                             session.download.VolumeDivisor,
                             job.Page,
-                            job.DrawOverlays};
+                            {}};
+    // Target lines go on last, while the stream is still open.
+    const std::vector<float> targets = chart::ReadTargetPrices(
+        std::filesystem::path(session.folders.SystemFolder) / "Targets.txt", name.Code);
+    build.DrawOverlays = [&job, &session, &targets](chart::Chart& c, platform::Surface& s) {
+        chart::DrawTargetLines(c, s, session.palette, targets);
+        if (job.DrawOverlays) job.DrawOverlays(c, s);
+    };
     return chart::BuildChart(chart, build, source, surface);
 }
 

@@ -2,6 +2,8 @@
 
 #include "chart/draw_price_chart.h"
 #include "chart/geometry.h"
+#include "chart/overlays.h"
+#include "chart/point_figure.h"
 
 #include <cmath>
 
@@ -81,16 +83,19 @@ platform::Status BuildOneChart(Chart& c, const ChartBuild& b, PriceSource& sourc
     BuildScope scope(b.Dialogs, c);
     c.Failed = false;
     const char style = EffectiveStyle(b.Request, b.Name);
-    if (style == 'P')
-        return platform::Status::Error(
-            "Point and figure charts are not drawn by the price chart builder.");
     if (auto s = OpenStream(c, b.Request, b.StreamPath); !s) return s;
     c.AreaWidth = surface.ScaleWidth();
     c.AreaHeight = surface.ScaleHeight();
     PlotGeometry g = ComputePlotGeometry(c.AreaWidth, c.AreaHeight, b.Request);
     if (auto s = LoadWindow(c, b, source, style, g); !s) return s;
     const DrawInputs in = InputsOf(b, source);
-    if (auto s = DrawLoadedChart(c, in, g, b.Dialogs, surface); !s) return s;
+    if (style == 'P') {
+        if (auto s = DrawPointFigureChart(c, in, g, b.Dialogs, surface); !s) return s;
+    } else {
+        if (auto s = DrawLoadedChart(c, in, g, b.Dialogs, surface); !s) return s;
+        ChartPainter painter(c, in, surface);
+        DrawChartOverlays(painter);
+    }
     if (b.DrawOverlays) b.DrawOverlays(c, surface);
     if (b.Page && !b.Page->Known)
         WorkOutPrinterMargins(*b.Page, c.AreaWidth, c.AreaHeight, b.Defaults.PrintScale);

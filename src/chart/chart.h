@@ -22,6 +22,7 @@ struct ChartName {
     float Top = 0;
     std::int16_t PercentBandUp = 5;
     std::int16_t PercentBandDown = 5;
+    float PFIncrement = 0; // point-and-figure box value; 0 means automatic
 };
 
 struct Chart {

@@ -81,6 +81,12 @@ void LoadScales(const platform::IniFile& ini, ChartDefaults& d) {
     d.MMAPeriods = ParseMMA(ini.Read(kCharts, "MMASet"));
     const std::string comp = ini.Read(kCharts, "CompFile");
     d.CompFile = comp == platform::kUnknown ? "" : comp;
+    const auto bollinger = [&ini](std::string_view key) {
+        const std::int16_t n = IniInt16(ini.Read("OscDef", key));
+        return n >= 1 && n <= 100 ? n : std::int16_t{21};
+    };
+    d.BollingerDaily = bollinger("BBA");
+    d.BollingerLong = bollinger("BBW");
 }
 
 void LoadWindowKeys(const platform::IniFile& ini, ChartDefaults& d) {

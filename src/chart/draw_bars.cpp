@@ -3,6 +3,7 @@
 #include "chart/draw_date_axis.h"
 #include "chart/number_format.h"
 #include "chart/price_source.h"
+#include "chart/swing.h"
 #include "platform/text.h"
 
 #include <array>
@@ -83,7 +84,9 @@ struct TenBarTrace {
 
 class BarLoop {
 public:
-    explicit BarLoop(ChartPainter& p) : m_p(p), m_c(p.chart), m_axis(p) {}
+    explicit BarLoop(ChartPainter& p) : m_p(p), m_c(p.chart), m_axis(p) {
+        if (p.in.Request.SwingOn && p.in.Request.ChartSlot == 0) m_swing.emplace(p);
+    }
 
     void Run() {
         const auto& bars = m_c.ChartBars();
@@ -128,6 +131,8 @@ private:
         DrawNote(bar, x);
         DrawTrace(ys, x);
         m_axis.Bar(x, bar.DateText());
+        if (m_swing)
+            m_swing->Bar(i, x, {ys.High, ys.Low, ys.Close, bar.High, bar.Low, bar.Close});
     }
 
     int BarEntry(const store::ChartBar& bar, const BarYs& ys, double x) {
@@ -211,6 +216,7 @@ private:
     DateAxis m_axis;
     StopLoss m_stop;
     TenBarTrace m_trace;
+    std::optional<SwingChart> m_swing;
     std::optional<BarYs> m_prev, m_prev2;
     double m_lineX = 0;
 };

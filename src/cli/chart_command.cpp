@@ -3,6 +3,7 @@
 #include "app/chart_service.h"
 #include "chart/print_chart.h"
 #include "chart/scale.h"
+#include "chart/swing.h"
 #include "cli/cli_context.h"
 #include "cli/gui_app.h"
 #include "gui/paint/pdf_printer.h"
@@ -32,7 +33,58 @@ struct ChartOptions {
     std::string finish;
     std::string size = "1000x700";
     std::string stream, png, svg, pdf;
+    // Overlays, swing and point-and-figure; 0 or empty keeps the chart defaults.
+    int ma1 = 0, ma2 = 0;
+    bool exponential = false, mma = false, para = false, parav = false;
+    std::string bands, swing;
+    int reversal = 0;
+    float boxValue = 0;
 };
+
+void ApplySwing(const std::string& text, app::ChartJob& job) {
+    auto& r = job.Request;
+    const auto colon = text.find(':');
+    const std::string method = text.substr(0, colon);
+    if (method != "NORM" && method != "XDay" && method != "XPoint" && method != "XPointAuto")
+        throw CliError{"--swing wants NORM, XDay:N, XPoint:N or XPointAuto"};
+    float value = 0;
+    if (colon != std::string::npos) value = static_cast<float>(platform::Val(text.substr(colon + 1)));
+    if ((method == "XDay" || method == "XPoint") && colon != std::string::npos &&
+        !chart::SwingValueValid(method, value))
+        throw CliError{std::string(chart::kSwingRefusal)};
+    chart::SwingSwitch swing;
+    swing.Set(r, true);
+    r.SwingMethod = method;
+    r.SwingValue = value;
+    r.SwingPanel = method == "NORM"         ? chart::SidePanel::None
+                   : method == "XPointAuto" ? chart::SidePanel::XPointAuto
+                                            : chart::SidePanel::Other;
+}
+
+void ApplyOverlays(const ChartOptions& o, app::ChartJob& job) {
+    auto& r = job.Request;
+    auto& d = job.Defaults;
+    if (o.ma1 > 0) {
+        r.AvOne = true;
+        d.MAPeriod1Daily = d.MAPeriod1Long = static_cast<std::int16_t>(o.ma1);
+    }
+    if (o.ma2 > 0) {
+        r.AvTwo = true;
+        d.MAPeriod2Daily = d.MAPeriod2Long = static_cast<std::int16_t>(o.ma2);
+    }
+    if (o.exponential) d.MAExponential = true;
+    if (o.mma) r.MMAOn = true;
+    if (o.bands == "percent") r.ChartBands = 1;
+    if (o.bands == "bollinger") r.ChartBands = 2;
+    if (o.bands == "none") r.ChartBands = 0;
+    if (o.para || o.parav) {
+        r.AutoOsc = true;
+        r.AutoOscCode = o.parav ? "PARAV" : "PARA";
+    }
+    if (!o.swing.empty()) ApplySwing(o.swing, job);
+    if (o.reversal > 0) r.BarSpacing = static_cast<std::int16_t>(o.reversal);
+    if (o.boxValue > 0) job.Name.PFIncrement = o.boxValue;
+}
 
 std::pair<int, int> ParseArea(const std::string& text) {
     const auto x = text.find_first_of("xX");
@@ -93,6 +145,7 @@ void Run(CliContext& ctx, const ChartOptions& o) {
     job.Defaults = chart::LoadChartDefaults(session.ini());
     chart::LoadChartRequestSettings(session.ini(), job.Request);
     ApplyOptions(o, job);
+    ApplyOverlays(o, job);
     chart::PrinterPage page;
     job.Page = &page;
 
@@ -155,6 +208,20 @@ void AddChartCommand(CLI::App& app, CliContext& ctx) {
     cmd->add_option("--svg", o->svg, "SVG drawing as the screen shows it")->option_text("FILE");
     cmd->add_option("--pdf", o->pdf, "A4 page as the printer prints it")->option_text("FILE");
     cmd->add_flag("--json", o->json, "Print the chart numbers as JSON");
+    cmd->add_option("--ma1", o->ma1, "Moving average 1 on, with this period")->check(CLI::Range(1, 500));
+    cmd->add_option("--ma2", o->ma2, "Moving average 2 on, with this period")->check(CLI::Range(1, 500));
+    cmd->add_flag("--exponential", o->exponential, "Exponential moving averages");
+    cmd->add_flag("--mma", o->mma, "Multiple moving averages in place of the two averages");
+    cmd->add_option("--bands", o->bands, "percent, bollinger or none")
+        ->check(CLI::IsMember({"percent", "bollinger", "none"}));
+    cmd->add_flag("--para", o->para, "Parabolic stop over the bars");
+    cmd->add_flag("--parav", o->parav, "Parabolic stop over the close line");
+    cmd->add_option("--swing", o->swing, "Swing lines: NORM, XDay:N, XPoint:N or XPointAuto")
+        ->option_text("METHOD");
+    cmd->add_option("--reversal", o->reversal, "Boxes in a point-and-figure reversal (2 to 6)")
+        ->check(CLI::Range(1, 20));
+    cmd->add_option("--box-value", o->boxValue, "Point-and-figure box value (automatic scale)")
+        ->check(CLI::PositiveNumber);
     cmd->callback([&ctx, o] { Run(ctx, *o); });
 }
 
