@@ -181,6 +181,11 @@ std::string OscDialogTitle(std::string_view oscName) {
     return std::string(oscName);
 }
 
+std::string CompareFileText(std::string_view stored) {
+    const std::string t = Trim(stored);
+    return t == platform::kUnknown ? std::string() : t;
+}
+
 float ResolveBoxValue(const std::optional<BoxValueAnswer>& answer, float autoValue) {
     float v = (!answer || answer->Auto) ? autoValue : answer->Value;
     if (!(v >= 0.003f)) v = 0.003f;

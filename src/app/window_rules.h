@@ -84,6 +84,9 @@ std::string_view OscFieldLabel(std::string_view dailyKey);
 // The title of the dialog for an oscillator: its name in lists, else the identifier.
 std::string OscDialogTitle(std::string_view oscName);
 
+// The comparison file as a box shows it: a key never set ("unknown") shows empty.
+std::string CompareFileText(std::string_view stored);
+
 // The point-and-figure box question of a chart on manual scale. The chart proposes the
 // automatic value; the answer is a typed value or "automatic".
 struct BoxValueAnswer {

@@ -134,6 +134,11 @@ TEST(WindowRules, OscillatorDialogLabelsAndTitles) {
     EXPECT_EQ(OscDialogTitle("RMO"), "RMO"); // no name in lists
 }
 
+TEST(WindowRules, AnUnsetCompareFileShowsEmpty) {
+    EXPECT_EQ(CompareFileText("unknown"), "");
+    EXPECT_EQ(CompareFileText(" /data/XAO.WDT "), "/data/XAO.WDT");
+}
+
 TEST(WindowRules, BoxValueAfterTheQuestion) {
     EXPECT_FLOAT_EQ(ResolveBoxValue(std::nullopt, 0.25f), 0.25f);
     EXPECT_FLOAT_EQ(ResolveBoxValue(BoxValueAnswer{true, 5}, 0.25f), 0.25f);

@@ -288,6 +288,17 @@ TEST_F(SampleRoot, ChartDefaultsSaveEveryFieldAndRefuseBadPeriods) {
     EXPECT_EQ(Ini("OscDef", "AtrD"), "14");
     EXPECT_EQ(Ini("OscDef", "CompFile"), "/data/XAO.WDT");
     EXPECT_EQ(Ini("OscDef", "NoClassicMACD"), "True");
+
+    // The ATR period may stay unset, but a value must be 1 to 200.
+    gui::ChtDef again(session, hub, gui::ChtDef::Caller::Menu);
+    EXPECT_EQ(static_cast<QLineEdit*>(again.control("CompFile"))->text(), "/data/XAO.WDT");
+    static_cast<QLineEdit*>(again.control("AtrW"))->setText("201");
+    dialogs.clear();
+    EXPECT_FALSE(again.Save());
+    EXPECT_EQ(Messages(), std::vector<std::string>{" Periods must be between 1 - 200 "});
+    static_cast<QLineEdit*>(again.control("AtrW"))->setText("");
+    EXPECT_TRUE(again.Save());
+    EXPECT_EQ(Ini("OscDef", "AtrW"), "0");
 }
 
 TEST_F(SampleRoot, SmallWindowsStoreTheirValueAndRebuildTheChart) {

@@ -63,7 +63,7 @@ ChtDef::ChtDef(app::Session& session, SettingsHub& hub, Caller caller, const std
 
     auto* scaling = new QGroupBox(QStringLiteral("CHART SCALING"), this);
     auto* sf = new QFormLayout(scaling);
-    sf->addRow(QString(), Choice("ScMethod", QStringLiteral("Automatic"), QStringLiteral("Name File"),
+    sf->addRow(QStringLiteral("Method"), Choice("ScMethod", QStringLiteral("Automatic"), QStringLiteral("Name File"),
                                  d.AutoScale));
     const QString log = QStringLiteral("Logarithmic"), arith = QStringLiteral("Arithmetic");
     sf->addRow(QStringLiteral("Bar Charts and   Candlestick Charts"),
@@ -92,7 +92,8 @@ ChtDef::ChtDef(app::Session& session, SettingsHub& hub, Caller caller, const std
     atr->addWidget(Box("AtrW", osc.AtrW));
     atr->addStretch();
     of->addRow(QStringLiteral("Average True Range"), atr);
-    auto* comp = new QLineEdit(Q(osc.CompFile.empty() ? d.CompFile : osc.CompFile), this);
+    const std::string oscComp = app::CompareFileText(osc.CompFile);
+    auto* comp = new QLineEdit(Q(oscComp.empty() ? app::CompareFileText(d.CompFile) : oscComp), this);
     comp->setObjectName(QStringLiteral("CompFile"));
     comp->setMaxLength(100);
     m_controls["CompFile"] = comp;
@@ -171,10 +172,16 @@ bool ChtDef::Save() {
     const std::array<std::string, 4> periods = {text("Av1D"), text("Av2D"), text("Av1W"),
                                                 text("Av2W")};
     if (!app::Accept(app::AveragePeriodsProblem(periods), dialogs())) return false;
-    const auto atrD = app::WholeNumber(text("AtrD")), atrW = app::WholeNumber(text("AtrW"));
-    if (!atrD || !atrW || *atrD < 1 || *atrD > 200 || *atrW < 1 || *atrW > 200) {
-        dialogs().MsgBox(" Periods must be between 1 - 200 ", "Oscillator Values");
-        return false;
+    // An empty ATR box leaves the period unset (0); a value must be 1 to 200.
+    std::array<std::int16_t, 2> atr{};
+    for (std::size_t i = 0; i < atr.size(); ++i) {
+        const std::string t = platform::Trim(text(i == 0 ? "AtrD" : "AtrW"));
+        const auto v = app::WholeNumber(t);
+        if (!t.empty() && (!v || *v < 1 || *v > 200)) {
+            dialogs().MsgBox(" Periods must be between 1 - 200 ", "Oscillator Values");
+            return false;
+        }
+        atr[i] = static_cast<std::int16_t>(v.value_or(0));
     }
     // Start from what is stored: the small windows may have written keys since this opened.
     auto d = chart::LoadChartDefaults(m_session.ini());
@@ -197,8 +204,8 @@ bool ChtDef::Save() {
 
     // The oscillators read their copy of the shared keys from their own section.
     auto osc = osc::ReadOscSettings(m_session.ini());
-    osc.AtrD = static_cast<std::int16_t>(*atrD);
-    osc.AtrW = static_cast<std::int16_t>(*atrW);
+    osc.AtrD = atr[0];
+    osc.AtrW = atr[1];
     osc.CompFile = d.CompFile;
     osc.ShowOsc = BoolWord(d.ShowOscSettings);
     osc.NoClassicMACD = !d.ClassicMACD;

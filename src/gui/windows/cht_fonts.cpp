@@ -70,7 +70,7 @@ ChtFonts::ChtFonts(app::Session& session, SettingsHub& hub, QWidget* parent)
     layout->addLayout(grid);
     layout->addWidget(listBox);
     layout->addLayout(buttons);
-    setMinimumWidth(460);
+    resize(480, sizeHint().height());
     Show();
 }
 

@@ -4,6 +4,7 @@
 
 #include <QGroupBox>
 #include <QHBoxLayout>
+#include <QLabel>
 #include <QListWidget>
 #include <QPushButton>
 #include <QVBoxLayout>
@@ -53,6 +54,8 @@ MultiOsc::MultiOsc(app::Session& session, SettingsHub& hub, QWidget* parent)
     top->addWidget(m_choices, 1);
     top->addLayout(sets, 1);
     auto* layout = new QVBoxLayout(this);
+    layout->addWidget(new QLabel(
+        QStringLiteral("Click a slot, then double click the oscillator that is to fill it"), this));
     layout->addLayout(top);
     layout->addLayout(buttons);
     resize(480, 400);

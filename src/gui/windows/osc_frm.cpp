@@ -39,10 +39,10 @@ void OscFrm::BuildOscillatorForm() {
         m_fields.push_back(edit);
     }
     if (m_oscName == "RMO" || m_oscName == "RMX") {
-        m_compare = new QLineEdit(Q(m_def.CompFile), this);
+        m_compare = new QLineEdit(Q(app::CompareFileText(m_def.CompFile)), this);
         m_compare->setObjectName(QStringLiteral("txtCompare"));
         m_compare->setMaxLength(100);
-        m_compare->setMinimumWidth(280);
+        m_compare->setMinimumWidth(300);
         form->addRow(QStringLiteral("Compare to:"), m_compare);
         connect(m_compare, &QLineEdit::editingFinished, this, [this] {
             if (m_compare->text().trimmed().isEmpty())
@@ -67,7 +67,7 @@ void OscFrm::BuildOscillatorForm() {
     layout->addWidget(heading);
     layout->addLayout(form);
     layout->addLayout(buttons);
-    setMinimumWidth(260);
+    layout->setSizeConstraint(QLayout::SetFixedSize);
 }
 
 void OscFrm::BuildBoxForm() {
@@ -96,6 +96,7 @@ void OscFrm::BuildBoxForm() {
     auto* layout = new QVBoxLayout(this);
     layout->addLayout(form);
     layout->addLayout(buttons);
+    layout->setSizeConstraint(QLayout::SetFixedSize);
 }
 
 bool OscFrm::Ok() {
