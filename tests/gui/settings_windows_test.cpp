@@ -32,6 +32,8 @@
 #include <QCheckBox>
 #include <QComboBox>
 #include <QDir>
+#include <QGuiApplication>
+#include <QScreen>
 #include <QLineEdit>
 #include <QListWidget>
 #include <QPushButton>
@@ -575,4 +577,20 @@ TEST_F(SampleRoot, Screenshots) {
     shoot(scales, "Scales");
     gui::PLW plw(session, hub);
     shoot(plw, "PLW");
+
+    // Under a real display (Xvfb), the whole screen: the main window with the chart defaults
+    // over it, as a person sees them.
+    if (QGuiApplication::platformName() == "xcb") {
+        gui::MainWindow main(session);
+        gui::RegisterWindows(main);
+        main.setGeometry(20, 40, 1000, 640);
+        main.show();
+        ASSERT_TRUE(main.Trigger("mnuChartDefaults"));
+        for (int i = 0; i < 20; ++i) {
+            QApplication::processEvents();
+            QTest::qWait(20);
+        }
+        const QPixmap screen = QGuiApplication::primaryScreen()->grabWindow(0);
+        EXPECT_TRUE(screen.save(QString::fromLatin1(dir) + "/Main_ChtDef.png"));
+    }
 }
