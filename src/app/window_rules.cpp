@@ -100,7 +100,9 @@ const std::array<std::string_view, 4>& SwingMethods() {
     return methods;
 }
 
-float DefaultSwingValue(std::string_view method) { return method == "XDay" ? 3.0f : 9.0f; }
+float DefaultSwingValue(std::string_view method) {
+    return method == "XDay" ? 3.0f : 9.0f;
+}
 
 SwingSettings ReadSwingSettings(const platform::IniFile& ini) {
     SwingSettings s;
@@ -164,11 +166,11 @@ std::string_view OscFieldLabel(std::string_view dailyKey) {
         std::string_view key, label;
     };
     static constexpr Label labels[] = {
-        {"StochK", "Period K"},   {"StochD", "Period D"}, {"FXF", "Period F"},
-        {"FXX", "Period X"},      {"RmxP", "Period RMX"}, {"RmxA", "RMX Ave"},
-        {"RmoP", "Period RMO"},   {"RmoA", "RMO Ave"},    {"RocP", "Period ROC"},
-        {"RocA", "ROC Ave"},      {"RsiP", "RSI period"}, {"Md1", "EMA 1"},
-        {"Md2", "EMA 2"},         {"Md3", "EMA 3 signal"}, {"DMA", "Period "},
+        {"StochK", "Period K"}, {"StochD", "Period D"},  {"FXF", "Period F"},
+        {"FXX", "Period X"},    {"RmxP", "Period RMX"},  {"RmxA", "RMX Ave"},
+        {"RmoP", "Period RMO"}, {"RmoA", "RMO Ave"},     {"RocP", "Period ROC"},
+        {"RocA", "ROC Ave"},    {"RsiP", "RSI period"},  {"Md1", "EMA 1"},
+        {"Md2", "EMA 2"},       {"Md3", "EMA 3 signal"}, {"DMA", "Period "},
         {"DMXA", "AveDX"}};
     for (const auto& l : labels)
         if (l.key == dailyKey) return l.label;

@@ -120,7 +120,7 @@ TEST(WindowRules, ScalesAreCheckedThenWrittenToTheNameRecord) {
     EXPECT_FLOAT_EQ(r.PFIncrement, 0.05f);
     EXPECT_FLOAT_EQ(r.ScaleStep, 0.05f);
     ASSERT_TRUE(again.Read(1, r));
-    EXPECT_FLOAT_EQ(r.Base, 0.0f); // the other record is untouched
+    EXPECT_FLOAT_EQ(r.Base, 0.0f);                              // the other record is untouched
     EXPECT_FALSE(SaveScales(root.folder(), 3, {"1", "2", ""})); // no such record
 }
 

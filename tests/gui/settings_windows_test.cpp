@@ -33,11 +33,11 @@
 #include <QComboBox>
 #include <QDir>
 #include <QGuiApplication>
-#include <QScreen>
 #include <QLineEdit>
 #include <QListWidget>
 #include <QPushButton>
 #include <QRadioButton>
+#include <QScreen>
 #include <QSignalSpy>
 #include <QTest>
 #include <gtest/gtest.h>
@@ -69,7 +69,9 @@ struct SampleRoot : ::testing::Test {
         dialogs.clear();
     }
 
-    std::string Ini(const char* section, const char* key) { return session.ini().Read(section, key); }
+    std::string Ini(const char* section, const char* key) {
+        return session.ini().Read(section, key);
+    }
     std::vector<std::string> Messages() const { return dialogs.messages(); }
     std::string LastTitle() const {
         for (auto it = dialogs.shown().rbegin(); it != dialogs.shown().rend(); ++it)
@@ -154,7 +156,8 @@ TEST_F(SampleRoot, LocateRefusesWhatIsNotAFolder) {
 TEST_F(SampleRoot, DataFoldersSaveTheListAndOfferToCreateMissingFolders) {
     gui::DataPaths w(session, hub, gui::DataPaths::Mode::Setting);
     EXPECT_EQ(w.windowTitle(), "Data Folders");
-    for (int i = 0; i < app::kDataTypeCount; ++i) w.field(i)->setText("");
+    for (int i = 0; i < app::kDataTypeCount; ++i)
+        w.field(i)->setText("");
     Click(w, "cmdSave");
     EXPECT_EQ(Messages(), std::vector<std::string>{"At least one data folder must be entered"});
     EXPECT_EQ(LastTitle(), "Chart Data Folders");
@@ -165,8 +168,8 @@ TEST_F(SampleRoot, DataFoldersSaveTheListAndOfferToCreateMissingFolders) {
     w.field(1)->setText(QString::fromStdString(fresh));
     dialogs.QueueAnswer(Answer::Yes);
     Click(w, "cmdSave");
-    EXPECT_EQ(Messages(),
-              std::vector<std::string>{"Directory " + fresh + "/ does not exist. Create this directory ?"});
+    EXPECT_EQ(Messages(), std::vector<std::string>{"Directory " + fresh +
+                                                   "/ does not exist. Create this directory ?"});
     EXPECT_TRUE(std::filesystem::is_directory(fresh));
     const auto lst = app::ReadChartPathsFile(session.folders.SystemFolder + "ChtPaths.lst");
     ASSERT_TRUE(lst);
@@ -440,8 +443,8 @@ TEST_F(SampleRoot, CompareOscillatorsNeedTheirFile) {
     dialogs.clear();
     w.compareBox()->setText(QString::fromStdString(session.folders.DataFolder + "NOPE.WDT"));
     Click(w, "cmdOK");
-    EXPECT_EQ(Messages(),
-              std::vector<std::string>{"NOPE is not available. Use your code for the All Ordinaries Index"});
+    EXPECT_EQ(Messages(), std::vector<std::string>{
+                              "NOPE is not available. Use your code for the All Ordinaries Index"});
     const auto xao = platform::ResolveIn(session.folders.DataFolder, "XAO.WDT").string();
     w.compareBox()->setText(QString::fromStdString(xao));
     Click(w, "cmdOK");
@@ -507,7 +510,7 @@ TEST_F(SampleRoot, WindowPositionsAreKeptInTheSettingsStore) {
 TEST_F(SampleRoot, MenuItemsOpenTheSettingsWindows) {
     gui::MainWindow main(session);
     gui::RegisterWindows(main);
-    for (const char* item : {"mnuChartDefaults", "mnuPaths", "mnFnts"})
+    for (const char* item : {"mnuChartDefaults", "mnuPaths", "mnFnts", "mnuPntCol"})
         EXPECT_NE(main.findChild<QAction*>(item), nullptr) << item;
     ASSERT_TRUE(main.Trigger("mnuChartDefaults"));
     auto* def = main.findChild<gui::ChtDef*>("ChtDef");
@@ -521,6 +524,18 @@ TEST_F(SampleRoot, MenuItemsOpenTheSettingsWindows) {
     session.download.DataService = 3;
     ASSERT_TRUE(main.Trigger("mnuPaths"));
     EXPECT_NE(main.findChild<gui::DataPaths*>("DataPaths"), nullptr);
+
+    // The printer questions again: a colour printer that prints white as it is.
+    dialogs.clear();
+    dialogs.QueueAnswer(Answer::Yes);
+    dialogs.QueueAnswer(Answer::No);
+    ASSERT_TRUE(main.Trigger("mnuPntCol"));
+    EXPECT_EQ(Messages(), (std::vector<std::string>{" Do you have a Colour Printer ?",
+                                                    "Print the colour WHITE as BLACK ?"}));
+    const auto printer = app::ReadPrinterFile(session.folders.SystemFolder + "koriprn.dat");
+    ASSERT_TRUE(printer);
+    EXPECT_EQ(printer->PrintColour, 1);
+    EXPECT_EQ(printer->PrintColourLines, 0);
 
     // A saved folder renames the main window.
     const std::string other = root.folder() + "other/";

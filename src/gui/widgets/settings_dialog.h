@@ -13,8 +13,12 @@ class QPushButton;
 
 namespace kori::gui {
 
-inline QString Q(const std::string& s) { return QString::fromStdString(s); }
-inline std::string S(const QString& s) { return s.toStdString(); }
+inline QString Q(const std::string& s) {
+    return QString::fromStdString(s);
+}
+inline std::string S(const QString& s) {
+    return s.toStdString();
+}
 
 class SettingsDialog : public QDialog {
     Q_OBJECT

@@ -24,9 +24,9 @@ protected:
             m_placed = true;
             if (const auto p = app::LoadWindowPosition(m_store, m_key)) {
                 // The same client geometry that closing wrote.
-                const QSize size = p->width > 0 && p->height > 0
-                                       ? QSize(p->width / kTwipsPerPixel, p->height / kTwipsPerPixel)
-                                       : m_window->size();
+                const QSize size = p->width > 0 && p->height > 0 ? QSize(p->width / kTwipsPerPixel,
+                                                                         p->height / kTwipsPerPixel)
+                                                                 : m_window->size();
                 m_window->setGeometry(p->left / kTwipsPerPixel, p->top / kTwipsPerPixel,
                                       size.width(), size.height());
             }

@@ -61,7 +61,9 @@ CPath::CPath(app::Session& session, SettingsHub& hub, QWidget* parent)
 
     if (session.pathsMissing) {
         switch (app::AskForMissingPaths(session)) {
-        case app::MissingPathsChoice::EnterPaths: Show(app::PathDetails{}); return;
+        case app::MissingPathsChoice::EnterPaths:
+            Show(app::PathDetails{});
+            return;
         case app::MissingPathsChoice::UseDefaults:
             hub.DataFolderChanged();
             break;
@@ -80,7 +82,8 @@ void CPath::Show(const app::PathDetails& p) {
     m_shown = p;
     const std::string* v[] = {&p.SystemFolder, &p.DataFolder, &p.ChartBackupFolder, &p.PFMData,
                               &p.PFMBackUp};
-    for (std::size_t i = 0; i < m_fields.size(); ++i) m_fields[i]->setText(Q(*v[i]));
+    for (std::size_t i = 0; i < m_fields.size(); ++i)
+        m_fields[i]->setText(Q(*v[i]));
 }
 
 app::PathDetails CPath::Edited() const {
@@ -103,8 +106,8 @@ bool CPath::Save() {
 void CPath::reject() {
     if (m_proceed && !Same(Edited(), m_shown) &&
         dialogs().MsgBox("Paths have changed. SAVE Changes ?", "Save Changes",
-                         platform::Buttons::YesNo, platform::Icon::Question) ==
-            platform::Answer::Yes &&
+                         platform::Buttons::YesNo,
+                         platform::Icon::Question) == platform::Answer::Yes &&
         !Save())
         return; // a refused save keeps the window open
     QDialog::reject();

@@ -18,8 +18,12 @@
 namespace kori::gui {
 
 namespace {
-QString Num(double v) { return Q(platform::Trim(platform::Str(v))); }
-QString Single(float v) { return Q(platform::Trim(platform::StrSingle(v))); }
+QString Num(double v) {
+    return Q(platform::Trim(platform::Str(v)));
+}
+QString Single(float v) {
+    return Q(platform::Trim(platform::StrSingle(v)));
+}
 
 QLineEdit* NumberBox(QWidget* parent, const char* name, const QString& text, int width = 70) {
     auto* e = new QLineEdit(text, parent);
@@ -163,8 +167,7 @@ StpLs::StpLs(app::Session& session, SettingsHub& hub, QWidget* parent)
 bool StpLs::Ok() {
     const std::string t = S(m_percent->text());
     if (!app::Accept(app::StopLossProblem(t), dialogs())) return false;
-    app::SetStopLoss(m_defaults, m_on->isChecked(),
-                     static_cast<float>(*app::TypedNumber(t)));
+    app::SetStopLoss(m_defaults, m_on->isChecked(), static_cast<float>(*app::TypedNumber(t)));
     Store();
     return true;
 }
@@ -175,12 +178,13 @@ MMASet::MMASet(app::Session& session, SettingsHub& hub, QWidget* parent)
     : ChartDefaultWindow(session, hub, "MMASet", QStringLiteral("MMA Settings"), parent) {
     auto* groups = new QHBoxLayout;
     for (int g = 0; g < 2; ++g) {
-        auto* box = new QGroupBox(g == 0 ? QStringLiteral("MMA (Short)") : QStringLiteral("MMA (Long)"),
-                                  this);
+        auto* box = new QGroupBox(
+            g == 0 ? QStringLiteral("MMA (Short)") : QStringLiteral("MMA (Long)"), this);
         auto* form = new QFormLayout(box);
         for (int i = 0; i < 6; ++i) {
             const int n = g * 6 + i;
-            auto* e = NumberBox(box, "txtAve", Num(m_defaults.MMAPeriods[static_cast<std::size_t>(n)]), 60);
+            auto* e = NumberBox(box, "txtAve",
+                                Num(m_defaults.MMAPeriods[static_cast<std::size_t>(n)]), 60);
             e->setObjectName(QStringLiteral("txtAve%1").arg(n));
             e->setMaxLength(3);
             form->addRow(QStringLiteral("Ave %1").arg(i + 1), e);
@@ -205,7 +209,8 @@ void MMASet::Default() {
 
 bool MMASet::Ok() {
     std::array<std::string, 12> texts;
-    for (std::size_t i = 0; i < texts.size(); ++i) texts[i] = S(m_boxes[i]->text());
+    for (std::size_t i = 0; i < texts.size(); ++i)
+        texts[i] = S(m_boxes[i]->text());
     if (!app::Accept(app::MMAProblem(texts), dialogs())) return false;
     for (std::size_t i = 0; i < texts.size(); ++i)
         m_defaults.MMAPeriods[i] = static_cast<std::int16_t>(*app::WholeNumber(texts[i]));
@@ -317,7 +322,8 @@ Chart2::Chart2(app::Session& session, SettingsHub& hub, QWidget* parent)
       m_code(NumberBox(this, "txtCode", QString(), 90)), m_period(new QComboBox(this)) {
     m_code->setMaxLength(6);
     m_period->setObjectName(QStringLiteral("cboPeriod"));
-    m_period->addItems({QStringLiteral("Daily"), QStringLiteral("Weekly"), QStringLiteral("Monthly")});
+    m_period->addItems(
+        {QStringLiteral("Daily"), QStringLiteral("Weekly"), QStringLiteral("Monthly")});
     auto* form = new QFormLayout;
     form->addRow(QStringLiteral("Code of the lower chart"), m_code);
     form->addRow(QStringLiteral("Period"), m_period);

@@ -77,7 +77,9 @@ class VHeight : public ChartDefaultWindow {
     Q_OBJECT
 public:
     VHeight(app::Session& session, SettingsHub& hub, QWidget* parent = nullptr);
-    QRadioButton* option(int multiple) const { return m_options[static_cast<std::size_t>(multiple - 1)]; }
+    QRadioButton* option(int multiple) const {
+        return m_options[static_cast<std::size_t>(multiple - 1)];
+    }
     bool Ok() override;
 
 private:

@@ -24,17 +24,19 @@
 namespace kori::gui {
 
 namespace {
-const char* BoolWord(bool b) { return b ? "True" : "False"; }
+const char* BoolWord(bool b) {
+    return b ? "True" : "False";
+}
 
 struct SmallWindow {
     const char* name;
     const char* caption;
 };
 constexpr SmallWindow kSmallWindows[] = {
-    {"PLW", "Line Width"},        {"BlankSpc", "Blank Space"},   {"GLSpaces", "Grid Lines"},
-    {"VHeight", "Volume Height"}, {"StpLs", "Stop Loss"},        {"MMASet", "MMA Settings"},
-    {"SwingSet", "Swing"},        {"Chart2", "Second Chart"},    {"Scales", "Change Scales"},
-    {"ColNew", "Colours"},        {"ChtFonts", "Fonts"},         {"MultiOsc", "Multi Oscillators"}};
+    {"PLW", "Line Width"},        {"BlankSpc", "Blank Space"}, {"GLSpaces", "Grid Lines"},
+    {"VHeight", "Volume Height"}, {"StpLs", "Stop Loss"},      {"MMASet", "MMA Settings"},
+    {"SwingSet", "Swing"},        {"Chart2", "Second Chart"},  {"Scales", "Change Scales"},
+    {"ColNew", "Colours"},        {"ChtFonts", "Fonts"},       {"MultiOsc", "Multi Oscillators"}};
 } // namespace
 
 ChtDef::ChtDef(app::Session& session, SettingsHub& hub, Caller caller, const std::string& code,
@@ -63,8 +65,8 @@ ChtDef::ChtDef(app::Session& session, SettingsHub& hub, Caller caller, const std
 
     auto* scaling = new QGroupBox(QStringLiteral("CHART SCALING"), this);
     auto* sf = new QFormLayout(scaling);
-    sf->addRow(QStringLiteral("Method"), Choice("ScMethod", QStringLiteral("Automatic"), QStringLiteral("Name File"),
-                                 d.AutoScale));
+    sf->addRow(QStringLiteral("Method"), Choice("ScMethod", QStringLiteral("Automatic"),
+                                                QStringLiteral("Name File"), d.AutoScale));
     const QString log = QStringLiteral("Logarithmic"), arith = QStringLiteral("Arithmetic");
     sf->addRow(QStringLiteral("Bar Charts and   Candlestick Charts"),
                Choice("BCCalTp", log, arith, d.LogBars));
@@ -93,7 +95,8 @@ ChtDef::ChtDef(app::Session& session, SettingsHub& hub, Caller caller, const std
     atr->addStretch();
     of->addRow(QStringLiteral("Average True Range"), atr);
     const std::string oscComp = app::CompareFileText(osc.CompFile);
-    auto* comp = new QLineEdit(Q(oscComp.empty() ? app::CompareFileText(d.CompFile) : oscComp), this);
+    auto* comp =
+        new QLineEdit(Q(oscComp.empty() ? app::CompareFileText(d.CompFile) : oscComp), this);
     comp->setObjectName(QStringLiteral("CompFile"));
     comp->setMaxLength(100);
     m_controls["CompFile"] = comp;
@@ -223,18 +226,30 @@ void ChtDef::OpenWindow(const std::string& name) {
     std::unique_ptr<QDialog> w;
     auto& s = m_session;
     auto& h = m_hub;
-    if (name == "PLW") w = std::make_unique<PLW>(s, h, this);
-    else if (name == "BlankSpc") w = std::make_unique<BlankSpc>(s, h, this);
-    else if (name == "GLSpaces") w = std::make_unique<GLSpaces>(s, h, this);
-    else if (name == "VHeight") w = std::make_unique<VHeight>(s, h, this);
-    else if (name == "StpLs") w = std::make_unique<StpLs>(s, h, this);
-    else if (name == "MMASet") w = std::make_unique<MMASet>(s, h, this);
-    else if (name == "SwingSet") w = std::make_unique<SwingSet>(s, h, this);
-    else if (name == "Chart2") w = std::make_unique<Chart2>(s, h, this);
-    else if (name == "Scales") w = std::make_unique<Scales>(s, h, m_code, this);
-    else if (name == "ColNew") w = std::make_unique<ColNew>(s, h, this);
-    else if (name == "ChtFonts") w = std::make_unique<ChtFonts>(s, h, this);
-    else if (name == "MultiOsc") w = std::make_unique<MultiOsc>(s, h, this);
+    if (name == "PLW")
+        w = std::make_unique<PLW>(s, h, this);
+    else if (name == "BlankSpc")
+        w = std::make_unique<BlankSpc>(s, h, this);
+    else if (name == "GLSpaces")
+        w = std::make_unique<GLSpaces>(s, h, this);
+    else if (name == "VHeight")
+        w = std::make_unique<VHeight>(s, h, this);
+    else if (name == "StpLs")
+        w = std::make_unique<StpLs>(s, h, this);
+    else if (name == "MMASet")
+        w = std::make_unique<MMASet>(s, h, this);
+    else if (name == "SwingSet")
+        w = std::make_unique<SwingSet>(s, h, this);
+    else if (name == "Chart2")
+        w = std::make_unique<Chart2>(s, h, this);
+    else if (name == "Scales")
+        w = std::make_unique<Scales>(s, h, m_code, this);
+    else if (name == "ColNew")
+        w = std::make_unique<ColNew>(s, h, this);
+    else if (name == "ChtFonts")
+        w = std::make_unique<ChtFonts>(s, h, this);
+    else if (name == "MultiOsc")
+        w = std::make_unique<MultiOsc>(s, h, this);
     if (w) w->exec();
 }
 

@@ -16,7 +16,9 @@
 namespace kori::gui {
 
 namespace {
-QString SizeText(double size) { return Q(platform::Trim(platform::Str(size))); }
+QString SizeText(double size) {
+    return Q(platform::Trim(platform::Str(size)));
+}
 
 QString Describe(const std::string& family, const std::string& size) {
     if (platform::Trim(size) == platform::kUnknown) return Q(family) + QStringLiteral(" (no size)");
@@ -28,8 +30,8 @@ ChtFonts::ChtFonts(app::Session& session, SettingsHub& hub, QWidget* parent)
     : SettingsDialog(session, hub, "ChtFonts", QStringLiteral("Fonts Selection"), parent),
       m_fonts(app::ReadFontSettings(session.ini())), m_font1(new QLabel(this)),
       m_font2(new QLabel(this)),
-      m_printerOnly(new QRadioButton(QStringLiteral("List only fonts supported by your printer"),
-                                     this)) {
+      m_printerOnly(
+          new QRadioButton(QStringLiteral("List only fonts supported by your printer"), this)) {
     m_font1->setObjectName(QStringLiteral("lblFont1"));
     m_font2->setObjectName(QStringLiteral("lblFont2"));
     m_font1->setFrameShape(QFrame::StyledPanel);
@@ -47,8 +49,8 @@ ChtFonts::ChtFonts(app::Session& session, SettingsHub& hub, QWidget* parent)
     grid->addWidget(m_font2, 1, 2);
     grid->setColumnStretch(2, 1);
 
-    auto* listBox =
-        new QGroupBox(QStringLiteral("List all fonts or only those supported by your printer"), this);
+    auto* listBox = new QGroupBox(
+        QStringLiteral("List all fonts or only those supported by your printer"), this);
     auto* all = new QRadioButton(QStringLiteral("List all fonts available"), listBox);
     all->setChecked(true);
     m_printerOnly->setParent(listBox);
@@ -100,10 +102,9 @@ void ChtFonts::Choose(int which) {
     QFontDialog::FontDialogOptions options;
     if (m_printerOnly->isChecked()) options |= QFontDialog::ScalableFonts;
     bool ok = false;
-    const QFont f = QFontDialog::getFont(&ok, initial, this,
-                                         which == 1 ? QStringLiteral("Printer Fonts 1")
-                                                    : QStringLiteral("Fonts 2"),
-                                         options);
+    const QFont f = QFontDialog::getFont(
+        &ok, initial, this,
+        which == 1 ? QStringLiteral("Printer Fonts 1") : QStringLiteral("Fonts 2"), options);
     if (!ok) return;
     if (which == 1)
         SetFont1(f.family(), f.pointSizeF());

@@ -18,10 +18,11 @@ QColor ToQColor(platform::Colour c) {
 }
 
 void Paint(QPushButton* swatch, platform::Colour c, bool selected = false) {
-    swatch->setStyleSheet(QStringLiteral("background-color: %1; border: %2px solid %3;")
-                              .arg(ToQColor(c).name())
-                              .arg(selected ? 3 : 1)
-                              .arg(selected ? QStringLiteral("#ff8c00") : QStringLiteral("#606060")));
+    swatch->setStyleSheet(
+        QStringLiteral("background-color: %1; border: %2px solid %3;")
+            .arg(ToQColor(c).name())
+            .arg(selected ? 3 : 1)
+            .arg(selected ? QStringLiteral("#ff8c00") : QStringLiteral("#606060")));
 }
 } // namespace
 
@@ -55,8 +56,9 @@ ColNew::ColNew(app::Session& session, SettingsHub& hub, QWidget* parent)
         const auto& n = names[static_cast<std::size_t>(i)];
         const int col = (i / kRows) * 2;
         rolesGrid->addWidget(swatch, i % kRows, col);
-        rolesGrid->addWidget(new QLabel(QString::fromUtf8(n.data(), static_cast<int>(n.size())), this),
-                             i % kRows, col + 1);
+        rolesGrid->addWidget(
+            new QLabel(QString::fromUtf8(n.data(), static_cast<int>(n.size())), this), i % kRows,
+            col + 1);
         m_roles.push_back(swatch);
     }
     rolesGrid->setColumnStretch(1, 1);
@@ -135,10 +137,10 @@ void ColNew::SaveColours() {
 }
 
 void ColNew::SaveDefaultColours() {
-    const std::string question = "Save the current colours as the default " +
-                                 platform::Upper(m_scheme) + " colours ?";
-    if (dialogs().MsgBox(question, "Colours", platform::Buttons::YesNo,
-                         platform::Icon::Question) != platform::Answer::Yes)
+    const std::string question =
+        "Save the current colours as the default " + platform::Upper(m_scheme) + " colours ?";
+    if (dialogs().MsgBox(question, "Colours", platform::Buttons::YesNo, platform::Icon::Question) !=
+        platform::Answer::Yes)
         return;
     if (auto s = app::SaveColourScheme(m_scheme, m_session.folders.SystemFolder, m_table); !s)
         dialogs().MsgBox(s.message(), "Colours");

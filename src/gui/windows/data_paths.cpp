@@ -43,8 +43,8 @@ DataPaths::DataPaths(app::Session& session, SettingsHub& hub, Mode mode, QWidget
         edit->setObjectName(QStringLiteral("txtPath%1").arg(i));
         edit->setReadOnly(!setting);
         edit->setMinimumWidth(320);
-        const QString label = QString::fromUtf8(app::DataFolderLabels()[u].data(),
-                                                static_cast<int>(app::DataFolderLabels()[u].size()));
+        const QString label = QString::fromUtf8(
+            app::DataFolderLabels()[u].data(), static_cast<int>(app::DataFolderLabels()[u].size()));
         const QString type = QString::fromUtf8(app::DataTypeNames()[u].data(),
                                                static_cast<int>(app::DataTypeNames()[u].size()));
         auto* name = new QLabel(label, this);
@@ -91,7 +91,8 @@ void DataPaths::MarkCurrent() {
 
 bool DataPaths::Save() {
     app::ChartDataPaths edited;
-    for (std::size_t i = 0; i < edited.size(); ++i) edited[i] = S(m_fields[i]->text());
+    for (std::size_t i = 0; i < edited.size(); ++i)
+        edited[i] = S(m_fields[i]->text());
     if (!app::SaveDataPaths(m_session, edited)) return false;
     for (std::size_t i = 0; i < edited.size(); ++i)
         m_fields[i]->setText(Q(m_session.chartDataPaths[i]));

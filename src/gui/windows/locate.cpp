@@ -32,7 +32,8 @@ Locate::Locate(app::Session& session, SettingsHub& hub, const std::string& start
     m_model->setFilter(QDir::AllDirs | QDir::NoDotAndDotDot);
     m_model->setRootPath(QStringLiteral("/"));
     m_tree->setModel(m_model);
-    for (int c = 1; c < m_model->columnCount(); ++c) m_tree->hideColumn(c);
+    for (int c = 1; c < m_model->columnCount(); ++c)
+        m_tree->hideColumn(c);
     m_tree->header()->hide();
 
     auto* ok = Button(QStringLiteral("OK"), "cmdOK");

@@ -34,8 +34,8 @@ void Logo::paintEvent(QPaintEvent*) {
     p.fillRect(rect(), g);
     // A small rising price line as the emblem.
     p.setPen(QPen(QColor(80, 200, 120), 3));
-    const QPoint pts[] = {{40, 186}, {90, 168}, {130, 176}, {180, 146}, {230, 154},
-                          {290, 124}, {340, 132}, {400, 108}};
+    const QPoint pts[] = {{40, 186},  {90, 168},  {130, 176}, {180, 146},
+                          {230, 154}, {290, 124}, {340, 132}, {400, 108}};
     p.drawPolyline(pts, 8);
     p.setPen(QColor(255, 214, 0));
     p.setFont(QFont(QStringLiteral("Liberation Sans"), 28, QFont::Bold));

@@ -26,7 +26,8 @@ MultiOsc::MultiOsc(app::Session& session, SettingsHub& hub, QWidget* parent)
         auto* box = new QGroupBox(QStringLiteral("Multi Oscillators %1").arg(s + 1), this);
         auto* list = new QListWidget(box);
         list->setObjectName(QStringLiteral("lstSet%1").arg(s + 1));
-        for (const auto& slot : osc::LoadMultiOscSet(store, s + 1).Slots) list->addItem(Q(slot));
+        for (const auto& slot : osc::LoadMultiOscSet(store, s + 1).Slots)
+            list->addItem(Q(slot));
         list->setFixedHeight(list->sizeHintForRow(0) * 5 + 2 * list->frameWidth() + 4);
         connect(list, &QListWidget::itemClicked, this, [this, list] {
             m_activeSet = list;

@@ -12,8 +12,8 @@
 
 namespace kori::gui {
 
-OscFrm::OscFrm(app::Session& session, SettingsHub& hub, const std::string& oscName,
-               char chartStyle, const std::string& chartPeriod, QWidget* parent)
+OscFrm::OscFrm(app::Session& session, SettingsHub& hub, const std::string& oscName, char chartStyle,
+               const std::string& chartPeriod, QWidget* parent)
     : SettingsDialog(session, hub, "OscFrm", QString(), parent), m_oscName(oscName),
       m_weekly(platform::Trim(chartPeriod) != "A"), m_pointAndFigure(chartStyle == 'P'),
       m_def(osc::ReadOscSettings(session.ini())) {
@@ -132,7 +132,9 @@ bool OscFrm::Ok() {
     return true;
 }
 
-void OscFrm::Auto() { m_boxAnswer = app::BoxValueAnswer{true, 0}; }
+void OscFrm::Auto() {
+    m_boxAnswer = app::BoxValueAnswer{true, 0};
+}
 
 std::optional<app::BoxValueAnswer> OscFrm::AskBoxValue(app::Session& session, SettingsHub& hub,
                                                        float proposal, QWidget* parent) {

@@ -1,5 +1,6 @@
 #include "gui/windows/settings_windows.h"
 
+#include "app/colour_table.h"
 #include "gui/windows/c_path.h"
 #include "gui/windows/cht_fonts.h"
 #include "gui/windows/col_new.h"
@@ -25,13 +26,15 @@ SettingsHub& Hub(MainWindow& main) {
 
 void RegisterSettingsWindows(MainWindow& main) {
     SettingsHub& hub = Hub(main);
-    QObject::connect(&hub, &SettingsHub::DataFolderChanged, &main, [&main] { main.UpdateCaption(); });
-    QObject::connect(&hub, &SettingsHub::ExitRequested, &main, [&main] { main.Trigger("mnuExit"); });
+    QObject::connect(&hub, &SettingsHub::DataFolderChanged, &main,
+                     [&main] { main.UpdateCaption(); });
+    QObject::connect(&hub, &SettingsHub::ExitRequested, &main,
+                     [&main] { main.Trigger("mnuExit"); });
     main.SetAction("ChtDef", [&main] { OpenChartDefaults(main, ChtDef::Caller::Menu); });
     main.SetAction("CPath", [&main] { OpenFolderLocations(main); });
-    main.SetAction("ChtFonts", [&main] {
-        ShowWindow(new ChtFonts(main.session(), Hub(main), &main));
-    });
+    main.SetAction("PrinterColour", [&main] { AskPrinterColours(main); });
+    main.SetAction("ChtFonts",
+                   [&main] { ShowWindow(new ChtFonts(main.session(), Hub(main), &main)); });
 }
 
 void OpenChartDefaults(MainWindow& main, ChtDef::Caller caller, const std::string& code) {
@@ -43,9 +46,13 @@ void OpenOscillatorSettings(MainWindow& main, const std::string& oscName, char c
     ShowWindow(new OscFrm(main.session(), Hub(main), oscName, chartStyle, chartPeriod, &main));
 }
 
-void OpenColours(MainWindow& main) { ShowWindow(new ColNew(main.session(), Hub(main), &main)); }
+void OpenColours(MainWindow& main) {
+    ShowWindow(new ColNew(main.session(), Hub(main), &main));
+}
 
-void OpenMultiOsc(MainWindow& main) { ShowWindow(new MultiOsc(main.session(), Hub(main), &main)); }
+void OpenMultiOsc(MainWindow& main) {
+    ShowWindow(new MultiOsc(main.session(), Hub(main), &main));
+}
 
 void OpenFolderLocations(MainWindow& main) {
     if (main.session().download.DataService == 3) {
@@ -58,6 +65,14 @@ void OpenFolderLocations(MainWindow& main) {
         return;
     }
     ShowWindow(w);
+}
+
+void AskPrinterColours(MainWindow& main) {
+    auto& session = main.session();
+    session.printer = app::AskPrinterColours(session.dialogs());
+    const std::string file = session.folders.SystemFolder + "koriprn.dat";
+    if (auto s = app::WritePrinterFile(file, session.printer); !s)
+        session.dialogs().MsgBox(s.message(), "Printer");
 }
 
 bool PickDataFolderWindow(MainWindow& main) {

@@ -13,8 +13,8 @@ namespace kori::gui {
 
 class MainWindow;
 
-// Adds the actions of "Chart De&faults List", "&Folder Locations" and "&Fonts", and makes the
-// hub the settings windows report to.
+// Adds the actions of "Chart De&faults List", "&Folder Locations", "&Fonts" and
+// "&Printer Colour", and makes the hub the settings windows report to.
 void RegisterSettingsWindows(MainWindow& main);
 // The hub under the main window (made by RegisterSettingsWindows).
 SettingsHub& Hub(MainWindow& main);
@@ -28,6 +28,9 @@ void OpenMultiOsc(MainWindow& main);
 // The folder windows of "&Folder Locations": DataPaths in its setting mode for DataService 3,
 // else CPath.
 void OpenFolderLocations(MainWindow& main);
+
+// "&Printer Colour": the printer questions of start-up again; koriprn.dat is rewritten.
+void AskPrinterColours(MainWindow& main);
 
 // Chart selection's "Change Folder": DataPaths in its picking mode, run to its end; true when
 // the data folder changed.
