@@ -555,6 +555,15 @@ TEST_F(SampleRoot, MenuItemsOpenTheSettingsWindows) {
               "Kori Charting 8   -   Current Data Folder " + other);
 }
 
+TEST(Logo, StandsCentredAcrossAndAboveTheMiddleOfTheScreen) {
+    gui::Logo logo;
+    const QRect screen = QGuiApplication::primaryScreen()->geometry();
+    EXPECT_EQ(logo.x() - screen.x(), (screen.width() - logo.width()) / 2);
+    // (0.97 x screen height) / 2 - height / 2, to the nearest unit.
+    EXPECT_NEAR(logo.y() - screen.y(), 0.97 * screen.height() / 2 - logo.height() / 2.0, 0.5);
+    EXPECT_LT(logo.y() + logo.height() / 2, screen.y() + screen.height() / 2);
+}
+
 // Pictures of the windows for a person to look at: written when KORI_SCREENSHOTS names a folder.
 TEST_F(SampleRoot, Screenshots) {
     const char* dir = std::getenv("KORI_SCREENSHOTS");
