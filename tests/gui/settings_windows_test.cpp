@@ -513,6 +513,22 @@ TEST_F(SampleRoot, WindowPositionsAreKeptInTheSettingsStore) {
     again.show();
     EXPECT_EQ(again.geometry(), QRect(120, 90, 700, 400));
     again.close();
+
+    // A place far off every screen is not used.
+    settings.Save("MultiOsc", "900000,900000,7500,6000");
+    gui::MultiOsc lost(session, hub);
+    lost.show();
+    EXPECT_LT(lost.x(), 5000);
+    lost.close();
+}
+
+TEST_F(SampleRoot, AverageTrueRangeSettingsBelongToTheChartDefaults) {
+    gui::OscFrm w(session, hub, "ATR", 'B', "A");
+    EXPECT_EQ(w.fieldCount(), 0);
+    (void)session.ini().Write("OscDef", "AtrD", "20");
+    gui::OscFrm set(session, hub, "ATR", 'B', "A");
+    EXPECT_TRUE(set.Ok());
+    EXPECT_EQ(Ini("OscDef", "AtrD"), "20");
 }
 
 TEST_F(SampleRoot, MenuItemsOpenTheSettingsWindows) {

@@ -3,6 +3,7 @@
 #include "app/window_position.h"
 
 #include <QEvent>
+#include <QScreen>
 #include <QWidget>
 
 namespace kori::gui {
@@ -27,8 +28,12 @@ protected:
                 const QSize size = p->width > 0 && p->height > 0 ? QSize(p->width / kTwipsPerPixel,
                                                                          p->height / kTwipsPerPixel)
                                                                  : m_window->size();
-                m_window->setGeometry(p->left / kTwipsPerPixel, p->top / kTwipsPerPixel,
-                                      size.width(), size.height());
+                const QRect stored(p->left / kTwipsPerPixel, p->top / kTwipsPerPixel, size.width(),
+                                   size.height());
+                // A place on a screen that is no longer there keeps the design position.
+                const QScreen* screen = m_window->screen();
+                if (!screen || screen->availableVirtualGeometry().intersects(stored))
+                    m_window->setGeometry(stored);
             }
         } else if (e->type() == QEvent::Close || e->type() == QEvent::Hide) {
             if (m_placed) Save();

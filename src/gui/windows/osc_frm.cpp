@@ -28,7 +28,10 @@ void OscFrm::BuildOscillatorForm() {
     // Periods not set yet show their defaults; they are written only on OK.
     osc::FillOscDefaults(m_def, m_oscName, m_weekly);
     auto* form = new QFormLayout;
-    for (std::string_view key : osc::OscSettingKeys(m_oscName)) {
+    // The ATR period belongs to the chart defaults, not to this dialog.
+    const bool ownFields = m_oscName != "ATR";
+    for (std::string_view key :
+         ownFields ? osc::OscSettingKeys(m_oscName) : std::span<const std::string_view>{}) {
         const auto* k = osc::FindOscPeriodKey(key);
         if (k == nullptr) continue;
         auto* edit = new QLineEdit(this);
@@ -49,6 +52,11 @@ void OscFrm::BuildOscillatorForm() {
                 dialogs().MsgBox("Compare file code must be entered", m_oscName);
         });
     }
+    if (m_fields.empty() && !m_compare)
+        form->addRow(new QLabel(ownFields ? QStringLiteral("This oscillator has no settings.")
+                                          : QStringLiteral("The Average True Range period is set "
+                                                           "in the Chart Defaults."),
+                                this));
     auto* heading = new QLabel(m_weekly ? QStringLiteral("Weekly and monthly charts")
                                         : QStringLiteral("Daily charts"),
                                this);
@@ -113,7 +121,8 @@ bool OscFrm::Ok() {
     std::size_t i = 0;
     for (std::string_view key : osc::OscSettingKeys(m_oscName)) {
         const auto* k = osc::FindOscPeriodKey(key);
-        if (k == nullptr || i >= m_fields.size()) continue;
+        if (k == nullptr) continue;
+        if (i >= m_fields.size()) break;
         // Text that is no whole number fails the range test as 0 does, or, for a field with
         // no test, is held as 0 ("none").
         const auto v = app::WholeNumber(S(m_fields[i++]->text()));
