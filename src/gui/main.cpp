@@ -6,6 +6,7 @@
 #include "gui/windows/register_windows.h"
 #include "gui/services/qt_dialogs.h"
 #include "gui/services/qt_progress.h"
+#include "gui/windows/logo.h"
 #include "gui/windows/main_window.h"
 #include "platform/clock.h"
 #include "platform/files.h"
@@ -13,33 +14,9 @@
 
 #include <QApplication>
 #include <QCommandLineParser>
-#include <QPainter>
-#include <QPixmap>
-#include <QScreen>
-#include <QSplashScreen>
 #include <QTimer>
 
 #include <memory>
-
-namespace {
-
-// The logo window shown while the program initialises.
-QPixmap LogoPixmap() {
-    QPixmap pm(420, 220);
-    pm.fill(QColor(16, 32, 64));
-    QPainter p(&pm);
-    p.setPen(QColor(255, 214, 0));
-    QFont f(QStringLiteral("Liberation Sans"), 30, QFont::Bold);
-    p.setFont(f);
-    p.drawText(pm.rect().adjusted(0, 0, 0, -60), Qt::AlignCenter, QStringLiteral("KORI Charting 8"));
-    p.setPen(Qt::white);
-    p.setFont(QFont(QStringLiteral("Liberation Sans"), 11));
-    p.drawText(pm.rect().adjusted(0, 90, 0, 0), Qt::AlignCenter,
-               QStringLiteral("End-of-day share-market charting"));
-    return pm;
-}
-
-} // namespace
 
 int main(int argc, char** argv) {
     QApplication qapp(argc, argv);
@@ -70,8 +47,9 @@ int main(int argc, char** argv) {
     std::unique_ptr<kori::app::InstanceLock> instance;
     if (!kori::app::CheckSingleInstance(root, dialogs, instance)) return 0;
 
-    QSplashScreen logo(LogoPixmap());
+    kori::gui::Logo logo;
     logo.show();
+    QApplication::processEvents();
     QApplication::setOverrideCursor(Qt::WaitCursor);
     const QStringList words = parser.positionalArguments();
     kori::app::InitialiseSession(session, words.isEmpty() ? std::string() : words.first().toStdString());
@@ -85,7 +63,7 @@ int main(int argc, char** argv) {
     // The main window comes up from an event, after the logo window has painted.
     QTimer::singleShot(300, &main, [&] {
         main.show();
-        logo.finish(&main);
+        logo.close();
         // Files waiting in the download folder are offered once the main window stands; the
         // update itself is not part of this build, so the answer opens nothing yet.
         (void)kori::app::OfferPendingUpdate(session);

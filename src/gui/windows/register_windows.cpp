@@ -1,11 +1,13 @@
 #include "gui/windows/register_windows.h"
 
 #include "gui/windows/main_window.h"
+#include "gui/windows/settings_windows.h"
 
 namespace kori::gui {
 
 void RegisterWindows(MainWindow& main) {
     // Each family of windows adds its actions here; the menus then show what is built.
+    RegisterSettingsWindows(main);
     main.RebuildMenus();
 }
 

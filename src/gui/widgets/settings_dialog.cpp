@@ -1,0 +1,24 @@
+#include "gui/widgets/settings_dialog.h"
+
+#include "gui/widgets/window_place.h"
+
+#include <QPushButton>
+
+namespace kori::gui {
+
+SettingsDialog::SettingsDialog(app::Session& session, SettingsHub& hub, const char* name,
+                               const QString& title, QWidget* parent)
+    : QDialog(parent), m_session(session), m_hub(hub) {
+    setObjectName(QString::fromLatin1(name));
+    setWindowTitle(title);
+    KeepWindowPosition(this, session.services().settings, name);
+}
+
+QPushButton* SettingsDialog::Button(const QString& caption, const char* name) {
+    auto* b = new QPushButton(caption, this);
+    b->setObjectName(QString::fromLatin1(name));
+    b->setAutoDefault(false);
+    return b;
+}
+
+} // namespace kori::gui
