@@ -149,3 +149,22 @@ std::vector<std::string> RiseFallReadout(const chart::Chart& chart, double xDown
 }
 
 } // namespace kori::app
+
+#include "store/price_file.h"
+
+namespace kori::app {
+
+int PriceRecordCount(const Session& session, std::string_view code) {
+    store::PriceFile pf(store::PriceFile::PathFor(session.folders.DataFolder, platform::Trim(code)));
+    if (!pf.Open()) return 0;
+    return pf.Count();
+}
+
+std::string PriceRecordDate(const Session& session, std::string_view code, int recordNumber) {
+    store::PriceFile pf(store::PriceFile::PathFor(session.folders.DataFolder, platform::Trim(code)));
+    store::PriceRecord r;
+    if (!pf.Open() || !pf.Read(recordNumber, r)) return {};
+    return r.Date;
+}
+
+} // namespace kori::app

@@ -65,3 +65,10 @@ int BarUnder(const chart::Chart& chart, double x);
 std::string ReadoutPrice(double price);
 
 } // namespace kori::app
+
+namespace kori::app {
+// The price file of a code: how many records it holds, and the date of one (1-based); the
+// scroll bar of the chart window walks these.
+int PriceRecordCount(const Session& session, std::string_view code);
+std::string PriceRecordDate(const Session& session, std::string_view code, int recordNumber);
+} // namespace kori::app

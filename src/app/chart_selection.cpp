@@ -398,3 +398,19 @@ void ChartSelection::FolderChanged() {
 }
 
 } // namespace kori::app
+
+namespace kori::app {
+
+int FindNextMatch(const std::vector<store::NameRecord>& names, int afterPosition, std::string_view text) {
+    const std::string wanted = platform::Upper(platform::Trim(text));
+    if (wanted.empty()) return 0;
+    for (int pos = std::max(afterPosition, 0) + 1; pos <= static_cast<int>(names.size()); ++pos) {
+        const auto& r = names[static_cast<std::size_t>(pos - 1)];
+        if (platform::Upper(r.Code).find(wanted) != std::string::npos ||
+            platform::Upper(r.Name).find(wanted) != std::string::npos)
+            return pos;
+    }
+    return 0;
+}
+
+} // namespace kori::app

@@ -130,3 +130,9 @@ private:
 };
 
 } // namespace kori::app
+
+namespace kori::app {
+// The Search window's walk: the first position after `afterPosition` whose code or name holds
+// `text` (any case); 0 when the walk ends with no match.
+int FindNextMatch(const std::vector<store::NameRecord>& names, int afterPosition, std::string_view text);
+} // namespace kori::app

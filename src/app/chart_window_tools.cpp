@@ -85,14 +85,18 @@ int ReplayChartLines(const Session& session, platform::Surface& surface) {
     return played;
 }
 
-std::vector<chart::TrendEnds> DrawChartLines(const Session& session, chart::Chart& chart,
-                                             const chart::ChartRequest& request,
-                                             std::string_view code, platform::Surface& surface) {
+std::vector<chart::TrendEnds> TrendEndsOf(const Session& session, const chart::Chart& chart,
+                                          const chart::ChartRequest& request, std::string_view code) {
     if (request.ChartSlot != 0 || request.SplitMode || chart.Style == 'P') return {};
     const auto path = TrendlinePath(session, code);
     if (!platform::FileHasData(path)) return {};
-    const auto frame = ToolFrameOf(chart, request);
-    auto ends = chart::ReplayTrendlines(frame, chart::TrendlineFile::ReadAll(path));
+    return chart::ReplayTrendlines(ToolFrameOf(chart, request), chart::TrendlineFile::ReadAll(path));
+}
+
+std::vector<chart::TrendEnds> DrawChartLines(const Session& session, chart::Chart& chart,
+                                             const chart::ChartRequest& request,
+                                             std::string_view code, platform::Surface& surface) {
+    auto ends = TrendEndsOf(session, chart, request, code);
     const platform::Colour colour = Entry(session, kTrendlineEntry);
     for (const auto& e : ends) {
         surface.Line(e.xA, e.yA, e.xB, e.yB, colour);

@@ -1,0 +1,107 @@
+#include "gui/windows/chart_windows.h"
+
+#include "gui/windows/cht_page.h"
+#include "gui/windows/cht_sel.h"
+#include "gui/windows/chts.h"
+#include "gui/windows/main_window.h"
+
+#include <QMdiArea>
+#include <QMdiSubWindow>
+#include <QPageSetupDialog>
+#include <QPrinter>
+
+namespace kori::gui {
+
+ChartWindows::ChartWindows(MainWindow& main) : QObject(&main), m_main(main) {
+    setObjectName(QStringLiteral("ChartWindows"));
+}
+
+ChtSel* ChartWindows::chtSel() const {
+    return m_selWindow ? qobject_cast<ChtSel*>(m_selWindow->widget()) : nullptr;
+}
+
+Chts* ChartWindows::chts() const {
+    return m_chartWindow ? qobject_cast<Chts*>(m_chartWindow->widget()) : nullptr;
+}
+
+void ChartWindows::OpenCharts() {
+    if (Chts* c = chts(); c && m_chartWindow->isVisible()) {
+        m_main.mdiArea()->setActiveSubWindow(m_chartWindow);
+        m_chartWindow->raise();
+        return;
+    }
+    if (!m_selWindow) {
+        auto* sel = new ChtSel(m_main.session(), m_state);
+        m_selWindow = m_main.mdiArea()->addSubWindow(sel);
+        m_selWindow->setAttribute(Qt::WA_DeleteOnClose);
+        sel->SetFolderButton(m_main.session().download.DataService == 3 && m_main.HasAction("DataPaths"));
+        sel->SetDefaultsButton(m_main.HasAction("ChtDef"));
+        connect(sel, &ChtSel::ShowChartRequested, this, &ChartWindows::ShowChart);
+        connect(sel, &ChtSel::CloseRequested, this, &ChartWindows::CloseAll);
+        connect(sel, &ChtSel::ChangeFolderRequested, this, [this] {
+            const std::string before = m_main.session().folders.DataFolder;
+            m_main.Open("DataPaths");
+            if (m_main.session().folders.DataFolder != before)
+                if (ChtSel* s = chtSel()) {
+                    s->selection().FolderChanged();
+                    s->Load();
+                }
+        });
+        connect(sel, &ChtSel::SetDefaultsRequested, this, [this] { m_main.Open("ChtDef"); });
+        // Placed from the main window's size, as the selection has always sat.
+        const QRect area = m_main.mdiArea()->rect();
+        m_selWindow->move(static_cast<int>(0.006 * area.width()), static_cast<int>(0.077 * area.height()));
+        sel->Load();
+    } else if (ChtSel* s = chtSel()) {
+        s->Activate();
+    }
+    m_selWindow->show();
+    m_main.mdiArea()->setActiveSubWindow(m_selWindow);
+}
+
+Chts* ChartWindows::EnsureChts() {
+    if (Chts* c = chts()) return c;
+    auto* c = new Chts(m_main.session(), m_state);
+    m_chartWindow = m_main.mdiArea()->addSubWindow(c);
+    m_chartWindow->setAttribute(Qt::WA_DeleteOnClose);
+    connect(c, &Chts::ChartSelectionRequested, this, &ChartWindows::BackToSelection);
+    return c;
+}
+
+void ChartWindows::ShowChart() {
+    if (m_selWindow) m_selWindow->hide();
+    Chts* c = EnsureChts();
+    const QSize area = m_main.mdiArea()->size();
+    m_chartWindow->resize(std::max(area.width() - 8, 760), std::max(area.height() - 8, 520));
+    m_chartWindow->move(0, 0);
+    m_chartWindow->show();
+    m_main.mdiArea()->setActiveSubWindow(m_chartWindow);
+    // ChtSel left the position one short; the next-chart command steps onto it.
+    c->NextChart(1);
+}
+
+void ChartWindows::BackToSelection() {
+    if (m_chartWindow) m_chartWindow->hide();
+    OpenCharts();
+}
+
+void ChartWindows::CloseAll() {
+    if (m_chartWindow) m_chartWindow->close();
+    if (m_selWindow) m_selWindow->close();
+}
+
+void RegisterChartWindows(MainWindow& main) {
+    auto* charts = new ChartWindows(main);
+    main.SetAction("ChtSel", [charts] { charts->OpenCharts(); });
+    main.SetAction("CHTPage", [&main] {
+        CHTPage page(main.session(), &main);
+        page.exec();
+    });
+    main.SetAction("PrinterDialog", [&main] {
+        QPrinter printer(QPrinter::HighResolution);
+        QPageSetupDialog dialog(&printer, &main);
+        dialog.exec();
+    });
+}
+
+} // namespace kori::gui

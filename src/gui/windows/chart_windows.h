@@ -1,0 +1,47 @@
+#pragma once
+// The road of one chart on the desktop: "&CHARTS" opens ChtSel (or brings Chts forward), "SHOW
+// CHART" hands over to Chts, "new" comes back. Holds the chart request shared by the two.
+#include "app/chart_selection.h"
+
+#include <QObject>
+#include <QPointer>
+
+class QMdiSubWindow;
+
+namespace kori::gui {
+
+class MainWindow;
+class ChtSel;
+class Chts;
+
+class ChartWindows : public QObject {
+    Q_OBJECT
+public:
+    explicit ChartWindows(MainWindow& main);
+
+    // "&CHARTS".
+    void OpenCharts();
+    // "SHOW CHART" of ChtSel: the chart window comes up on the next chart of the list.
+    void ShowChart();
+    // "new" of Chts: back to the selection.
+    void BackToSelection();
+    // "Close" of ChtSel: both windows go.
+    void CloseAll();
+
+    ChtSel* chtSel() const;
+    Chts* chts() const;
+    app::ChartState& state() { return m_state; }
+
+private:
+    Chts* EnsureChts();
+
+    MainWindow& m_main;
+    app::ChartState m_state;
+    QPointer<QMdiSubWindow> m_selWindow;
+    QPointer<QMdiSubWindow> m_chartWindow;
+};
+
+// Registers "&CHARTS", "&Page Setup (Text)" and "Printer &Setup" with the main window.
+void RegisterChartWindows(MainWindow& main);
+
+} // namespace kori::gui
