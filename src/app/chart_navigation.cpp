@@ -89,9 +89,7 @@ std::optional<store::NameRecord> StepChart(ChartWalk& walk, chart::ChartRequest&
     if (pos > count) pos = 1;
     if (pos < 1) pos = count;
     request.ListPosition = static_cast<std::int16_t>(pos);
-    auto r = walk.RecordAt(pos);
-    if (r && IsCloseOnly(r->RecordType)) request.ChartStyle = 'L';
-    return r;
+    return walk.RecordAt(pos);
 }
 
 int BarUnder(const chart::Chart& chart, double x) {

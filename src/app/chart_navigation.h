@@ -48,8 +48,8 @@ private:
 inline bool IsCloseOnly(int recordType) { return recordType >= 1 && recordType <= 3; }
 
 // The next-chart command: steps `ListPosition` by `delta` (+1 "fwd", -1 "rev", 0 "ref") with a
-// wrap at both ends, reads the record, and forces the line style for close-only types. nullopt
-// when the list is empty.
+// wrap at both ends and reads the record; nullopt when the list is empty. Close-only types are
+// drawn as lines by the build itself, so the style asked for stands for the next security.
 std::optional<store::NameRecord> StepChart(ChartWalk& walk, chart::ChartRequest& request, int delta);
 
 // Status-bar panes for the bar under x: "Open  ", "High  ", "Low  ", "Close  ", "Vol  " with

@@ -158,11 +158,9 @@ void ChartSelection::Activate() {
 
 void ChartSelection::ApplyStyleRule(const store::NameRecord& rec) {
     auto& r = m_state.Request;
+    // The chooser shows the line for close-only types; the request takes it at "SHOW CHART".
     if (IsCloseOnly(rec.RecordType)) {
-        if (r.ChartStyle != 'P') {
-            m_form.StyleIndex = 2;
-            r.ChartStyle = 'L';
-        }
+        if (r.ChartStyle != 'P' || !m_state.SettingsLoaded) m_form.StyleIndex = 2;
     } else {
         m_form.StyleIndex = StyleIndexOf(r.ChartStyle);
     }

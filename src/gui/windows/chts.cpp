@@ -247,7 +247,6 @@ bool Chts::Rebuild() {
     m_showingSaved = false;
     m_moving = -1;
     auto& req = m_state.Request;
-    if (app::IsCloseOnly(m_name.RecordType)) req.ChartStyle = 'L';
     const bool longer = req.ChartPeriod != 'A';
     req.AvOnePeriod = longer ? m_state.Defaults.MAPeriod1Long : m_state.Defaults.MAPeriod1Daily;
     req.AvTwoPeriod = longer ? m_state.Defaults.MAPeriod2Long : m_state.Defaults.MAPeriod2Daily;
@@ -257,6 +256,7 @@ bool Chts::Rebuild() {
     app::ChartJob job;
     job.Name = m_name;
     job.Request = req;
+    if (app::IsCloseOnly(m_name.RecordType)) job.Request.ChartStyle = 'L';
     job.Defaults = m_state.Defaults;
     job.Page = &m_page;
     const std::string code = Code();
