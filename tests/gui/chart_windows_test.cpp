@@ -42,7 +42,7 @@ struct Road : ::testing::Test {
     gui::ChtSel* sel() { return charts()->chtSel(); }
     gui::Chts* chts() { return charts()->chts(); }
     void Key(const char* key) {
-        QAction* a = chts()->toolBar()->findChild<QAction*>(QString::fromLatin1(key));
+        QAction* a = chts()->ToolKey(key);
         ASSERT_NE(a, nullptr) << key;
         a->trigger();
         QApplication::processEvents();

@@ -146,6 +146,7 @@ ChtSel::ChtSel(app::Session& session, app::ChartState& state, QWidget* parent)
     outer->addLayout(buttons);
     m_folder->hide();
     m_defaults->hide();
+    setMinimumWidth(660);
 
     connect(m_code, &QLineEdit::returnPressed, this, &ChtSel::CodeEntered);
     connect(m_name, &QLineEdit::returnPressed, this, &ChtSel::NameEntered);

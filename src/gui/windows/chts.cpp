@@ -53,7 +53,7 @@ std::string ShortDate(const std::string& yyyymmdd) {
 
 Chts::Chts(app::Session& session, app::ChartState& state, QWidget* parent)
     : QWidget(parent), m_session(session), m_state(state), m_walk(session),
-      m_chart(std::make_unique<chart::Chart>()), m_toolbar(new QToolBar(this)),
+      m_chart(std::make_unique<chart::Chart>()), m_toolbar(new QToolBar(this)), m_toolbar2(new QToolBar(this)),
       m_oscBox(new QComboBox(this)), m_picture1(new ChartView(this)), m_picture2(new ChartView(this)),
       m_picture4(new ChartView(this)), m_koriScroll(new QScrollBar(Qt::Horizontal, this)),
       m_status(new QStatusBar(this)), m_autoTimer(new QTimer(this)) {
@@ -85,6 +85,7 @@ Chts::Chts(app::Session& session, app::ChartState& state, QWidget* parent)
 
     BuildToolBar();
     layout->addWidget(m_toolbar);
+    layout->addWidget(m_toolbar2);
     m_koriScroll->setObjectName(QStringLiteral("KoriScroll"));
     m_koriScroll->hide();
     layout->addWidget(m_koriScroll);
@@ -129,8 +130,11 @@ Chts::~Chts() { LeaveChart(); }
 void Chts::BuildToolBar() {
     m_toolbar->setObjectName(QStringLiteral("Toolbar1"));
     m_toolbar->setToolButtonStyle(Qt::ToolButtonTextOnly);
-    auto add = [this](const char* key, const char* text, const char* tip, auto fn, bool checkable = false) {
-        QAction* a = m_toolbar->addAction(QString::fromLatin1(text));
+    m_toolbar2->setObjectName(QStringLiteral("Toolbar2"));
+    m_toolbar2->setToolButtonStyle(Qt::ToolButtonTextOnly);
+    QToolBar* bar = m_toolbar;
+    auto add = [this, &bar](const char* key, const char* text, const char* tip, auto fn, bool checkable = false) {
+        QAction* a = bar->addAction(QString::fromLatin1(text));
         a->setObjectName(QString::fromLatin1(key));
         a->setToolTip(QString::fromLatin1(tip));
         a->setCheckable(checkable);
@@ -180,7 +184,7 @@ void Chts::BuildToolBar() {
         Rebuild();
     });
     m_toolbar->addWidget(m_oscBox);
-    m_toolbar->addSeparator();
+    bar = m_toolbar2;
     add("tline", "Trend", "Draw trendlines", [this] { SetTool(m_tool == kToolTrendline ? kToolNone : kToolTrendline); }, true);
     add("terase", "Erase", "Delete a trendline", [this] { SetTool(kToolErase); }, true);
     add("fib", "Fib", "Fibonacci retracement", [this] { SetTool(m_tool == kToolFibRetracement ? kToolNone : kToolFibRetracement); }, true);
@@ -188,7 +192,7 @@ void Chts::BuildToolBar() {
     add("sGannAng", "Gann", "Gann angles", [this] { SetTool(m_tool == kToolGann ? kToolNone : kToolGann); }, true);
     add("text", "Text", "Text notes", [this] { SetTool(m_tool == kToolText ? kToolNone : kToolText); }, true);
     add("sZoom", "Zoom", "Zoom", [this] { SetTool(m_tool == kToolZoom ? kToolNone : kToolZoom); }, true);
-    m_toolbar->addSeparator();
+    m_toolbar2->addSeparator();
     add("scroll", "Scroll", "Scroll through the history", [this] { ShowScrollBar(m_koriScroll->isHidden()); });
     add("auto", "Auto", "Automatic scroll through the list", [this] {
         if (m_autoTimer->isActive())
@@ -198,6 +202,12 @@ void Chts::BuildToolBar() {
     });
     add("print", "Print", "Print the chart", [this] { Print(); });
     add("save", "Save", "Save the chart", [this] { SaveChartDialog(); });
+}
+
+QAction* Chts::ToolKey(const char* key) const {
+    for (QToolBar* b : {m_toolbar, m_toolbar2})
+        if (auto* a = b->findChild<QAction*>(QString::fromLatin1(key))) return a;
+    return nullptr;
 }
 
 std::string Chts::Code() const { return platform::Trim(m_name.Code); }
@@ -373,7 +383,7 @@ void Chts::SetTool(int mode) {
                 {"sFibLines", kToolFibTimeLines}, {"sGannAng", kToolGann}, {"text", kToolText},
                 {"sZoom", kToolZoom}};
     for (const auto& k : keys)
-        if (auto* a = m_toolbar->findChild<QAction*>(QString::fromLatin1(k.key))) a->setChecked(m_tool == k.mode);
+        if (QAction* a = ToolKey(k.key)) a->setChecked(m_tool == k.mode);
     if (m_tool == kToolFibRetracement) SetPanes({});
 }
 

@@ -98,6 +98,8 @@ public:
     // The texts of the status panes.
     std::vector<std::string> StatusPanes() const;
     QToolBar* toolBar() const { return m_toolbar; }
+    // The action of a toolbar key ("fwd", "tline", ...), or nullptr.
+    QAction* ToolKey(const char* key) const;
     bool showingSavedChart() const { return m_showingSaved; }
 
 signals:
@@ -143,6 +145,7 @@ private:
     std::string m_savedPath;
 
     QToolBar* m_toolbar;
+    QToolBar* m_toolbar2; // the mouse tools, scroll, print and save
     QComboBox* m_oscBox;
     QAction* m_timeLinesCaption = nullptr;
     ChartView* m_picture1;
