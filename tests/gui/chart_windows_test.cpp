@@ -18,6 +18,7 @@
 #include <QMdiArea>
 #include <QMdiSubWindow>
 #include <QPrinter>
+#include <QScrollBar>
 #include <QTest>
 #include <QToolBar>
 #include <gtest/gtest.h>
@@ -239,4 +240,74 @@ TEST_F(Road, ZoomOnlyOnBarsAndCandlesticks) {
     Key("bar");
     Key("sZoom");
     EXPECT_EQ(chts()->toolMode(), gui::kToolZoom);
+}
+
+TEST_F(Road, TheOscillatorPanelIsASeamThatShowsOnlyWithAnOscillatorChosen) {
+    TypeCode("krm");
+    int painted = 0;
+    chts()->SetOscillatorPainter([&](chart::Chart& c, const chart::ChartRequest& r, platform::Surface& panel) {
+        ++painted;
+        EXPECT_GT(c.LastBar(), 0);
+        EXPECT_EQ(r.AutoOscCode, "RSI");
+        panel.FilledBox(0, 0, 50, 50, 0xFF);
+    });
+    Key("ref");
+    EXPECT_EQ(painted, 0);
+    EXPECT_FALSE(chts()->picture2()->isVisible());
+    charts()->state().Request.AutoOsc = true;
+    charts()->state().Request.AutoOscCode = "RSI";
+    Key("ref");
+    EXPECT_EQ(painted, 1);
+    EXPECT_TRUE(chts()->picture2()->isVisible());
+    EXPECT_FALSE(chts()->picture2()->picture().isNull());
+}
+
+TEST_F(Road, ScrollAndStepsMoveTheEndOfTheChart) {
+    TypeCode("krm");
+    // Every rebuild makes a new chart: read it afresh each time.
+    auto lastBarDate = [this] {
+        const auto& c = chts()->chart();
+        return std::string(c.ChartBars()[static_cast<std::size_t>(c.LastBar())].DateText());
+    };
+    const int lastRecord = chts()->chart().LastRecord;
+    const std::string lastDate = lastBarDate();
+    Key("m1M");
+    const std::string stepped = lastBarDate();
+    EXPECT_LT(stepped, chart::AddCalendarPeriods(lastDate, 'M', -1) + "1");
+    EXPECT_GT(stepped, chart::AddCalendarPeriods(lastDate, 'M', -2));
+    Key("p1M"); // forward past the last record is the latest chart again
+    EXPECT_EQ(chts()->chart().LastRecord, lastRecord);
+    EXPECT_FALSE(charts()->state().Request.ByFinishDate);
+
+    Key("scroll");
+    auto* scroll = chts()->findChild<QScrollBar*>(QStringLiteral("KoriScroll"));
+    ASSERT_NE(scroll, nullptr);
+    EXPECT_TRUE(scroll->isVisible());
+    EXPECT_EQ(scroll->maximum(), lastRecord);
+    scroll->setValue(lastRecord - 250);
+    EXPECT_EQ(chts()->chart().LastRecord, lastRecord - 250);
+    EXPECT_EQ(chts()->StatusPanes()[0].find('/') != std::string::npos, true);
+}
+
+TEST_F(Road, TextNotesAndAutomaticScroll) {
+    TypeCode("krm");
+    Key("text");
+    const auto& c = chts()->chart();
+    const std::string date(c.ChartBars()[40].DateText());
+    s.dialogs.QueueInput(std::string("breakout"));
+    chts()->MousePress(c.PlotLeft + 40 * c.BarSpacing, c.PriceToY(c.ChartBars()[40].Close), Qt::LeftButton);
+    const auto notes = platform::ReadWholeFile(app::NotesPath(s.session, "KRM")).value_or("");
+    EXPECT_EQ(notes.rfind("T,8.25," + date + ",", 0), 0u) << notes;
+    EXPECT_NE(notes.find(",breakout,"), std::string::npos);
+
+    s.dialogs.QueueInput(std::string("0.05"));
+    Key("auto");
+    EXPECT_EQ(s.dialogs.shown().back().text, "Set interval between charts (0 - 60 seconds)");
+    EXPECT_EQ(s.dialogs.shown().back().title, "Display Interval");
+    QTest::qWait(400);
+    EXPECT_NE(Code(), "KRM"); // the list moved on by itself
+    Key("auto");
+    const std::string stopped = Code();
+    QTest::qWait(200);
+    EXPECT_EQ(Code(), stopped);
 }
