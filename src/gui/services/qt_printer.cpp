@@ -6,6 +6,9 @@
 namespace kori::gui {
 
 QtPrinter::QtPrinter(QPrinter& printer) : m_printer(printer) {
+    // The print scale is worked out from twips per printer dot; at 600 dots an inch a chart
+    // fills the page as it does on the PDF printer, whatever resolution the dialog chose.
+    m_printer.setResolution(600);
     m_orientation = printer.pageLayout().orientation() == QPageLayout::Landscape ? platform::kLandscape
                                                                                  : platform::kPortrait;
 }

@@ -23,6 +23,7 @@
 #include <QLabel>
 #include <QMenu>
 #include <QMenuBar>
+#include <QPageLayout>
 #include <QPainter>
 #include <QPrintDialog>
 #include <QPrinter>
@@ -594,6 +595,9 @@ bool Chts::PrintTo(QPrinter& printer) {
 void Chts::Print() {
     QPrinter printer(QPrinter::HighResolution);
     printer.setDocName(Q("KORI chart " + Code()));
+    // A chart is wider than tall: landscape is offered first unless the page set-up says.
+    const int orient = m_session.page.Orient;
+    printer.setPageOrientation(orient == 1 ? QPageLayout::Portrait : QPageLayout::Landscape);
     QPrintDialog dialog(&printer, this);
     dialog.setWindowTitle(QStringLiteral("Print Chart"));
     if (dialog.exec() != QDialog::Accepted) return;
