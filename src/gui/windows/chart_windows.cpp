@@ -5,6 +5,7 @@
 #include "gui/windows/chts.h"
 #include "gui/windows/main_window.h"
 
+#include <QApplication>
 #include <QMdiArea>
 #include <QMdiSubWindow>
 #include <QPageSetupDialog>
@@ -71,13 +72,21 @@ Chts* ChartWindows::EnsureChts() {
 void ChartWindows::ShowChart() {
     if (m_selWindow) m_selWindow->hide();
     Chts* c = EnsureChts();
-    const QSize area = m_main.mdiArea()->size();
-    m_chartWindow->resize(std::max(area.width() - 8, 760), std::max(area.height() - 8, 520));
-    m_chartWindow->move(0, 0);
-    m_chartWindow->show();
+    // The chart takes the whole frame; its area is laid out before the chart is sized to it.
+    m_chartWindow->showMaximized();
     m_main.mdiArea()->setActiveSubWindow(m_chartWindow);
+    QApplication::sendPostedEvents();
+    QApplication::processEvents();
     // ChtSel left the position one short; the next-chart command steps onto it.
     c->NextChart(1);
+}
+
+bool ChartWindows::ShowCode(const std::string& code) {
+    OpenCharts();
+    ChtSel* s = chtSel();
+    if (!s || !s->selection().TypeCode(code)) return false;
+    s->ShowChart();
+    return chts() != nullptr;
 }
 
 void ChartWindows::BackToSelection() {

@@ -25,6 +25,8 @@ public:
     void ShowChart();
     // "new" of Chts: back to the selection.
     void BackToSelection();
+    // "&CHARTS", then the code typed into the selection: its chart when found.
+    bool ShowCode(const std::string& code);
     // "Close" of ChtSel: both windows go.
     void CloseAll();
 

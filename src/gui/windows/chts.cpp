@@ -57,7 +57,7 @@ Chts::Chts(app::Session& session, app::ChartState& state, QWidget* parent)
       m_chart(std::make_unique<chart::Chart>()), m_toolbar(new QToolBar(this)), m_toolbar2(new QToolBar(this)),
       m_oscBox(new QComboBox(this)), m_picture1(new ChartView(this)), m_picture2(new ChartView(this)),
       m_picture4(new ChartView(this)), m_koriScroll(new QScrollBar(Qt::Horizontal, this)),
-      m_status(new QStatusBar(this)), m_autoTimer(new QTimer(this)) {
+      m_status(new QStatusBar(this)), m_autoTimer(new QTimer(this)), m_resizeTimer(new QTimer(this)) {
     setObjectName(QStringLiteral("Chts"));
     setWindowTitle(QStringLiteral("Chart"));
     auto* layout = new QVBoxLayout(this);
@@ -124,6 +124,12 @@ Chts::Chts(app::Session& session, app::ChartState& state, QWidget* parent)
         SetPanes({ShortDate(date)});
     });
     connect(m_autoTimer, &QTimer::timeout, this, [this] { NextChart(1); });
+    m_resizeTimer->setSingleShot(true);
+    m_resizeTimer->setInterval(200);
+    connect(m_picture1, &ChartView::Resized, m_resizeTimer, qOverload<>(&QTimer::start));
+    connect(m_resizeTimer, &QTimer::timeout, this, [this] {
+        if (m_haveName && !m_showingSaved && m_picture1->picture().size() != AreaSize()) Rebuild();
+    });
 }
 
 Chts::~Chts() { LeaveChart(); }

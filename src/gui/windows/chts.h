@@ -155,6 +155,7 @@ private:
     QStatusBar* m_status;
     std::vector<QLabel*> m_panes;
     QTimer* m_autoTimer;
+    QTimer* m_resizeTimer; // a resized area gets a chart of its new size
 };
 
 } // namespace kori::gui
