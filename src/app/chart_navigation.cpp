@@ -3,6 +3,7 @@
 #include "chart/number_format.h"
 #include "platform/files.h"
 #include "platform/text.h"
+#include "store/classifications.h"
 #include "store/name_file.h"
 
 #include <algorithm>
@@ -88,6 +89,41 @@ std::optional<store::NameRecord> StepChart(ChartWalk& walk, chart::ChartRequest&
     int pos = request.ListPosition + delta;
     if (pos > count) pos = 1;
     if (pos < 1) pos = count;
+    request.ListPosition = static_cast<std::int16_t>(pos);
+    return walk.RecordAt(pos);
+}
+
+std::optional<store::NameRecord> StepClassChart(ChartWalk& walk, chart::ChartRequest& request, int delta,
+                                                std::string_view classCode, bool gics,
+                                                platform::Dialogs& dialogs) {
+    std::vector<int> matches;
+    for (int p = 0; (p = store::FindNextClassRecord(walk.names(), p, classCode, gics)) != 0;)
+        matches.push_back(p);
+    if (matches.empty()) {
+        if (gics)
+            dialogs.MsgBox("No records on file for that GICS classification", "GICS Classification");
+        else
+            dialogs.MsgBox("No records on file for that Industry classification or group",
+                           "Industry Classification");
+        return std::nullopt;
+    }
+    const int at = request.ListPosition;
+    int pos = 0;
+    if (delta >= 0) {
+        for (int m : matches)
+            if (delta == 0 ? m >= at : m > at) {
+                pos = m;
+                break;
+            }
+        if (pos == 0) pos = matches.front();
+    } else {
+        for (auto it = matches.rbegin(); it != matches.rend(); ++it)
+            if (*it < at) {
+                pos = *it;
+                break;
+            }
+        if (pos == 0) pos = matches.back();
+    }
     request.ListPosition = static_cast<std::int16_t>(pos);
     return walk.RecordAt(pos);
 }

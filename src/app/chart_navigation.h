@@ -4,6 +4,7 @@
 #include "app/session.h"
 #include "chart/chart.h"
 #include "chart/chart_request.h"
+#include "platform/dialogs.h"
 #include "store/chart_list.h"
 #include "store/name_record.h"
 
@@ -51,6 +52,13 @@ inline bool IsCloseOnly(int recordType) { return recordType >= 1 && recordType <
 // wrap at both ends and reads the record; nullopt when the list is empty. Close-only types are
 // drawn as lines by the build itself, so the style asked for stands for the next security.
 std::optional<store::NameRecord> StepChart(ChartWalk& walk, chart::ChartRequest& request, int delta);
+
+// `FindNextChtIC` / `FindNextChtGICS`: the next (delta 1) or previous (delta -1) record of a
+// class in the full list, wrapping round; with none on file, the message of the walk and
+// nullopt.
+std::optional<store::NameRecord> StepClassChart(ChartWalk& walk, chart::ChartRequest& request, int delta,
+                                                std::string_view classCode, bool gics,
+                                                platform::Dialogs& dialogs);
 
 // Status-bar panes for the bar under x: "Open  ", "High  ", "Low  ", "Close  ", "Vol  " with
 // their values, or "Close  " and "Vol  " for a close-only security. Empty off the bars.

@@ -1,6 +1,7 @@
 #include "app/chart_selection.h"
 
 #include "platform/date_text.h"
+#include "store/classifications.h"
 #include "platform/files.h"
 #include "platform/text.h"
 #include "store/name_record.h"
@@ -150,6 +151,10 @@ void ChartSelection::Activate() {
     if (!m_state.ListChanged) return;
     m_state.ListChanged = false;
     m_walk.Open(m_state.Request);
+    if (m_state.Request.ListMode != 1) {
+        SetClassWalk(false, false);
+        SetClassWalk(true, false);
+    }
     m_form.ListCaption = m_walk.Caption();
     m_form.Count = m_walk.Count();
     m_state.Request.ListPosition = 1;
@@ -226,8 +231,74 @@ void ChartSelection::ScrollTo(int value) {
         v = 1;
         m_session.dialogs().Beep();
     }
+    if ((m_state.ClassWalk || m_state.GicsWalk) && m_state.Request.ListMode == 1) {
+        m_state.Request.ListPosition = static_cast<std::int16_t>(v - 1);
+        FindNextClass();
+        return;
+    }
     m_state.Request.ListPosition = static_cast<std::int16_t>(v);
     ShowRecord(v);
+}
+
+void ChartSelection::SetClassWalk(bool gics, bool on) {
+    if (gics) {
+        m_state.GicsWalk = on;
+        m_state.GicsCode.clear();
+        if (on) m_state.ClassWalk = false;
+    } else {
+        m_state.ClassWalk = on;
+        m_state.ClassCode.clear();
+        if (on) m_state.GicsWalk = false;
+    }
+}
+
+bool ChartSelection::SetClassCode(bool gics, std::string_view code) {
+    const std::string c = platform::Trim(code);
+    const std::string sys = m_session.folders.SystemFolder;
+    // A code of the table, or a group ("..0") that some code of the table falls in.
+    bool known = false;
+    if (!c.empty())
+        for (const auto& row : store::ReadClassFile(sys, gics ? "Gics.dat" : "IndClass.dat", gics ? 3 : 2)) {
+            const std::string id = row.empty() ? std::string() : platform::Trim(row[0]);
+            if (id == c || (c.back() == '0' && id.size() == c.size() && id.substr(0, 2) == c.substr(0, 2)))
+                known = true;
+        }
+    if (!known) {
+        if (gics)
+            m_session.dialogs().MsgBox("GICS Classification invalid", "Chart Select");
+        else
+            m_session.dialogs().MsgBox("Industry Classification invalid", "Analysis");
+        SetClassWalk(gics, false);
+        return false;
+    }
+    SetClassWalk(gics, true);
+    (gics ? m_state.GicsCode : m_state.ClassCode) = c;
+    m_state.Request.ListPosition = 0;
+    return FindNextClass();
+}
+
+bool ChartSelection::FindNextClass() {
+    const bool gics = m_state.GicsWalk;
+    const std::string& code = gics ? m_state.GicsCode : m_state.ClassCode;
+    const int pos = store::FindNextClassRecord(m_walk.names(), m_state.Request.ListPosition, code, gics);
+    if (pos == 0) {
+        if (gics)
+            m_session.dialogs().MsgBox("No records on file for that GICS classification", "GICS Classification");
+        else
+            m_session.dialogs().MsgBox("No records on file for that Industry classification or group",
+                                       "Industry Classification");
+        return false;
+    }
+    auto& r = m_state.Request;
+    r.ListPosition = static_cast<std::int16_t>(pos);
+    const auto rec = m_walk.RecordAt(pos);
+    if (rec) r.ChartStyle = IsCloseOnly(rec->RecordType) ? 'L' : 'B';
+    ShowRecord(pos);
+    r.ChartPeriod = 'A';
+    m_form.PeriodIndex = 0;
+    ShowAverages();
+    ForceSpacing();
+    return true;
 }
 
 void ChartSelection::StepSpacing(int delta) {

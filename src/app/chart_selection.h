@@ -20,6 +20,11 @@ struct ChartState {
     chart::ChartDefaults Defaults;
     bool SettingsLoaded = false; // ChtSel has read the [Charts] keys once
     bool ListChanged = false;    // the list chooser ran: reopen the list on activation
+    // Walking one industry class (or group) or one GICS class of the full list.
+    bool ClassWalk = false;
+    std::string ClassCode;
+    bool GicsWalk = false;
+    std::string GicsCode;
 };
 
 struct OscChoice {
@@ -99,6 +104,16 @@ public:
     // FinDate's answer: nullopt cancels (back to "LATEST"); a bad date shows the date message
     // and returns false.
     bool SetFinishDate(std::optional<std::string> typed);
+
+    // The "Industry Class" (gics false) or "GICS" box: ticking clears the code and rules out
+    // the other walk; unticking ends the walk.
+    void SetClassWalk(bool gics, bool on);
+    // A class code for the walk, as picked: an unknown or empty one shows "Industry
+    // Classification invalid" ("GICS Classification invalid") and ends the walk. A good one
+    // starts the walk from position 1. True when a record of the class is shown.
+    bool SetClassCode(bool gics, std::string_view code);
+    // `FindNextICRec` / `FindNextGICSRec`: the next record of the class after `ListPosition`.
+    bool FindNextClass();
 
     // "SHOW CHART": stores the choices in the request, writes the settings, and lowers the
     // position by one for the chart window's next-chart command.

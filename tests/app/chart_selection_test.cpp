@@ -237,3 +237,58 @@ TEST(SearchByName, FindsCodeOrNameFromThePositionOn) {
     EXPECT_EQ(app::FindNextMatch(names, 4, "harb"), 0);
     EXPECT_EQ(app::FindNextMatch(names, 0, " "), 0);
 }
+
+TEST_F(Selection, ClassWalksStepThroughOneClassOrGroupOfTheFullList) {
+    ASSERT_TRUE(sel.Load());
+    sel.SetClassWalk(false, true);
+    ASSERT_TRUE(sel.SetClassCode(false, "121"));
+    EXPECT_EQ(sel.form().Code, "KRM");
+    EXPECT_EQ(state.Request.ChartStyle, 'B'); // a class walk shows stocks as bars
+    ASSERT_TRUE(sel.FindNextClass());
+    EXPECT_EQ(sel.form().Code, "ALX");
+    ASSERT_TRUE(sel.FindNextClass());
+    EXPECT_EQ(sel.form().Code, "CPR"); // BWG is 122
+    // The scroll bar walks the class too: from position 5 the next of the class is CPR.
+    sel.ScrollTo(6);
+    EXPECT_EQ(sel.form().Code, "CPR");
+
+    // "120" is the group 12x.
+    ASSERT_TRUE(sel.SetClassCode(false, "120"));
+    std::vector<std::string> group = {sel.form().Code};
+    for (int i = 0; i < 4 && sel.FindNextClass(); ++i) group.push_back(sel.form().Code);
+    EXPECT_EQ(group, (std::vector<std::string>{"KRM", "ALX", "BWG", "CPR", "DLT"}));
+
+    s.dialogs.clear();
+    EXPECT_FALSE(sel.SetClassCode(false, "999"));
+    EXPECT_EQ(s.dialogs.messages().back(), "Industry Classification invalid");
+    EXPECT_EQ(s.dialogs.shown().back().title, "Analysis");
+    EXPECT_FALSE(state.ClassWalk);
+
+    EXPECT_FALSE(sel.SetClassCode(true, ""));
+    EXPECT_EQ(s.dialogs.messages().back(), "GICS Classification invalid");
+    EXPECT_EQ(s.dialogs.shown().back().title, "Chart Select");
+    ASSERT_TRUE(sel.SetClassCode(true, "1010"));
+    EXPECT_EQ(sel.form().Code, "EMB");
+    EXPECT_TRUE(state.GicsWalk);
+    EXPECT_FALSE(state.ClassWalk);
+
+    // Choosing a list drops the walks.
+    sel.ChangeList(2, "Banks and Finance");
+    sel.Activate();
+    EXPECT_FALSE(state.GicsWalk);
+}
+
+TEST_F(Selection, TheChartWindowsClassStepWrapsBothWays) {
+    ASSERT_TRUE(sel.Load());
+    auto& r = state.Request;
+    r.ListPosition = 4; // KRM, class 121
+    const auto back = app::StepClassChart(sel.walk(), r, -1, "121", false, s.dialogs);
+    ASSERT_TRUE(back);
+    EXPECT_EQ(back->IndustryClass, "121");
+    EXPECT_GT(r.ListPosition, 4); // before the first of the class comes the last
+    const auto again = app::StepClassChart(sel.walk(), r, 1, "121", false, s.dialogs);
+    ASSERT_TRUE(again);
+    EXPECT_EQ(again->TrimmedCode(), "KRM");
+    EXPECT_FALSE(app::StepClassChart(sel.walk(), r, 1, "998", false, s.dialogs));
+    EXPECT_EQ(s.dialogs.messages().back(), "No records on file for that Industry classification or group");
+}

@@ -67,6 +67,26 @@ ChtSel::ChtSel(app::Session& session, app::ChartState& state, QWidget* parent)
     sg->addWidget(new QLabel(QStringLiteral("This Chart"), security), 1, 2);
     sg->addWidget(m_this, 1, 3);
     sg->addWidget(m_scroll, 2, 0, 1, 4);
+    m_classBox = new QCheckBox(QStringLiteral("Industry Class"), security);
+    m_classBox->setObjectName(QStringLiteral("chkClass"));
+    m_classCode = new QLineEdit(security);
+    m_classCode->setObjectName(QStringLiteral("txtClass"));
+    m_classCode->setMaxLength(3);
+    m_classCode->setPlaceholderText(QStringLiteral("class, Enter"));
+    m_gicsBox = new QCheckBox(QStringLiteral("GICS"), security);
+    m_gicsBox->setObjectName(QStringLiteral("chkGics"));
+    m_gicsCode = new QLineEdit(security);
+    m_gicsCode->setObjectName(QStringLiteral("txtGics"));
+    m_gicsCode->setMaxLength(4);
+    m_gicsCode->setPlaceholderText(QStringLiteral("sector, Enter"));
+    auto* classes = new QHBoxLayout;
+    classes->addWidget(m_classBox);
+    classes->addWidget(m_classCode);
+    classes->addSpacing(20);
+    classes->addWidget(m_gicsBox);
+    classes->addWidget(m_gicsCode);
+    classes->addStretch();
+    sg->addLayout(classes, 3, 0, 1, 4);
     sg->setColumnStretch(3, 1);
     outer->addWidget(security);
 
@@ -193,6 +213,10 @@ ChtSel::ChtSel(app::Session& session, app::ChartState& state, QWidget* parent)
         m_sel.SetAverage(2, on);
         Refresh();
     });
+    connect(m_classBox, &QCheckBox::clicked, this, [this](bool on) { ClassBoxTicked(false, on); });
+    connect(m_gicsBox, &QCheckBox::clicked, this, [this](bool on) { ClassBoxTicked(true, on); });
+    connect(m_classCode, &QLineEdit::returnPressed, this, [this] { ClassCodeEntered(false); });
+    connect(m_gicsCode, &QLineEdit::returnPressed, this, [this] { ClassCodeEntered(true); });
     connect(show, &QPushButton::clicked, this, &ChtSel::ShowChart);
     connect(close, &QPushButton::clicked, this, &ChtSel::CloseWindow);
     connect(list, &QPushButton::clicked, this, &ChtSel::ChangeList);
@@ -243,6 +267,16 @@ void ChtSel::Refresh() {
     for (QWidget* w : std::initializer_list<QWidget*>{m_osc, m_bands, m_av1, m_av2})
         w->setEnabled(f.ChoosersEnabled);
     m_period->setEnabled(f.ChoosersEnabled);
+    const auto& st = m_sel.state();
+    const bool fullList = st.Request.ListMode == 1;
+    m_classBox->setChecked(st.ClassWalk);
+    m_gicsBox->setChecked(st.GicsWalk);
+    m_classBox->setEnabled(fullList && !st.GicsWalk);
+    m_gicsBox->setEnabled(fullList && !st.ClassWalk);
+    m_classCode->setEnabled(st.ClassWalk);
+    m_gicsCode->setEnabled(st.GicsWalk);
+    m_classCode->setText(Q(st.ClassCode));
+    m_gicsCode->setText(Q(st.GicsCode));
     m_updating = false;
 }
 
@@ -270,6 +304,18 @@ void ChtSel::NameEntered() {
              this);
     s.field()->setText(m_name->text());
     s.exec();
+}
+
+void ChtSel::ClassBoxTicked(bool gics, bool on) {
+    m_sel.SetClassWalk(gics, on);
+    Refresh();
+    if (on) (gics ? m_gicsCode : m_classCode)->setFocus();
+}
+
+void ChtSel::ClassCodeEntered(bool gics) {
+    // The class windows' pick mode is not in this program yet: the code is typed here.
+    m_sel.SetClassCode(gics, (gics ? m_gicsCode : m_classCode)->text().toStdString());
+    Refresh();
 }
 
 void ChtSel::BandsChosen(int index) {

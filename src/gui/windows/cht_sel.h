@@ -49,6 +49,8 @@ private:
     void CodeEntered();
     void NameEntered();
     void BandsChosen(int index);
+    void ClassBoxTicked(bool gics, bool on);
+    void ClassCodeEntered(bool gics);
 
     app::Session& m_session;
     app::ChartSelection m_sel;
@@ -72,6 +74,10 @@ private:
     QPushButton* m_volume;
     QCheckBox* m_av1;
     QCheckBox* m_av2;
+    QCheckBox* m_classBox;
+    QLineEdit* m_classCode;
+    QCheckBox* m_gicsBox;
+    QLineEdit* m_gicsCode;
     QPushButton* m_folder;
     QPushButton* m_defaults;
 };

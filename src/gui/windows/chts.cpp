@@ -248,7 +248,11 @@ bool Chts::NextChart(int delta) {
         m_session.dialogs().MsgBox("The name file cannot be read", "Chart Display");
         return false;
     }
-    const auto r = app::StepChart(m_walk, m_state.Request, delta);
+    const bool classWalk = (m_state.ClassWalk || m_state.GicsWalk) && m_state.Request.ListMode == 1;
+    const auto r = classWalk ? app::StepClassChart(m_walk, m_state.Request, delta,
+                                                   m_state.GicsWalk ? m_state.GicsCode : m_state.ClassCode,
+                                                   m_state.GicsWalk, m_session.dialogs())
+                             : app::StepChart(m_walk, m_state.Request, delta);
     if (!r) return false;
     m_name = *r;
     m_haveName = true;
