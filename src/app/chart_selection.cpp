@@ -148,7 +148,16 @@ bool ChartSelection::Load() {
 }
 
 void ChartSelection::Activate() {
-    if (!m_state.ListChanged) return;
+    if (!m_state.ListChanged) {
+        // Back from the chart window: show where it got to, in the style and period it used.
+        auto& r = m_state.Request;
+        m_form.PeriodIndex = PeriodIndexOf(r.ChartPeriod);
+        m_form.StyleIndex = StyleIndexOf(r.ChartStyle);
+        m_form.Spacing = r.BarSpacing;
+        ShowAverages();
+        if (r.ListPosition >= 1 && r.ListPosition <= m_walk.Count()) ShowRecord(r.ListPosition);
+        return;
+    }
     m_state.ListChanged = false;
     m_walk.Open(m_state.Request);
     if (m_state.Request.ListMode != 1) {

@@ -17,6 +17,7 @@
 #include <QLineEdit>
 #include <QMdiArea>
 #include <QMdiSubWindow>
+#include <QPointer>
 #include <QPrinter>
 #include <QScrollBar>
 #include <QTest>
@@ -104,8 +105,11 @@ TEST_F(Road, NextAndPreviousWalkTheChosenList) {
     Key("fwd");
     EXPECT_EQ(Code(), "HBK");
     // "new" goes back to the selection, which shows the same list.
+    Key("wky");
     Key("new");
     EXPECT_TRUE(sel()->isVisible());
+    EXPECT_EQ(sel()->selection().form().Code, "HBK"); // where the chart window got to
+    EXPECT_EQ(sel()->selection().form().PeriodIndex, 1);
     EXPECT_EQ(sel()->selection().form().ListCaption, " Banks and Finance");
 }
 
@@ -313,4 +317,27 @@ TEST_F(Road, TextNotesAndAutomaticScroll) {
     const std::string stopped = Code();
     QTest::qWait(200);
     EXPECT_EQ(Code(), stopped);
+}
+
+TEST_F(Road, ClosingTheChartGoesBackToTheSelectionAndCloseEndsBoth) {
+    TypeCode("krm");
+    QPointer<QMdiSubWindow> chartSub = qobject_cast<QMdiSubWindow*>(chts()->parentWidget());
+    ASSERT_TRUE(chartSub);
+    chartSub->close();
+    QApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
+    QApplication::processEvents();
+    EXPECT_TRUE(main.isVisible());
+    EXPECT_FALSE(chartSub);
+    ASSERT_NE(sel(), nullptr);
+    EXPECT_TRUE(sel()->isVisible());
+    EXPECT_EQ(sel()->selection().form().Code, "KRM");
+
+    sel()->ShowChart();
+    ASSERT_NE(chts(), nullptr);
+    sel()->CloseWindow();
+    QApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
+    QApplication::processEvents();
+    EXPECT_EQ(charts()->chts(), nullptr);
+    EXPECT_EQ(charts()->chtSel(), nullptr);
+    EXPECT_TRUE(main.mdiArea()->subWindowList().isEmpty());
 }

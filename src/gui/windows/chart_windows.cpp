@@ -66,6 +66,13 @@ Chts* ChartWindows::EnsureChts() {
     m_chartWindow = m_main.mdiArea()->addSubWindow(c);
     m_chartWindow->setAttribute(Qt::WA_DeleteOnClose);
     connect(c, &Chts::ChartSelectionRequested, this, &ChartWindows::BackToSelection);
+    // Closing the chart window on its own goes back to the selection it came from.
+    connect(m_chartWindow, &QObject::destroyed, this, [this] {
+        if (!m_closingAll && m_selWindow && !m_main.ending()) {
+            m_selWindow->show();
+            if (ChtSel* s = chtSel()) s->Activate();
+        }
+    });
     return c;
 }
 
@@ -95,8 +102,10 @@ void ChartWindows::BackToSelection() {
 }
 
 void ChartWindows::CloseAll() {
+    m_closingAll = true;
     if (m_chartWindow) m_chartWindow->close();
     if (m_selWindow) m_selWindow->close();
+    m_closingAll = false;
 }
 
 void RegisterChartWindows(MainWindow& main) {

@@ -41,6 +41,7 @@ private:
     app::ChartState m_state;
     QPointer<QMdiSubWindow> m_selWindow;
     QPointer<QMdiSubWindow> m_chartWindow;
+    bool m_closingAll = false;
 };
 
 // Registers "&CHARTS", "&Page Setup (Text)" and "Printer &Setup" with the main window.

@@ -22,6 +22,7 @@
 #include <QFileDialog>
 #include <QLabel>
 #include <QMenu>
+#include <QMdiSubWindow>
 #include <QMenuBar>
 #include <QPageLayout>
 #include <QPainter>
@@ -75,7 +76,13 @@ Chts::Chts(app::Session& session, app::ChartState& state, QWidget* parent)
         ->setObjectName(QStringLiteral("cmShowSaved"));
     file->addSeparator();
     file->addAction(QStringLiteral("Chart &Selection"), this, [this] { SetTool(kToolNewChart); });
-    file->addAction(QStringLiteral("&Close"), this, [this] { window()->close(); });
+    file->addAction(QStringLiteral("&Close"), this, [this] {
+        // Inside the frame the window is a sub-window; window() would be the main window.
+        if (auto* sub = qobject_cast<QMdiSubWindow*>(parentWidget()))
+            sub->close();
+        else
+            close();
+    });
     QMenu* tools = menus->addMenu(QStringLiteral("&Tools"));
     tools->addAction(QStringLiteral("Remove all trendlines for ..."), this, &Chts::RemoveAllTrendlines)
         ->setObjectName(QStringLiteral("cmRemoveTrendlines"));
