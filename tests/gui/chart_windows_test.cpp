@@ -8,6 +8,7 @@
 #include "gui/windows/cht_sel.h"
 #include "gui/windows/chts.h"
 #include "gui/windows/main_window.h"
+#include "gui/windows/search.h"
 #include "gui/windows/register_windows.h"
 #include "platform/files.h"
 #include "support/sample_session.h"
@@ -340,4 +341,43 @@ TEST_F(Road, ClosingTheChartGoesBackToTheSelectionAndCloseEndsBoth) {
     EXPECT_EQ(charts()->chts(), nullptr);
     EXPECT_EQ(charts()->chtSel(), nullptr);
     EXPECT_TRUE(main.mdiArea()->subWindowList().isEmpty());
+}
+
+TEST_F(Road, ARightDragInTheTrendlineToolMovesTheNearerEnd) {
+    TypeCode("krm");
+    Key("tline");
+    const auto& c = chts()->chart();
+    const int last = c.LastBar();
+    const double xA = c.PlotLeft + (last - 80) * c.BarSpacing, xB = c.PlotLeft + (last - 20) * c.BarSpacing;
+    const double y = c.PriceToY(c.ChartBars()[static_cast<std::size_t>(last - 80)].Close);
+    chts()->MousePress(xA, y, Qt::LeftButton);
+    chts()->MouseRelease(xB, y, Qt::LeftButton);
+    ASSERT_EQ(chts()->trendEnds().size(), 1u);
+    const std::string dateB = chart::TrendlineFile::ReadAll(app::TrendlinePath(s.session, "KRM"))[0].DateB;
+    // Grab near the right end and drop it ten bars further right.
+    chts()->MousePress(xB - 1, y, Qt::RightButton);
+    chts()->MouseRelease(xB + 10 * chts()->chart().BarSpacing, y, Qt::RightButton);
+    const auto records = chart::TrendlineFile::ReadAll(app::TrendlinePath(s.session, "KRM"));
+    ASSERT_EQ(records.size(), 1u);
+    EXPECT_EQ(records[0].DateA,
+              std::string(chts()->chart().ChartBars()[static_cast<std::size_t>(last - 80)].DateText()));
+    EXPECT_GT(records[0].DateB, dateB);
+    ASSERT_EQ(chts()->trendEnds().size(), 1u);
+    EXPECT_DOUBLE_EQ(chts()->trendEnds()[0].xB, xB + 10 * chts()->chart().BarSpacing);
+}
+
+TEST_F(Road, SearchByNameStepsThroughTheMatchesUntilNoMoreMatches) {
+    ASSERT_TRUE(main.Trigger("mnuChartDisplay"));
+    std::vector<int> found;
+    gui::Search search(sel()->selection().walk().names(), 0, s.dialogs, [&](int pos) { found.push_back(pos); });
+    search.field()->setText(QStringLiteral("bank"));
+    search.FindNext();
+    search.FindNext();
+    ASSERT_EQ(found.size(), 2u);
+    EXPECT_EQ(sel()->selection().walk().RecordAt(found[0])->TrimmedCode(), "HBK");
+    EXPECT_EQ(sel()->selection().walk().RecordAt(found[1])->TrimmedCode(), "IRB");
+    s.dialogs.clear();
+    for (int i = 0; i < 10 && s.dialogs.messages().empty(); ++i) search.FindNext();
+    ASSERT_FALSE(s.dialogs.messages().empty());
+    EXPECT_EQ(s.dialogs.messages().back(), "No more matches");
 }
