@@ -9,12 +9,24 @@
 #include <QMdiArea>
 #include <QMdiSubWindow>
 #include <QPageSetupDialog>
+#include <QPageLayout>
 #include <QPrinter>
 
 namespace kori::gui {
 
 ChartWindows::ChartWindows(MainWindow& main) : QObject(&main), m_main(main) {
     setObjectName(QStringLiteral("ChartWindows"));
+}
+
+ChartWindows::~ChartWindows() = default;
+
+QPrinter& ChartWindows::printer() {
+    if (!m_printer) {
+        m_printer = std::make_unique<QPrinter>(QPrinter::HighResolution);
+        const int orient = m_main.session().page.Orient;
+        m_printer->setPageOrientation(orient == 1 ? QPageLayout::Portrait : QPageLayout::Landscape);
+    }
+    return *m_printer;
 }
 
 ChtSel* ChartWindows::chtSel() const {
@@ -66,6 +78,7 @@ Chts* ChartWindows::EnsureChts() {
     m_chartWindow = m_main.mdiArea()->addSubWindow(c);
     m_chartWindow->setAttribute(Qt::WA_DeleteOnClose);
     connect(c, &Chts::ChartSelectionRequested, this, &ChartWindows::BackToSelection);
+    c->SetPrinter(&printer());
     // Closing the chart window on its own goes back to the selection it came from.
     connect(m_chartWindow, &QObject::destroyed, this, [this] {
         if (!m_closingAll && m_selWindow && !m_main.ending()) {
@@ -115,9 +128,8 @@ void RegisterChartWindows(MainWindow& main) {
         CHTPage page(main.session(), &main);
         page.exec();
     });
-    main.SetAction("PrinterDialog", [&main] {
-        QPrinter printer(QPrinter::HighResolution);
-        QPageSetupDialog dialog(&printer, &main);
+    main.SetAction("PrinterDialog", [&main, charts] {
+        QPageSetupDialog dialog(&charts->printer(), &main);
         dialog.exec();
     });
 }

@@ -6,7 +6,10 @@
 #include <QObject>
 #include <QPointer>
 
+#include <memory>
+
 class QMdiSubWindow;
+class QPrinter;
 
 namespace kori::gui {
 
@@ -18,6 +21,7 @@ class ChartWindows : public QObject {
     Q_OBJECT
 public:
     explicit ChartWindows(MainWindow& main);
+    ~ChartWindows() override;
 
     // "&CHARTS".
     void OpenCharts();
@@ -33,6 +37,8 @@ public:
     ChtSel* chtSel() const;
     Chts* chts() const;
     app::ChartState& state() { return m_state; }
+    // The printer of the run: "Printer Setup" shapes it and every print starts from it.
+    QPrinter& printer();
 
 private:
     Chts* EnsureChts();
@@ -42,6 +48,7 @@ private:
     QPointer<QMdiSubWindow> m_selWindow;
     QPointer<QMdiSubWindow> m_chartWindow;
     bool m_closingAll = false;
+    std::unique_ptr<QPrinter> m_printer;
 };
 
 // Registers "&CHARTS", "&Page Setup (Text)" and "Printer &Setup" with the main window.

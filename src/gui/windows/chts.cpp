@@ -610,11 +610,14 @@ bool Chts::PrintTo(QPrinter& printer) {
 }
 
 void Chts::Print() {
-    QPrinter printer(QPrinter::HighResolution);
+    QPrinter own(QPrinter::HighResolution);
+    QPrinter& printer = m_printer ? *m_printer : own;
     printer.setDocName(Q("KORI chart " + Code()));
-    // A chart is wider than tall: landscape is offered first unless the page set-up says.
-    const int orient = m_session.page.Orient;
-    printer.setPageOrientation(orient == 1 ? QPageLayout::Portrait : QPageLayout::Landscape);
+    if (!m_printer) {
+        // A chart is wider than tall: landscape is offered first unless the page set-up says.
+        const int orient = m_session.page.Orient;
+        printer.setPageOrientation(orient == 1 ? QPageLayout::Portrait : QPageLayout::Landscape);
+    }
     QPrintDialog dialog(&printer, this);
     dialog.setWindowTitle(QStringLiteral("Print Chart"));
     if (dialog.exec() != QDialog::Accepted) return;

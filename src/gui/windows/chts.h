@@ -69,6 +69,8 @@ public:
     int toolMode() const { return m_tool; }
     void SetCalendarTimeLines(bool calendar);
 
+    // The printer "Printer Setup" shapes, kept for the run; without one each print starts afresh.
+    void SetPrinter(QPrinter* printer) { m_printer = printer; }
     // Printing: the dialog, and the road behind it for a printer already set up.
     void Print();
     bool PrintTo(QPrinter& printer);
@@ -128,6 +130,7 @@ private:
     std::unique_ptr<chart::Chart> m_chart;
     chart::PrinterPage m_page;
     std::optional<chart::PrintSettings> m_print;
+    QPrinter* m_printer = nullptr;
     std::vector<chart::TrendEnds> m_trendEnds;
     bool m_trendChanged = false;
     OverlayHook m_overlayHook;
