@@ -1,6 +1,7 @@
 #include "app/chart_navigation.h"
 
 #include "chart/number_format.h"
+#include "platform/date_text.h"
 #include "platform/files.h"
 #include "platform/text.h"
 #include "store/classifications.h"
@@ -154,6 +155,19 @@ std::vector<std::string> CursorReadout(const chart::Chart& chart, double x, bool
     return {"Open  " + ReadoutPrice(b.Open), "High  " + ReadoutPrice(b.High),
             "Low  " + ReadoutPrice(b.Low), "Close  " + ReadoutPrice(b.Close),
             "Vol  " + Volume(b.Volume)};
+}
+
+std::vector<std::string> DayCountReadout(const chart::Chart& chart, double xA, double xB) {
+    int a = BarUnder(chart, xA);
+    int b = BarUnder(chart, xB);
+    if (a < 0 || b < 0) return {};
+    if (a > b) std::swap(a, b);
+    const auto& bars = chart.ChartBars();
+    const auto da = platform::DaySerial(bars[static_cast<std::size_t>(a)].DateText());
+    const auto db = platform::DaySerial(bars[static_cast<std::size_t>(b)].DateText());
+    std::vector<std::string> out = {"Trading days  " + std::to_string(b - a)};
+    if (da && db) out.push_back("Calendar days  " + std::to_string(*db - *da));
+    return out;
 }
 
 std::vector<std::string> RiseFallReadout(const chart::Chart& chart, double xDown, double x) {

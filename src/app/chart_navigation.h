@@ -67,6 +67,9 @@ std::vector<std::string> CursorReadout(const chart::Chart& chart, double x, bool
 // highest high above the first close), "Fall  " (the first close above the lowest low),
 // "Total  " (the last close less the first) and "Vol  " (the volume summed over the bars).
 std::vector<std::string> RiseFallReadout(const chart::Chart& chart, double xDown, double x);
+// The day count between the bars under two clicks: "Trading days  " (bars from the first to
+// the second) and "Calendar days  " (days between their dates). Empty off the bars.
+std::vector<std::string> DayCountReadout(const chart::Chart& chart, double xA, double xB);
 // Index of the bar under x, or -1 off the bars.
 int BarUnder(const chart::Chart& chart, double x);
 // A price for the status bar: "#####.00#", with 0 as empty.

@@ -83,3 +83,14 @@ TEST(CursorReadout, RiseAndFallFromTheBarWhereTheButtonWentDown) {
     EXPECT_EQ(app::RiseFallReadout(c, 54, 50),
               (std::vector<std::string>{"Rise  .10", "Fall  .25", "Total  -.20", "Vol  3000"}));
 }
+
+TEST(CursorReadout, DayCountsBetweenTwoBarsInBarsAndCalendarDays) {
+    // Friday, Monday, Tuesday: two bars apart, four days apart.
+    const auto c = ChartOf({Bar("20240105", 1, 1, 1, 1, 0), Bar("20240108", 1, 1, 1, 1, 0),
+                            Bar("20240109", 1, 1, 1, 1, 0)});
+    EXPECT_EQ(app::DayCountReadout(c, 58, 50),
+              (std::vector<std::string>{"Trading days  2", "Calendar days  4"}));
+    EXPECT_EQ(app::DayCountReadout(c, 54, 54),
+              (std::vector<std::string>{"Trading days  0", "Calendar days  0"}));
+    EXPECT_TRUE(app::DayCountReadout(c, 10, 54).empty());
+}

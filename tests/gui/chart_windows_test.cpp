@@ -11,6 +11,7 @@
 #include "gui/windows/search.h"
 #include "gui/windows/register_windows.h"
 #include "platform/files.h"
+#include "store/price_file.h"
 #include "support/sample_session.h"
 
 #include <QAction>
@@ -380,4 +381,21 @@ TEST_F(Road, SearchByNameStepsThroughTheMatchesUntilNoMoreMatches) {
     for (int i = 0; i < 10 && s.dialogs.messages().empty(); ++i) search.FindNext();
     ASSERT_FALSE(s.dialogs.messages().empty());
     EXPECT_EQ(s.dialogs.messages().back(), "No more matches");
+}
+
+TEST_F(Road, AMissingPriceFileIsReportedAndTheToolsStayQuiet) {
+    std::filesystem::remove(store::PriceFile::PathFor(s.session.folders.DataFolder, "KRM"));
+    s.dialogs.clear();
+    TypeCode("krm");
+    ASSERT_NE(chts(), nullptr);
+    ASSERT_FALSE(s.dialogs.messages().empty());
+    EXPECT_EQ(s.dialogs.shown().back().title, "Chart Display");
+    Key("tline");
+    chts()->MousePress(100, 100, Qt::LeftButton);
+    chts()->MouseMove(150, 120, Qt::LeftButton);
+    chts()->MouseRelease(200, 150, Qt::LeftButton);
+    EXPECT_FALSE(platform::FileExists(app::TrendlinePath(s.session, "KRM")));
+    Key("fwd"); // the walk goes on to the next security
+    EXPECT_EQ(Code(), "ALX");
+    EXPECT_GT(chts()->chart().LastBar(), 0);
 }

@@ -205,6 +205,8 @@ void Chts::BuildToolBar() {
     add("sFibLines", "FibT", "Fibonacci time lines", [this] { SetTool(m_tool == kToolFibTimeLines ? kToolNone : kToolFibTimeLines); }, true);
     add("sGannAng", "Gann", "Gann angles", [this] { SetTool(m_tool == kToolGann ? kToolNone : kToolGann); }, true);
     add("text", "Text", "Text notes", [this] { SetTool(m_tool == kToolText ? kToolNone : kToolText); }, true);
+    add("sDayCount", "Days", "Count the days between two bars",
+        [this] { SetTool(m_tool == kToolDayCount ? kToolNone : kToolDayCount); }, true);
     add("sZoom", "Zoom", "Zoom", [this] { SetTool(m_tool == kToolZoom ? kToolNone : kToolZoom); }, true);
     m_toolbar2->addSeparator();
     add("scroll", "Scroll", "Scroll through the history", [this] { ShowScrollBar(m_koriScroll->isHidden()); });
@@ -399,7 +401,7 @@ void Chts::SetTool(int mode) {
         int mode;
     } keys[] = {{"tline", kToolTrendline}, {"terase", kToolErase}, {"fib", kToolFibRetracement},
                 {"sFibLines", kToolFibTimeLines}, {"sGannAng", kToolGann}, {"text", kToolText},
-                {"sZoom", kToolZoom}};
+                {"sZoom", kToolZoom}, {"sDayCount", kToolDayCount}};
     for (const auto& k : keys)
         if (QAction* a = ToolKey(k.key)) a->setChecked(m_tool == k.mode);
     if (m_tool == kToolFibRetracement) SetPanes({});
@@ -433,7 +435,7 @@ void Chts::MouseMove(double x, double y, Qt::MouseButtons buttons) {
     const bool closeOnly = app::IsCloseOnly(m_name.RecordType);
     if ((buttons & Qt::LeftButton) && m_tool == kToolNone)
         SetPanes(app::RiseFallReadout(*m_chart, m_downX, x));
-    else if (m_tool != kToolFibRetracement)
+    else if (m_tool != kToolFibRetracement && m_tool != kToolDayCount)
         SetPanes(app::CursorReadout(*m_chart, x, closeOnly));
     (void)y;
 }
@@ -524,6 +526,19 @@ void Chts::MousePress(double x, double y, Qt::MouseButton button) {
     }
     case kToolZoom:
         Zoom(x, y);
+        return;
+    case kToolDayCount:
+        if (app::BarUnder(*m_chart, x) < 0) return;
+        if (m_clickStage == 0) {
+            m_countFromX = x;
+            m_clickStage = 1;
+            SetPanes({"From  " + ShortDate(std::string(
+                                     m_chart->ChartBars()[static_cast<std::size_t>(app::BarUnder(*m_chart, x))]
+                                         .DateText()))});
+            return;
+        }
+        m_clickStage = 0;
+        SetPanes(app::DayCountReadout(*m_chart, m_countFromX, x));
         return;
     default:
         return;

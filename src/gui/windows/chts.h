@@ -41,6 +41,7 @@ enum ToolMode : int {
     kToolGann = 30,  // the Gann fan tool (a flip, not a mode of its own elsewhere)
     kToolText = 31,  // text notes
     kToolErase = 32, // delete a trendline with the right button
+    kToolDayCount = 33,
 };
 
 class Chts : public QWidget {
@@ -141,6 +142,7 @@ private:
     double m_downX = 0, m_downY = 0;
     bool m_leftDown = false;
     double m_fibStart = 0;
+    double m_countFromX = 0;
     int m_moving = -1;          // index in m_trendEnds of a line being moved
     double m_fixedX = 0, m_fixedY = 0;
     bool m_calendarLines = false;
