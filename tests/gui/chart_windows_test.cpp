@@ -16,6 +16,8 @@
 
 #include <QAction>
 #include <QApplication>
+#include <QDialog>
+#include <QLabel>
 #include <QLineEdit>
 #include <QMdiArea>
 #include <QMdiSubWindow>
@@ -249,6 +251,33 @@ TEST_F(Road, ZoomOnlyOnBarsAndCandlesticks) {
     Key("bar");
     Key("sZoom");
     EXPECT_EQ(chts()->toolMode(), gui::kToolZoom);
+    const auto& c = chts()->chart();
+    chts()->MousePress(c.PlotLeft + 200, (c.PlotTop + c.PlotBottom) / 2.0, Qt::LeftButton);
+    auto* zoom = chts()->findChild<QDialog*>(QStringLiteral("ZoomKori"));
+    ASSERT_NE(zoom, nullptr);
+    auto* label = zoom->findChild<QLabel*>();
+    ASSERT_NE(label, nullptr);
+    EXPECT_EQ(label->pixmap().size(), QSize(600, 450)); // 200 x 150 of the chart, three times
+}
+
+TEST_F(Road, FibonacciTimeLinesByTradingOrCalendarDays) {
+    TypeCode("krm");
+    Key("sFibLines");
+    const auto& c = chts()->chart();
+    auto lines = [this] {
+        const std::string t = platform::ReadWholeFile(app::ChartLinesPath(s.session)).value_or("");
+        return std::count(t.begin(), t.end(), '\n');
+    };
+    chts()->MousePress(c.PlotLeft + 20 * c.BarSpacing, 200, Qt::LeftButton);
+    const auto trading = lines();
+    EXPECT_GE(trading, 8); // 1, 2, 3, 5, 8, 13, 21, 34, 55, 89, ... bars on a long chart
+    auto* kind = chts()->findChild<QAction*>(QStringLiteral("cmFibTimeKind"));
+    ASSERT_NE(kind, nullptr);
+    EXPECT_EQ(kind->text().toStdString(), "Fib Time Lines - Trading Days");
+    kind->trigger();
+    EXPECT_EQ(kind->text().toStdString(), "Fib Time Lines - Calander Days");
+    chts()->MousePress(c.PlotLeft + 20 * c.BarSpacing, 200, Qt::LeftButton);
+    EXPECT_GT(lines(), trading);
 }
 
 TEST_F(Road, TheOscillatorPanelIsASeamThatShowsOnlyWithAnOscillatorChosen) {
