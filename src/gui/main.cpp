@@ -6,6 +6,7 @@
 #include "gui/windows/register_windows.h"
 #include "gui/services/qt_dialogs.h"
 #include "gui/services/qt_progress.h"
+#include "gui/windows/chart_windows.h"
 #include "gui/windows/logo.h"
 #include "gui/windows/main_window.h"
 #include "platform/clock.h"
@@ -30,6 +31,10 @@ int main(int argc, char** argv) {
                                QStringLiteral("Save a picture of the main window to FILE and quit."),
                                QStringLiteral("FILE"));
     parser.addOption(shotOpt);
+    QCommandLineOption chartOpt(QStringLiteral("chart"),
+                                QStringLiteral("Open the chart of CODE once the main window stands."),
+                                QStringLiteral("CODE"));
+    parser.addOption(chartOpt);
     parser.addPositionalArgument(QStringLiteral("word"), QStringLiteral("RM, A, N or GD"));
     parser.process(qapp);
 
@@ -67,6 +72,9 @@ int main(int argc, char** argv) {
         // Files waiting in the download folder are offered once the main window stands; the
         // update itself is not part of this build, so the answer opens nothing yet.
         (void)kori::app::OfferPendingUpdate(session);
+        if (parser.isSet(chartOpt))
+            if (auto* charts = main.findChild<kori::gui::ChartWindows*>())
+                charts->ShowCode(parser.value(chartOpt).toStdString());
         if (parser.isSet(shotOpt)) {
             QTimer::singleShot(700, &main, [&] {
                 main.grab().save(parser.value(shotOpt));

@@ -121,6 +121,13 @@ bool MainWindow::Trigger(const std::string& itemName) {
     return true;
 }
 
+bool MainWindow::Open(const std::string& opens) {
+    auto it = m_actions.find(opens);
+    if (it == m_actions.end()) return false;
+    it->second();
+    return true;
+}
+
 void MainWindow::SetModalToolRunning(bool running) {
     m_modal = running;
     if (!running && m_ending) return;

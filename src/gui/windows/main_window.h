@@ -38,6 +38,9 @@ public:
 
     // Registers what a menu item opens; items without an action are left out of the menus.
     void SetAction(const std::string& opens, std::function<void()> action);
+    // Whether something opens `opens`, and opening it (false when nothing is registered).
+    bool HasAction(const std::string& opens) const { return m_actions.count(opens) > 0; }
+    bool Open(const std::string& opens);
 
     app::Session& session() { return m_session; }
     bool ending() const { return m_ending; }

@@ -1,5 +1,6 @@
 #include "gui/windows/register_windows.h"
 
+#include "gui/windows/chart_windows.h"
 #include "gui/windows/main_window.h"
 #include "gui/windows/settings_windows.h"
 
@@ -8,6 +9,7 @@ namespace kori::gui {
 void RegisterWindows(MainWindow& main) {
     // Each family of windows adds its actions here; the menus then show what is built.
     RegisterSettingsWindows(main);
+    RegisterChartWindows(main);
     main.RebuildMenus();
 }
 

@@ -1,0 +1,137 @@
+#include "gui/windows/chart_windows.h"
+
+#include "gui/windows/cht_page.h"
+#include "gui/windows/cht_sel.h"
+#include "gui/windows/chts.h"
+#include "gui/windows/main_window.h"
+
+#include <QApplication>
+#include <QMdiArea>
+#include <QMdiSubWindow>
+#include <QPageSetupDialog>
+#include <QPageLayout>
+#include <QPrinter>
+
+namespace kori::gui {
+
+ChartWindows::ChartWindows(MainWindow& main) : QObject(&main), m_main(main) {
+    setObjectName(QStringLiteral("ChartWindows"));
+}
+
+ChartWindows::~ChartWindows() = default;
+
+QPrinter& ChartWindows::printer() {
+    if (!m_printer) {
+        m_printer = std::make_unique<QPrinter>(QPrinter::HighResolution);
+        const int orient = m_main.session().page.Orient;
+        m_printer->setPageOrientation(orient == 1 ? QPageLayout::Portrait : QPageLayout::Landscape);
+    }
+    return *m_printer;
+}
+
+ChtSel* ChartWindows::chtSel() const {
+    return m_selWindow ? qobject_cast<ChtSel*>(m_selWindow->widget()) : nullptr;
+}
+
+Chts* ChartWindows::chts() const {
+    return m_chartWindow ? qobject_cast<Chts*>(m_chartWindow->widget()) : nullptr;
+}
+
+void ChartWindows::OpenCharts() {
+    if (Chts* c = chts(); c && m_chartWindow->isVisible()) {
+        m_main.mdiArea()->setActiveSubWindow(m_chartWindow);
+        m_chartWindow->raise();
+        return;
+    }
+    if (!m_selWindow) {
+        auto* sel = new ChtSel(m_main.session(), m_state);
+        m_selWindow = m_main.mdiArea()->addSubWindow(sel);
+        m_selWindow->setAttribute(Qt::WA_DeleteOnClose);
+        sel->SetFolderButton(m_main.session().download.DataService == 3 && m_main.HasAction("DataPaths"));
+        sel->SetDefaultsButton(m_main.HasAction("ChtDef"));
+        connect(sel, &ChtSel::ShowChartRequested, this, &ChartWindows::ShowChart);
+        connect(sel, &ChtSel::CloseRequested, this, &ChartWindows::CloseAll);
+        connect(sel, &ChtSel::ChangeFolderRequested, this, [this] {
+            const std::string before = m_main.session().folders.DataFolder;
+            m_main.Open("DataPaths");
+            if (m_main.session().folders.DataFolder != before)
+                if (ChtSel* s = chtSel()) {
+                    s->selection().FolderChanged();
+                    s->Load();
+                }
+        });
+        connect(sel, &ChtSel::SetDefaultsRequested, this, [this] { m_main.Open("ChtDef"); });
+        // Placed from the main window's size, as the selection has always sat.
+        const QRect area = m_main.mdiArea()->rect();
+        m_selWindow->move(static_cast<int>(0.006 * area.width()), static_cast<int>(0.077 * area.height()));
+        sel->Load();
+    } else if (ChtSel* s = chtSel()) {
+        s->Activate();
+    }
+    m_selWindow->show();
+    m_main.mdiArea()->setActiveSubWindow(m_selWindow);
+}
+
+Chts* ChartWindows::EnsureChts() {
+    if (Chts* c = chts()) return c;
+    auto* c = new Chts(m_main.session(), m_state);
+    m_chartWindow = m_main.mdiArea()->addSubWindow(c);
+    m_chartWindow->setAttribute(Qt::WA_DeleteOnClose);
+    connect(c, &Chts::ChartSelectionRequested, this, &ChartWindows::BackToSelection);
+    c->SetPrinter(&printer());
+    // Closing the chart window on its own goes back to the selection it came from.
+    connect(m_chartWindow, &QObject::destroyed, this, [this] {
+        if (!m_closingAll && m_selWindow && !m_main.ending()) {
+            m_selWindow->show();
+            if (ChtSel* s = chtSel()) s->Activate();
+        }
+    });
+    return c;
+}
+
+void ChartWindows::ShowChart() {
+    if (m_selWindow) m_selWindow->hide();
+    Chts* c = EnsureChts();
+    // The chart takes the whole frame; its area is laid out before the chart is sized to it.
+    m_chartWindow->showMaximized();
+    m_main.mdiArea()->setActiveSubWindow(m_chartWindow);
+    QApplication::sendPostedEvents();
+    QApplication::processEvents();
+    // ChtSel left the position one short; the next-chart command steps onto it.
+    c->NextChart(1);
+}
+
+bool ChartWindows::ShowCode(const std::string& code) {
+    OpenCharts();
+    ChtSel* s = chtSel();
+    if (!s || !s->selection().TypeCode(code)) return false;
+    s->ShowChart();
+    return chts() != nullptr;
+}
+
+void ChartWindows::BackToSelection() {
+    if (m_chartWindow) m_chartWindow->hide();
+    OpenCharts();
+}
+
+void ChartWindows::CloseAll() {
+    m_closingAll = true;
+    if (m_chartWindow) m_chartWindow->close();
+    if (m_selWindow) m_selWindow->close();
+    m_closingAll = false;
+}
+
+void RegisterChartWindows(MainWindow& main) {
+    auto* charts = new ChartWindows(main);
+    main.SetAction("ChtSel", [charts] { charts->OpenCharts(); });
+    main.SetAction("CHTPage", [&main] {
+        CHTPage page(main.session(), &main);
+        page.exec();
+    });
+    main.SetAction("PrinterDialog", [&main, charts] {
+        QPageSetupDialog dialog(&charts->printer(), &main);
+        dialog.exec();
+    });
+}
+
+} // namespace kori::gui

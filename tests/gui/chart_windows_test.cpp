@@ -1,0 +1,430 @@
+// The road of one chart on the desktop: "&CHARTS", the selection, the chart window and its
+// toolbar, a trendline drawn with the mouse, printing to a PDF file, saving and showing again.
+#include "app/chart_service.h"
+#include "app/chart_window_tools.h"
+#include "chart/trendline_file.h"
+#include "gui/widgets/chart_view.h"
+#include "gui/windows/chart_windows.h"
+#include "gui/windows/cht_sel.h"
+#include "gui/windows/chts.h"
+#include "gui/windows/main_window.h"
+#include "gui/windows/search.h"
+#include "gui/windows/register_windows.h"
+#include "platform/files.h"
+#include "store/price_file.h"
+#include "support/sample_session.h"
+
+#include <QAction>
+#include <QApplication>
+#include <QDialog>
+#include <QLabel>
+#include <QLineEdit>
+#include <QMdiArea>
+#include <QMdiSubWindow>
+#include <QPointer>
+#include <QPrinter>
+#include <QScrollBar>
+#include <QTest>
+#include <QToolBar>
+#include <gtest/gtest.h>
+
+#include <cstdlib>
+
+using namespace kori;
+
+namespace {
+
+struct Road : ::testing::Test {
+    test::SampleSession s;
+    gui::MainWindow main{s.session};
+
+    void SetUp() override {
+        gui::RegisterWindows(main);
+        main.resize(1280, 860);
+        main.show();
+        QApplication::processEvents();
+    }
+    gui::ChartWindows* charts() { return main.findChild<gui::ChartWindows*>(); }
+    gui::ChtSel* sel() { return charts()->chtSel(); }
+    gui::Chts* chts() { return charts()->chts(); }
+    void Key(const char* key) {
+        QAction* a = chts()->ToolKey(key);
+        ASSERT_NE(a, nullptr) << key;
+        a->trigger();
+        QApplication::processEvents();
+    }
+    std::string Code() { return chts()->current().TrimmedCode(); }
+    // Opens the selection, types a code as the user would, and presses Enter.
+    void TypeCode(const char* code) {
+        ASSERT_TRUE(main.Trigger("mnuChartDisplay"));
+        auto* field = sel()->findChild<QLineEdit*>(QStringLiteral("txtCode"));
+        ASSERT_NE(field, nullptr);
+        field->setText(QString::fromLatin1(code));
+        QTest::keyClick(field, Qt::Key_Return);
+        QApplication::processEvents();
+    }
+    // Saves a picture of the main window when KORI_SHOTS names a folder.
+    void Shot(const char* name) {
+        if (const char* dir = std::getenv("KORI_SHOTS")) {
+            QApplication::processEvents();
+            main.grab().save(QString::fromLatin1(dir) + "/" + QString::fromLatin1(name));
+        }
+    }
+};
+
+} // namespace
+
+TEST_F(Road, ChartsMenuOpensTheSelectionAndALowerCaseCodeShowsItsChart) {
+    ASSERT_NE(main.findChild<QAction*>(QStringLiteral("mnuChartDisplay")), nullptr);
+    ASSERT_NE(main.findChild<QAction*>(QStringLiteral("mnTPSU")), nullptr);
+    ASSERT_TRUE(main.Trigger("mnuChartDisplay"));
+    ASSERT_NE(sel(), nullptr);
+    EXPECT_EQ(sel()->windowTitle().toStdString(), "Chart Selection Menu");
+    Shot("chtsel.png");
+    TypeCode("krm");
+    ASSERT_NE(chts(), nullptr);
+    EXPECT_EQ(Code(), "KRM");
+    EXPECT_FALSE(sel()->isVisible());
+    EXPECT_FALSE(chts()->picture1()->picture().isNull());
+    EXPECT_GT(chts()->chart().LastBar(), 100);
+    EXPECT_FALSE(chts()->chart().Failed);
+    // "&CHARTS" again brings the chart window forward rather than the selection.
+    ASSERT_TRUE(main.Trigger("mnuChartDisplay"));
+    EXPECT_EQ(main.mdiArea()->activeSubWindow()->widget(), chts());
+    Shot("chts.png");
+}
+
+TEST_F(Road, NextAndPreviousWalkTheChosenList) {
+    ASSERT_TRUE(main.Trigger("mnuChartDisplay"));
+    sel()->selection().ChangeList(2, "Banks and Finance");
+    sel()->Activate();
+    sel()->ShowChart();
+    ASSERT_NE(chts(), nullptr);
+    EXPECT_EQ(Code(), "HBK");
+    Key("fwd");
+    EXPECT_EQ(Code(), "IRB");
+    Key("rev");
+    Key("rev");
+    EXPECT_EQ(Code(), "LMT"); // before the first comes the last
+    Key("fwd");
+    EXPECT_EQ(Code(), "HBK");
+    // "new" goes back to the selection, which shows the same list.
+    Key("wky");
+    Key("new");
+    EXPECT_TRUE(sel()->isVisible());
+    EXPECT_EQ(sel()->selection().form().Code, "HBK"); // where the chart window got to
+    EXPECT_EQ(sel()->selection().form().PeriodIndex, 1);
+    EXPECT_EQ(sel()->selection().form().ListCaption, " Banks and Finance");
+}
+
+TEST_F(Road, ToolbarStyleAndPeriodRebuildTheChart) {
+    TypeCode("alx");
+    const QImage bars = chts()->picture1()->picture().copy();
+    const std::string firstDaily(chts()->chart().ChartBars()[0].DateText());
+    Key("cstick");
+    EXPECT_EQ(chts()->chart().Style, 'C');
+    EXPECT_NE(chts()->picture1()->picture(), bars);
+    Key("wky");
+    EXPECT_EQ(charts()->state().Request.ChartPeriod, 'W');
+    const std::string firstWeekly(chts()->chart().ChartBars()[0].DateText());
+    EXPECT_LT(firstWeekly, firstDaily); // a week a bar reaches further back
+    Key("lne");
+    EXPECT_EQ(chts()->chart().Style, 'L');
+    Key("dly");
+    Key("bar");
+    EXPECT_EQ(chts()->chart().Style, 'B');
+    // Candlesticks widened the spacing to 3, which stays: fewer days fit than at first.
+    EXPECT_EQ(charts()->state().Request.BarSpacing, 3);
+    EXPECT_GT(std::string(chts()->chart().ChartBars()[0].DateText()), firstDaily);
+}
+
+TEST_F(Road, ATrendlineDrawnWithTheMouseComesBackOnItsPeriodOnly) {
+    TypeCode("krm");
+    Key("tline");
+    EXPECT_EQ(chts()->toolMode(), gui::kToolTrendline);
+    const auto& c = chts()->chart();
+    const int last = c.LastBar();
+    const int x1 = c.PlotLeft + (last - 60) * c.BarSpacing, x2 = c.PlotLeft + (last - 10) * c.BarSpacing;
+    const int y1 = c.PriceToY(c.ChartBars()[static_cast<std::size_t>(last - 60)].Low);
+    const int y2 = c.PriceToY(c.ChartBars()[static_cast<std::size_t>(last - 10)].Low);
+    gui::ChartView* view = chts()->picture1();
+    QTest::mousePress(view, Qt::LeftButton, {}, QPoint(x1, y1));
+    QTest::mouseMove(view, QPoint((x1 + x2) / 2, (y1 + y2) / 2));
+    QTest::mouseRelease(view, Qt::LeftButton, {}, QPoint(x2, y2));
+    const auto path = app::TrendlinePath(s.session, "KRM");
+    const auto records = chart::TrendlineFile::ReadAll(path);
+    ASSERT_EQ(records.size(), 1u);
+    EXPECT_EQ(records[0].Period, 'A');
+    EXPECT_EQ(chts()->trendEnds().size(), 1u);
+    Shot("trendline.png");
+
+    Key("fwd"); // the next security has no lines
+    EXPECT_TRUE(chts()->trendEnds().empty());
+    Key("rev");
+    EXPECT_EQ(Code(), "KRM");
+    EXPECT_EQ(chts()->trendEnds().size(), 1u);
+    Key("wky");
+    EXPECT_TRUE(chts()->trendEnds().empty());
+    Key("dly");
+    ASSERT_EQ(chts()->trendEnds().size(), 1u);
+    EXPECT_EQ(chts()->trendEnds()[0].xA, x1);
+
+    // The erase key and a right click on the line blank its record.
+    s.dialogs.clear();
+    Key("terase");
+    EXPECT_EQ(s.dialogs.messages().back(),
+              "To delete a trendline, click that trendline with your RIGHT mouse button");
+    QTest::mouseClick(view, Qt::RightButton, {}, QPoint((x1 + x2) / 2, (y1 + y2) / 2));
+    EXPECT_TRUE(chts()->trendEnds().empty());
+    EXPECT_TRUE(chart::TrendlineFile::ReadAll(path)[0].deleted());
+}
+
+TEST_F(Road, CursorReadoutAndFibonacciInTheStatusBar) {
+    TypeCode("krm");
+    const auto& c = chts()->chart();
+    const int last = c.LastBar();
+    const auto& bar = c.ChartBars()[static_cast<std::size_t>(last)];
+    chts()->MouseMove(c.PlotLeft + last * c.BarSpacing, 100, Qt::NoButton);
+    const auto panes = chts()->StatusPanes();
+    EXPECT_EQ(panes[0], "Open  " + app::ReadoutPrice(bar.Open));
+    EXPECT_EQ(panes[3], "Close  " + app::ReadoutPrice(bar.Close));
+    EXPECT_EQ(panes[4].rfind("Vol  ", 0), 0u);
+
+    Key("fib");
+    const double low = c.PriceToY(c.MinLow), high = c.PriceToY(c.MaxHigh);
+    chts()->MousePress(c.PlotLeft + 40, low, Qt::LeftButton);
+    EXPECT_EQ(chts()->StatusPanes()[0].rfind("Start  ", 0), 0u);
+    chts()->MousePress(c.PlotLeft + 300, high, Qt::LeftButton);
+    const auto fib = chts()->StatusPanes();
+    EXPECT_EQ(fib[0].rfind("End   ", 0), 0u);
+    EXPECT_EQ(fib[1].rfind("Rise   ", 0), 0u);
+    EXPECT_EQ(fib[2].rfind("38%    ", 0), 0u);
+    EXPECT_EQ(fib[3].rfind("50%    ", 0), 0u);
+    EXPECT_EQ(fib[4].rfind("62%    ", 0), 0u);
+    // Three dotted lines went to ChtLns.Tmp and the stream.
+    const std::string lines = platform::ReadWholeFile(app::ChartLinesPath(s.session)).value_or("");
+    EXPECT_EQ(std::count(lines.begin(), lines.end(), 'D'), 3);
+    Key("sGannAng");
+    chts()->MousePress(c.PlotLeft + 100, (low + high) / 2, Qt::LeftButton);
+    Shot("tools.png");
+}
+
+TEST_F(Road, PrintToAPdfFileThenSaveAndShowTheChartAgain) {
+    TypeCode("bwg");
+    const auto pdf = s.root.path() / "chart.pdf";
+    {
+        QPrinter printer(QPrinter::HighResolution);
+        printer.setOutputFormat(QPrinter::PdfFormat);
+        printer.setOutputFileName(QString::fromStdString(pdf.string()));
+        printer.setPageOrientation(QPageLayout::Landscape);
+        ASSERT_TRUE(chts()->PrintTo(printer));
+    }
+    const auto bytes = platform::ReadWholeFile(pdf);
+    ASSERT_TRUE(bytes);
+    EXPECT_EQ(bytes->rfind("%PDF", 0), 0u);
+    EXPECT_GT(bytes->size(), 2000u);
+    if (const char* dir = std::getenv("KORI_SHOTS"))
+        (void)platform::WriteFileAtomic(std::filesystem::path(dir) / "printed.pdf", *bytes);
+
+    const std::string saved = s.session.folders.ChtSaveFolder + "BWG.cht";
+    s.dialogs.clear();
+    EXPECT_FALSE(chts()->SaveChartAs(s.session.folders.ChtSaveFolder + "BWG.txt"));
+    EXPECT_EQ(s.dialogs.messages().back(), "File extension must be .cht");
+    ASSERT_TRUE(chts()->SaveChartAs(saved));
+    EXPECT_EQ(platform::ReadWholeFile(saved), platform::ReadWholeFile(app::ChartStreamPath(s.session)));
+
+    const QImage live = chts()->picture1()->picture().copy();
+    Key("fwd"); // another chart on show, then the saved one comes back without market data
+    ASSERT_TRUE(chts()->DisplaySavedChart(saved));
+    EXPECT_TRUE(chts()->showingSavedChart());
+    EXPECT_EQ(chts()->picture1()->picture().size(), live.size());
+    Shot("saved.png");
+}
+
+TEST_F(Road, ZoomOnlyOnBarsAndCandlesticks) {
+    TypeCode("krm");
+    Key("lne");
+    s.dialogs.clear();
+    Key("sZoom");
+    EXPECT_EQ(s.dialogs.messages().back(), "Zoom only available on Bar & Candlestick charts");
+    EXPECT_EQ(chts()->toolMode(), gui::kToolNone);
+    Key("bar");
+    Key("sZoom");
+    EXPECT_EQ(chts()->toolMode(), gui::kToolZoom);
+    const auto& c = chts()->chart();
+    chts()->MousePress(c.PlotLeft + 200, (c.PlotTop + c.PlotBottom) / 2.0, Qt::LeftButton);
+    auto* zoom = chts()->findChild<QDialog*>(QStringLiteral("ZoomKori"));
+    ASSERT_NE(zoom, nullptr);
+    auto* label = zoom->findChild<QLabel*>();
+    ASSERT_NE(label, nullptr);
+    EXPECT_EQ(label->pixmap().size(), QSize(600, 450)); // 200 x 150 of the chart, three times
+}
+
+TEST_F(Road, FibonacciTimeLinesByTradingOrCalendarDays) {
+    TypeCode("krm");
+    Key("sFibLines");
+    const auto& c = chts()->chart();
+    auto lines = [this] {
+        const std::string t = platform::ReadWholeFile(app::ChartLinesPath(s.session)).value_or("");
+        return std::count(t.begin(), t.end(), '\n');
+    };
+    chts()->MousePress(c.PlotLeft + 20 * c.BarSpacing, 200, Qt::LeftButton);
+    const auto trading = lines();
+    EXPECT_GE(trading, 8); // 1, 2, 3, 5, 8, 13, 21, 34, 55, 89, ... bars on a long chart
+    auto* kind = chts()->findChild<QAction*>(QStringLiteral("cmFibTimeKind"));
+    ASSERT_NE(kind, nullptr);
+    EXPECT_EQ(kind->text().toStdString(), "Fib Time Lines - Trading Days");
+    kind->trigger();
+    EXPECT_EQ(kind->text().toStdString(), "Fib Time Lines - Calander Days");
+    chts()->MousePress(c.PlotLeft + 20 * c.BarSpacing, 200, Qt::LeftButton);
+    EXPECT_GT(lines(), trading);
+}
+
+TEST_F(Road, TheOscillatorPanelIsASeamThatShowsOnlyWithAnOscillatorChosen) {
+    TypeCode("krm");
+    int painted = 0;
+    chts()->SetOscillatorPainter([&](chart::Chart& c, const chart::ChartRequest& r, platform::Surface& panel) {
+        ++painted;
+        EXPECT_GT(c.LastBar(), 0);
+        EXPECT_EQ(r.AutoOscCode, "RSI");
+        panel.FilledBox(0, 0, 50, 50, 0xFF);
+    });
+    Key("ref");
+    EXPECT_EQ(painted, 0);
+    EXPECT_FALSE(chts()->picture2()->isVisible());
+    charts()->state().Request.AutoOsc = true;
+    charts()->state().Request.AutoOscCode = "RSI";
+    Key("ref");
+    EXPECT_EQ(painted, 1);
+    EXPECT_TRUE(chts()->picture2()->isVisible());
+    EXPECT_FALSE(chts()->picture2()->picture().isNull());
+}
+
+TEST_F(Road, ScrollAndStepsMoveTheEndOfTheChart) {
+    TypeCode("krm");
+    // Every rebuild makes a new chart: read it afresh each time.
+    auto lastBarDate = [this] {
+        const auto& c = chts()->chart();
+        return std::string(c.ChartBars()[static_cast<std::size_t>(c.LastBar())].DateText());
+    };
+    const int lastRecord = chts()->chart().LastRecord;
+    const std::string lastDate = lastBarDate();
+    Key("m1M");
+    const std::string stepped = lastBarDate();
+    EXPECT_LT(stepped, chart::AddCalendarPeriods(lastDate, 'M', -1) + "1");
+    EXPECT_GT(stepped, chart::AddCalendarPeriods(lastDate, 'M', -2));
+    Key("p1M"); // forward past the last record is the latest chart again
+    EXPECT_EQ(chts()->chart().LastRecord, lastRecord);
+    EXPECT_FALSE(charts()->state().Request.ByFinishDate);
+
+    Key("scroll");
+    auto* scroll = chts()->findChild<QScrollBar*>(QStringLiteral("KoriScroll"));
+    ASSERT_NE(scroll, nullptr);
+    EXPECT_TRUE(scroll->isVisible());
+    EXPECT_EQ(scroll->maximum(), lastRecord);
+    scroll->setValue(lastRecord - 250);
+    EXPECT_EQ(chts()->chart().LastRecord, lastRecord - 250);
+    EXPECT_EQ(chts()->StatusPanes()[0].find('/') != std::string::npos, true);
+}
+
+TEST_F(Road, TextNotesAndAutomaticScroll) {
+    TypeCode("krm");
+    Key("text");
+    const auto& c = chts()->chart();
+    const std::string date(c.ChartBars()[40].DateText());
+    s.dialogs.QueueInput(std::string("breakout"));
+    chts()->MousePress(c.PlotLeft + 40 * c.BarSpacing, c.PriceToY(c.ChartBars()[40].Close), Qt::LeftButton);
+    const auto notes = platform::ReadWholeFile(app::NotesPath(s.session, "KRM")).value_or("");
+    EXPECT_EQ(notes.rfind("T,8.25," + date + ",", 0), 0u) << notes;
+    EXPECT_NE(notes.find(",breakout,"), std::string::npos);
+
+    s.dialogs.QueueInput(std::string("0.05"));
+    Key("auto");
+    EXPECT_EQ(s.dialogs.shown().back().text, "Set interval between charts (0 - 60 seconds)");
+    EXPECT_EQ(s.dialogs.shown().back().title, "Display Interval");
+    QTest::qWait(400);
+    EXPECT_NE(Code(), "KRM"); // the list moved on by itself
+    Key("auto");
+    const std::string stopped = Code();
+    QTest::qWait(200);
+    EXPECT_EQ(Code(), stopped);
+}
+
+TEST_F(Road, ClosingTheChartGoesBackToTheSelectionAndCloseEndsBoth) {
+    TypeCode("krm");
+    QPointer<QMdiSubWindow> chartSub = qobject_cast<QMdiSubWindow*>(chts()->parentWidget());
+    ASSERT_TRUE(chartSub);
+    chartSub->close();
+    QApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
+    QApplication::processEvents();
+    EXPECT_TRUE(main.isVisible());
+    EXPECT_FALSE(chartSub);
+    ASSERT_NE(sel(), nullptr);
+    EXPECT_TRUE(sel()->isVisible());
+    EXPECT_EQ(sel()->selection().form().Code, "KRM");
+
+    sel()->ShowChart();
+    ASSERT_NE(chts(), nullptr);
+    sel()->CloseWindow();
+    QApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
+    QApplication::processEvents();
+    EXPECT_EQ(charts()->chts(), nullptr);
+    EXPECT_EQ(charts()->chtSel(), nullptr);
+    EXPECT_TRUE(main.mdiArea()->subWindowList().isEmpty());
+}
+
+TEST_F(Road, ARightDragInTheTrendlineToolMovesTheNearerEnd) {
+    TypeCode("krm");
+    Key("tline");
+    const auto& c = chts()->chart();
+    const int last = c.LastBar();
+    const double xA = c.PlotLeft + (last - 80) * c.BarSpacing, xB = c.PlotLeft + (last - 20) * c.BarSpacing;
+    const double y = c.PriceToY(c.ChartBars()[static_cast<std::size_t>(last - 80)].Close);
+    chts()->MousePress(xA, y, Qt::LeftButton);
+    chts()->MouseRelease(xB, y, Qt::LeftButton);
+    ASSERT_EQ(chts()->trendEnds().size(), 1u);
+    const std::string dateB = chart::TrendlineFile::ReadAll(app::TrendlinePath(s.session, "KRM"))[0].DateB;
+    // Grab near the right end and drop it ten bars further right.
+    chts()->MousePress(xB - 1, y, Qt::RightButton);
+    chts()->MouseRelease(xB + 10 * chts()->chart().BarSpacing, y, Qt::RightButton);
+    const auto records = chart::TrendlineFile::ReadAll(app::TrendlinePath(s.session, "KRM"));
+    ASSERT_EQ(records.size(), 1u);
+    EXPECT_EQ(records[0].DateA,
+              std::string(chts()->chart().ChartBars()[static_cast<std::size_t>(last - 80)].DateText()));
+    EXPECT_GT(records[0].DateB, dateB);
+    ASSERT_EQ(chts()->trendEnds().size(), 1u);
+    EXPECT_DOUBLE_EQ(chts()->trendEnds()[0].xB, xB + 10 * chts()->chart().BarSpacing);
+}
+
+TEST_F(Road, SearchByNameStepsThroughTheMatchesUntilNoMoreMatches) {
+    ASSERT_TRUE(main.Trigger("mnuChartDisplay"));
+    std::vector<int> found;
+    gui::Search search(sel()->selection().walk().names(), 0, s.dialogs, [&](int pos) { found.push_back(pos); });
+    search.field()->setText(QStringLiteral("bank"));
+    search.FindNext();
+    search.FindNext();
+    ASSERT_EQ(found.size(), 2u);
+    EXPECT_EQ(sel()->selection().walk().RecordAt(found[0])->TrimmedCode(), "HBK");
+    EXPECT_EQ(sel()->selection().walk().RecordAt(found[1])->TrimmedCode(), "IRB");
+    s.dialogs.clear();
+    for (int i = 0; i < 10 && s.dialogs.messages().empty(); ++i) search.FindNext();
+    ASSERT_FALSE(s.dialogs.messages().empty());
+    EXPECT_EQ(s.dialogs.messages().back(), "No more matches");
+}
+
+TEST_F(Road, AMissingPriceFileIsReportedAndTheToolsStayQuiet) {
+    std::filesystem::remove(store::PriceFile::PathFor(s.session.folders.DataFolder, "KRM"));
+    s.dialogs.clear();
+    TypeCode("krm");
+    ASSERT_NE(chts(), nullptr);
+    ASSERT_FALSE(s.dialogs.messages().empty());
+    EXPECT_EQ(s.dialogs.shown().back().title, "Chart Display");
+    Key("tline");
+    chts()->MousePress(100, 100, Qt::LeftButton);
+    chts()->MouseMove(150, 120, Qt::LeftButton);
+    chts()->MouseRelease(200, 150, Qt::LeftButton);
+    EXPECT_FALSE(platform::FileExists(app::TrendlinePath(s.session, "KRM")));
+    Key("fwd"); // the walk goes on to the next security
+    EXPECT_EQ(Code(), "ALX");
+    EXPECT_GT(chts()->chart().LastBar(), 0);
+}
