@@ -5,6 +5,7 @@
 #include "chart/scale.h"
 #include "cli/cli_context.h"
 #include "cli/gui_app.h"
+#include "cli/osc_chart.h"
 #include "gui/paint/pdf_printer.h"
 #include "gui/paint/qt_surface.h"
 #include "platform/date_text.h"
@@ -32,6 +33,7 @@ struct ChartOptions {
     std::string finish;
     std::string size = "1000x700";
     std::string stream, png, svg, pdf;
+    OscChartOptions osc;
 };
 
 std::pair<int, int> ParseArea(const std::string& text) {
@@ -95,13 +97,14 @@ void Run(CliContext& ctx, const ChartOptions& o) {
     ApplyOptions(o, job);
     chart::PrinterPage page;
     job.Page = &page;
+    PreparePanelPage(job, h, o.osc);
 
     chart::Chart c;
     platform::Status built;
     if (!o.png.empty() || !o.pdf.empty()) EnsureGuiApplication();
     if (!o.svg.empty()) {
         platform::SvgSurface area(w, h);
-        built = app::BuildSecurityChart(session, job, c, area);
+        built = BuildChartWithPanel(session, job, c, area, o.osc);
         if (built) {
             if (auto s = area.Save(o.svg); !s) throw CliError{s.message()};
         }
@@ -109,11 +112,11 @@ void Run(CliContext& ctx, const ChartOptions& o) {
     if (o.png.empty() && o.svg.empty()) {
         // Numbers, stream or page only: the chart is built on a surface that draws nothing.
         platform::RecordingSurface area(w, h);
-        built = app::BuildSecurityChart(session, job, c, area);
+        built = BuildChartWithPanel(session, job, c, area, o.osc);
     }
     if (built && !o.png.empty()) {
         gui::ImageSurface area(w, h);
-        built = app::BuildSecurityChart(session, job, c, area);
+        built = BuildChartWithPanel(session, job, c, area, o.osc);
         const QImage& picture = area.Finish();
         if (built && !o.png.empty()) {
             if (auto s = gui::SavePng(picture, o.png); !s) throw CliError{s.message()};
@@ -155,6 +158,11 @@ void AddChartCommand(CLI::App& app, CliContext& ctx) {
     cmd->add_option("--svg", o->svg, "SVG drawing as the screen shows it")->option_text("FILE");
     cmd->add_option("--pdf", o->pdf, "A4 page as the printer prints it")->option_text("FILE");
     cmd->add_flag("--json", o->json, "Print the chart numbers as JSON");
+    cmd->add_option("--osc", o->osc.osc, "Oscillator panel under the price chart (RSI, MACD, ...)")
+        ->option_text("NAME");
+    cmd->add_flag("--slow", o->osc.slow, "Slow stochastic with --osc STO");
+    cmd->add_option("--set", o->osc.sets, "Override one OscDef key for this run, such as RsiP=9")
+        ->option_text("KEY=VALUE");
     cmd->callback([&ctx, o] { Run(ctx, *o); });
 }
 

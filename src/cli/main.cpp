@@ -23,6 +23,7 @@ int main(int argc, char** argv) {
     kori::cli::AddPlayCommand(app, ctx);
     kori::cli::AddChartCommand(app, ctx);
     kori::cli::AddScaleCommand(app, ctx);
+    kori::cli::AddIndicatorCommand(app, ctx);
 
     try {
         app.parse(argc, argv);

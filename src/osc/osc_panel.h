@@ -23,6 +23,10 @@ inline constexpr int Frame = 16, Background = 17, Text = 27, Series1 = 38, Serie
 
 // What the caller hands to the drawing of a panel besides the chart and the settings.
 struct OscDrawInputs {
+    OscDrawInputs(const platform::Palette& palette, const platform::ChartFonts& fonts,
+                  platform::Dialogs& dialogs)
+        : Palette(palette), Fonts(fonts), Dialogs(dialogs) {}
+
     const platform::Palette& Palette;
     const platform::ChartFonts& Fonts;
     platform::Dialogs& Dialogs;
