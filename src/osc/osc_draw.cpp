@@ -291,7 +291,7 @@ void OscMACD(chart::Chart& c, const OscDef& d, char period, const OscDrawInputs&
     const bool classic = !d.NoClassicMACD && platform::Upper(in.TargetName) != "ANAL" &&
                          in.PriceSurface != nullptr;
     // The fast average by another road and the slow one, on the price chart.
-    const platform::Colour fastColour = pt.Col(1);
+    const platform::Colour fastColour = pt.Col(9); // light blue
     bool prevOk = false;
     double pFast = 0, pSlow = 0, px = 0;
     for (int i = 0; i <= last; ++i) {
