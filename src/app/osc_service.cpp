@@ -88,6 +88,7 @@ osc::OscOutcome DrawSecurityOscillator(Session& session, const ChartJob& chartJo
     in.PanelOffset = job.PanelOffset;
     in.TargetName = job.TargetName;
     in.SlowStochastic = job.SlowStochastic;
+    in.ShowStochSignals = session.switches.RM || session.switches.GD;
     in.PriceSurface = job.PriceSurface;
     in.RecordType = chartJob.Name.RecordType;
     if (!compare.CompareCode.empty()) {

@@ -118,6 +118,22 @@ void OscRSI(chart::Chart& c, const OscDef& d, char period, const OscDrawInputs& 
 
 // ---- Stochastic and FX ----
 
+namespace {
+
+// A small arrow near the top of the price chart at the bar: buy ("BB") points up to y 40,
+// sell ("SS") down to y 48; at the last bar the bell sounds as well.
+void StochMark(OscPainter& pt, const chart::Chart& c, int bar, bool buy, bool lastBar) {
+    const double x = c.PlotLeft + static_cast<double>(bar) * c.BarSpacing;
+    const platform::Colour colour = pt.Col(buy ? 10 : 12);
+    const double tip = buy ? 40 : 48, wing = buy ? 43 : 45, tail = buy ? 52 : 36;
+    pt.PriceLine('L', x, tail, x, tip, colour);
+    pt.PriceLine('L', x - 3, wing, x, tip, colour);
+    pt.PriceLine('L', x + 3, wing, x, tip, colour);
+    if (lastBar) pt.in().Dialogs.Beep();
+}
+
+} // namespace
+
 void OscStochFX(chart::Chart& c, std::string_view oscName, const OscDef& d, char period,
                 const OscDrawInputs& in, platform::Surface& s, bool secondOsc) {
     const bool sto = oscName == "STO";
@@ -152,6 +168,9 @@ void OscStochFX(chart::Chart& c, std::string_view oscName, const OscDef& d, char
     const bool secondLine = !(pair && !d.RFAve);
 
     const StochResult r = ComputeStochFX(c.Series, k, dp, slow, in.RecordType);
+    const bool signals = sto && in.ShowStochSignals && dp > 0;
+    const double y20 = yOf(20), y90 = yOf(90);
+    std::vector<std::int16_t> zones(signals ? static_cast<std::size_t>(c.LastBar() + 1) : 0, 0);
     double py1 = 0, py2 = 0, py3 = 0;
     for (int i = k + 1; i <= c.LastBar(); ++i) {
         const double x = BarX(c, panel, i), px = x - c.BarSpacing;
@@ -172,6 +191,15 @@ void OscStochFX(chart::Chart& c, std::string_view oscName, const OscDef& d, char
                 y3 = yOf(ValueOr(r.slowd, i, 0));
                 if (i > k + dp && py3 != 0) pt.Line('D', px, py3, x, y3, c2);
             }
+        }
+        if (signals) {
+            // The zone of the second line: 3 well under the 20% line, 1 over the 90% line.
+            const double y = slow ? y3 : y2;
+            const std::int16_t zone = y > y20 + 3 ? 3 : y < y90 ? 1 : 2;
+            const std::int16_t before = zones[static_cast<std::size_t>(i - 1)];
+            zones[static_cast<std::size_t>(i)] = zone;
+            if (zone == 2 && (before == 1 || before == 3))
+                StochMark(pt, c, i, before == 3, i == c.LastBar());
         }
         py1 = y1;
         py2 = y2;
@@ -610,7 +638,8 @@ void OscDirectional(chart::Chart& c, const OscDef& d, char period, const OscDraw
     const std::string title = "Directional Movement ( " + TitleNumber(p) + " period )    ADX " +
                               TitleNumber(x) + " period";
     DrawFrameAndTitle(pt, panel, title);
-    double lx = panel.OscLeft + 2 + pt.Width(title) + 12;
+    // Paper sets the title wider than the screen measures it: the legend keeps clear of both.
+    double lx = panel.OscLeft + 2 + pt.Width(title) * 1.25 + 12;
     for (auto [text, entry] : {std::pair{"+DI ", oscpal::Series1}, std::pair{"-DI ", oscpal::Series2},
                                std::pair{"ADX ", oscpal::Line1}}) {
         pt.Text(lx, panel.OscTop + 2, text, entry);

@@ -37,6 +37,7 @@ struct OscDrawInputs {
     double PanelOffset = 0;  // top of the panel within the chart page, in stream units
     std::string TargetName = "CHTS"; // "ANAL" (the scan window) keeps the price chart clean
     bool SlowStochastic = false;
+    bool ShowStochSignals = false; // the start-up words "RM" and "GD": crossing marks on STO
     // The surface the price chart is on, for the classic MACD lines; none: they are not drawn.
     platform::Surface* PriceSurface = nullptr;
     // RMO and RMX: the comparison file's records and its code, and every record of the

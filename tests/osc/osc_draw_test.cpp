@@ -362,3 +362,43 @@ TEST(SubSurfaceTest, MovesDrawingIntoItsBand) {
 
 } // namespace
 } // namespace kori::osc
+
+namespace kori::osc {
+namespace {
+
+TEST(OscPanelTest, StochasticCrossingMarksOnThePriceChart) {
+    // Down 20 bars, up 20, down 20: the %D line leaves the bottom zone on the way up (a buy
+    // mark) and the top zone on the way down (a sell mark).
+    store::ChartSeries s;
+    float close = 50;
+    for (int i = 0; i < 60; ++i) {
+        close += i < 20 || i >= 40 ? -1.0f : 1.0f;
+        store::ChartBar b;
+        b.Open = b.High = b.Low = b.Close = close;
+        s.ChartBars.push_back(b);
+    }
+    s.LastBar = 59;
+    PanelRig rig(s);
+    rig.def.StochK = 5;
+    rig.def.StochD = 3;
+    platform::RecordingSurface price(1000, 500);
+    rig.in.PriceSurface = &price;
+    DrawOscillatorPanel(rig.chart, "STO", 'A', rig.def, rig.in, rig.panel);
+    EXPECT_TRUE(price.calls().empty()); // only with the start-up words that ask for them
+
+    rig.in.ShowStochSignals = true;
+    DrawOscillatorPanel(rig.chart, "STO", 'A', rig.def, rig.in, rig.panel);
+    const auto buy = LinesIn(price, 10), sell = LinesIn(price, 12);
+    ASSERT_EQ(buy.size(), 3u);
+    ASSERT_EQ(sell.size(), 3u);
+    EXPECT_EQ(buy[0][3], 40);
+    EXPECT_EQ(sell[0][3], 48);
+    EXPECT_LT(buy[0][0], sell[0][0]);
+    // The marks stand on bars of the turn: after bar 20 and after bar 40.
+    EXPECT_GT(buy[0][0], 20 * 2);
+    EXPECT_GT(sell[0][0], 40 * 2);
+    EXPECT_LT(sell[0][0], 50 * 2);
+}
+
+} // namespace
+} // namespace kori::osc
