@@ -33,27 +33,31 @@ platform::Colour OscPainter::Col(int entry) const {
 
 void OscPainter::Line(char letter, double x1, double y1, double x2, double y2, int entry) {
     screen.Line(x1, y1, x2, y2, Col(entry));
-    chart.Stream.Shape(letter, x1, StreamY(y1), x2, StreamY(y2), Col(entry));
+    chart.Stream.Shape(letter, StreamUnits(x1), StreamY(y1), StreamUnits(x2), StreamY(y2),
+                       Col(entry));
 }
 
 void OscPainter::Dotted(double x1, double y1, double x2, double y2, int entry) {
     screen.SetLineStyle(platform::LineStyle::Dot);
     screen.Line(x1, y1, x2, y2, Col(entry));
     screen.SetLineStyle(platform::LineStyle::Solid);
-    chart.Stream.Shape('V', x1, StreamY(y1), x2, StreamY(y2), Col(entry));
+    chart.Stream.Shape('V', StreamUnits(x1), StreamY(y1), StreamUnits(x2), StreamY(y2),
+                       Col(entry));
 }
 
 void OscPainter::Dashed(double x1, double y1, double x2, double y2, int entry) {
     screen.SetLineStyle(platform::LineStyle::Dash);
     screen.Line(x1, y1, x2, y2, Col(entry));
     screen.SetLineStyle(platform::LineStyle::Solid);
-    chart.Stream.Shape('E', x1, StreamY(y1), x2, StreamY(y2), Col(entry));
+    chart.Stream.Shape('E', StreamUnits(x1), StreamY(y1), StreamUnits(x2), StreamY(y2),
+                       Col(entry));
 }
 
 void OscPainter::Box(double x1, double y1, double x2, double y2, int entry) {
     screen.SetLineWidth(1);
     screen.Box(x1, y1, x2, y2, Col(entry));
-    chart.Stream.Shape('B', x1, StreamY(y1), x2, StreamY(y2), Col(entry));
+    chart.Stream.Shape('B', StreamUnits(x1), StreamY(y1), StreamUnits(x2), StreamY(y2),
+                       Col(entry));
 }
 
 void OscPainter::Text(double x, double y, std::string_view text, int entry) {
@@ -64,7 +68,7 @@ void OscPainter::Text(double x, double streamX, double y, std::string_view text,
     screen.SetForeColour(Col(entry));
     screen.SetTextPosition(x, y);
     screen.PrintText(text);
-    chart.Stream.Text('T', 8.25, streamX, StreamY(y), text, Col(entry));
+    chart.Stream.Text('T', 8.25, StreamUnits(streamX), StreamY(y), text, Col(entry));
 }
 
 double OscPainter::Width(std::string_view text) {
@@ -75,7 +79,8 @@ void OscPainter::PriceLine(char letter, double x1, double y1, double x2, double 
                            platform::Colour c) {
     if (m_in.PriceSurface == nullptr) return;
     m_in.PriceSurface->Line(x1, y1, x2, y2, c);
-    chart.Stream.Shape(letter, x1, y1, x2, y2, c);
+    chart.Stream.Shape(letter, StreamUnits(x1), StreamUnits(y1), StreamUnits(x2), StreamUnits(y2),
+                       c);
 }
 
 OscPanel SetOscPanel(OscPainter& p, bool secondOsc, bool wholeNumberHalves) {

@@ -8,6 +8,7 @@
 #include "platform/palette.h"
 #include "platform/surface.h"
 
+#include <cmath>
 #include <cstdint>
 #include <filesystem>
 #include <string>
@@ -68,7 +69,12 @@ public:
     OscPainter& operator=(const OscPainter&) = delete;
 
     platform::Colour Col(int entry) const;
-    double StreamY(double y) const { return y / m_in.DisplayScale + m_in.PanelOffset; }
+    // Stream positions keep hundredths of a unit, far below what paper or screen can show,
+    // which keeps the numbers short and quick to write.
+    static double StreamUnits(double v) { return std::nearbyint(v * 100) / 100; }
+    double StreamY(double y) const {
+        return StreamUnits(y / m_in.DisplayScale + m_in.PanelOffset);
+    }
 
     void Line(char letter, double x1, double y1, double x2, double y2, int entry);
     void Dotted(double x1, double y1, double x2, double y2, int entry); // "V"
