@@ -69,9 +69,9 @@ public:
     OscPainter& operator=(const OscPainter&) = delete;
 
     platform::Colour Col(int entry) const;
-    // Stream positions keep hundredths of a unit, far below what paper or screen can show,
-    // which keeps the numbers short and quick to write.
-    static double StreamUnits(double v) { return std::nearbyint(v * 100) / 100; }
+    // Stream positions keep quarters of a unit, finer than screen or paper can show; a
+    // quarter is exact in binary, so the numbers stay short and quick to write.
+    static double StreamUnits(double v) { return std::nearbyint(v * 4) / 4; }
     double StreamY(double y) const {
         return StreamUnits(y / m_in.DisplayScale + m_in.PanelOffset);
     }
