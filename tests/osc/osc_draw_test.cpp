@@ -402,3 +402,42 @@ TEST(OscPanelTest, StochasticCrossingMarksOnThePriceChart) {
 
 } // namespace
 } // namespace kori::osc
+
+namespace kori::osc {
+namespace {
+
+TEST(OscPanelTest, WilliamsShowsTheMeanOfThreePositions) {
+    // P = 2: %R stands from bar 2 (not 1): bars 2 to 7 give 0, 100, 100, 50, 0, 66.7; at
+    // 14 + %R x 1.92 rounded the positions are 14, 206, 206, 110, 14, 142, and their
+    // three-bar means 142, 174, 110, 89 at bars 4 to 7. The line joins the means from the
+    // third on.
+    PanelRig rig(test::HlcBars({{10, 8, 9}, {11, 9, 10}, {12, 10, 12}, {12, 10, 10},
+                                {11, 9, 9}, {13, 9, 11}, {13, 11, 13}, {14, 12, 12}}));
+    rig.def.WmsA = 2;
+    DrawOscillatorPanel(rig.chart, "WMS", 'A', rig.def, rig.in, rig.panel);
+    const auto segs = LinesIn(rig.panel, 45);
+    ASSERT_EQ(segs.size(), 2u);
+    EXPECT_EQ(segs[0], (Seg{15, 174, 17, 110}));
+    EXPECT_EQ(segs[1], (Seg{17, 110, 19, 89}));
+    // "o/b" at the top tenth of Span, "o/s" at the bottom tenth.
+    const auto refs = LinesIn(rig.panel, 16);
+    ASSERT_EQ(refs.size(), 2u);
+    EXPECT_EQ(refs[0][1], 33); // 14 + 19.2
+    EXPECT_EQ(refs[1][1], 187); // 14 + 172.8
+}
+
+TEST(OscPanelTest, CoppockAndObvStepAfterTheirTest) {
+    // These two routines start at OscLeft for bar 1, one bar left of the others.
+    store::ChartSeries s = Rising(80);
+    PanelRig rig(s);
+    DrawOscillatorPanel(rig.chart, "OBV", 'A', rig.def, rig.in, rig.panel);
+    std::vector<Seg> obv = LinesIn(rig.panel, 38);
+    for (const auto& seg : LinesIn(rig.panel, 40)) obv.push_back(seg);
+    ASSERT_FALSE(obv.empty());
+    double leftmost = 1e9;
+    for (const auto& seg : obv) leftmost = std::min(leftmost, seg[0]);
+    EXPECT_EQ(leftmost, 5); // bar 1
+}
+
+} // namespace
+} // namespace kori::osc
