@@ -79,6 +79,9 @@ platform::Status BuildChartWithPanel(app::Session& session, app::ChartJob& job,
     job.Request.AutoOscSlow = o.slow;
     auto built = app::BuildSecurityChart(session, job, c, priceArea);
     if (!built) return built;
+    // The panel shows empty, as the chart window's does, when its routine draws nothing.
+    panelArea.SetBackColour(session.palette[osc::oscpal::Background]);
+    panelArea.Clear();
     app::OscPanelJob panel;
     panel.OscName = name;
     panel.SlowStochastic = o.slow;

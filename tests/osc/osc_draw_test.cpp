@@ -441,3 +441,29 @@ TEST(OscPanelTest, CoppockAndObvStepAfterTheirTest) {
 
 } // namespace
 } // namespace kori::osc
+
+namespace kori::osc {
+namespace {
+
+TEST(OscPanelTest, SlowStochasticSecondLineBeginsAfterBothPeriods) {
+    PanelRig rig(Rising(40));
+    rig.def.StochK = 5;
+    rig.def.StochD = 3;
+    DrawOscillatorPanel(rig.chart, "STO", 'A', rig.def, rig.in, rig.panel);
+    // Fast: both lines from the second bar with a figure, bar K + 2 = 7 (x 19).
+    ASSERT_FALSE(LinesIn(rig.panel, 46).empty());
+    EXPECT_EQ(LinesIn(rig.panel, 45).front()[2], 19);
+    EXPECT_EQ(LinesIn(rig.panel, 46).front()[2], 19);
+    rig.panel.ClearCalls();
+    rig.in.SlowStochastic = true;
+    DrawOscillatorPanel(rig.chart, "STO", 'A', rig.def, rig.in, rig.panel);
+    EXPECT_TRUE(AnyTextEndsWith(rig.panel, "SLOW Stochastic Oscillator (K= 5 Period  D= 3 Period)"));
+    // Slow: the smoothed line leads in the first colour; the second smoothing joins after
+    // K + D bars, from bar 8 to bar 9 (x 21 to 23).
+    EXPECT_EQ(LinesIn(rig.panel, 45).front()[2], 19);
+    EXPECT_EQ(LinesIn(rig.panel, 46).front()[0], 21);
+    EXPECT_EQ(LinesIn(rig.panel, 46).front()[2], 23);
+}
+
+} // namespace
+} // namespace kori::osc
