@@ -92,7 +92,7 @@ void BM_DrawPanel(benchmark::State& state, const char* name) {
     for (auto _ : state) {
         // Each pass starts the stream afresh, as a new chart does.
         std::filesystem::remove(in.StreamPath);
-        benchmark::DoNotOptimize(DrawOscillatorPanel(c, name, 'A', def, in, panel));
+        benchmark::DoNotOptimize(ShowOscillator(c, name, 'A', def, in, panel));
     }
     std::filesystem::remove(in.StreamPath);
 }

@@ -96,7 +96,7 @@ osc::OscOutcome DrawSecurityOscillator(Session& session, const ChartJob& chartJo
         in.CompareCode = compare.CompareCode;
     }
     if (own) in.SecurityFile = &*own;
-    return osc::DrawOscillatorPanel(chart, name, period, def, in, panel);
+    return osc::ShowOscillator(chart, name, period, def, in, panel);
 }
 
 } // namespace kori::app

@@ -845,7 +845,12 @@ void OscRMX(chart::Chart& c, const OscDef& d, char period, const OscDrawInputs& 
     PositionRing ring(a);
     Pen line, avg;
     int averages = 0;
+    // The middle line, where a ratio equals its own mean, dotted bar by bar from bar 3.
+    const double centerY = Round(yOf(0));
+    const bool centerInside = centerY > panel.OscTop && centerY < panel.OscBottom;
     for (int i = 0; i <= c.LastBar(); ++i) {
+        if (centerInside && i >= 3)
+            pt.Dotted(BarX(c, panel, i - 1), centerY, BarX(c, panel, i), centerY, oscpal::Frame);
         const double v = ValueOr(r.value, i, 0);
         if (v == 0) continue;
         const double x = BarX(c, panel, i);
@@ -868,7 +873,7 @@ void OscRMX(chart::Chart& c, const OscDef& d, char period, const OscDrawInputs& 
 
 // ---- Dispatch ----
 
-OscOutcome DrawOscillatorPanel(chart::Chart& chart, std::string_view oscName, char chartPeriod,
+OscOutcome ShowOscillator(chart::Chart& chart, std::string_view oscName, char chartPeriod,
                                const OscDef& def, const OscDrawInputs& in,
                                platform::Surface& panel) {
     const std::string name = platform::Trim(oscName);

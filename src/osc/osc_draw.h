@@ -1,6 +1,6 @@
 #pragma once
-// The drawing of the oscillator panels: `ShowOscillator`'s dispatch on the identifier, and
-// one routine a panel that draws the computed series into the surface and the stream.
+// The drawing of the oscillator panels: the dispatch on the identifier, and one routine a
+// panel that draws the computed series into the surface and the stream.
 #include "chart/chart.h"
 #include "osc/osc_panel.h"
 #include "osc/osc_settings.h"
@@ -19,10 +19,11 @@ enum class OscOutcome {
     Failed,        // a run-time failure, shown as the chart shows it
 };
 
-// The one entry point of the chart window and the CLI: `chart` is the price chart just
-// built (its bars, BarSpacing, PlotRight, price map and stream), `panel` the surface of the
-// oscillator panel. "R/F" draws ROC, then FX over it.
-OscOutcome DrawOscillatorPanel(chart::Chart& chart, std::string_view oscName, char chartPeriod,
+// The dispatcher, the one entry point of the chart window and the CLI: `chart` is the price
+// chart just built (its bars, BarSpacing, PlotRight, price map and stream), `panel` the
+// surface of the oscillator panel. "R/F" draws ROC, then FX over it. Making the panel show
+// and redrawing the price chart short beforehand is the window's part.
+OscOutcome ShowOscillator(chart::Chart& chart, std::string_view oscName, char chartPeriod,
                                const OscDef& def, const OscDrawInputs& in,
                                platform::Surface& panel);
 

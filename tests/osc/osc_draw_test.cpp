@@ -122,7 +122,7 @@ TEST(OscPanelTest, StreamGoesUnderThePriceChartAtTheDisplayScale) {
     rig.def.RsiP = 14;
     rig.in.DisplayScale = 2;
     rig.in.PanelOffset = 500;
-    EXPECT_EQ(DrawOscillatorPanel(rig.chart, "RSI", 'A', rig.def, rig.in, rig.panel),
+    EXPECT_EQ(ShowOscillator(rig.chart, "RSI", 'A', rig.def, rig.in, rig.panel),
               OscOutcome::Drawn);
     const auto lines = rig.Stream();
     ASSERT_GE(lines.size(), 2u);
@@ -135,14 +135,14 @@ TEST(OscPanelTest, StreamGoesUnderThePriceChartAtTheDisplayScale) {
 
 TEST(OscPanelTest, PeriodZeroDrawsNothingAndPanelWithoutHeightOnlyFrameAndTitle) {
     PanelRig rig(Rising(40));
-    EXPECT_EQ(DrawOscillatorPanel(rig.chart, "RSI", 'A', rig.def, rig.in, rig.panel),
+    EXPECT_EQ(ShowOscillator(rig.chart, "RSI", 'A', rig.def, rig.in, rig.panel),
               OscOutcome::NotSet);
     EXPECT_TRUE(rig.panel.calls().empty());
     EXPECT_TRUE(rig.dialogs.shown().empty());
 
     rig.def.RsiP = 14;
     rig.panel.Resize(1000, 20); // OscTop 0, OscBottom 20: Span 0, Unit 0
-    DrawOscillatorPanel(rig.chart, "RSI", 'A', rig.def, rig.in, rig.panel);
+    ShowOscillator(rig.chart, "RSI", 'A', rig.def, rig.in, rig.panel);
     EXPECT_TRUE(HasCall(rig.panel, "Box 5,0,900,20 #16"));
     EXPECT_EQ(TextsOf(rig.panel).size(), 1u);
     EXPECT_TRUE(LinesIn(rig.panel, 16).empty());
@@ -152,14 +152,14 @@ TEST(OscPanelTest, PeriodZeroDrawsNothingAndPanelWithoutHeightOnlyFrameAndTitle)
 TEST(OscPanelTest, DispatchGuardsAndOverlays) {
     PanelRig rig(Rising(40));
     rig.def.RmoP = 30;
-    EXPECT_EQ(DrawOscillatorPanel(rig.chart, "RMO", 'W', rig.def, rig.in, rig.panel),
+    EXPECT_EQ(ShowOscillator(rig.chart, "RMO", 'W', rig.def, rig.in, rig.panel),
               OscOutcome::DailyOnly);
     ASSERT_EQ(rig.dialogs.shown().size(), 1u);
     EXPECT_EQ(rig.dialogs.shown()[0].text, "RMO only available on Daily Charts");
     EXPECT_EQ(rig.dialogs.shown()[0].title, "RMO");
-    EXPECT_EQ(DrawOscillatorPanel(rig.chart, "PARA", 'A', rig.def, rig.in, rig.panel),
+    EXPECT_EQ(ShowOscillator(rig.chart, "PARA", 'A', rig.def, rig.in, rig.panel),
               OscOutcome::OnPriceChart);
-    EXPECT_EQ(DrawOscillatorPanel(rig.chart, "XYZ", 'A', rig.def, rig.in, rig.panel),
+    EXPECT_EQ(ShowOscillator(rig.chart, "XYZ", 'A', rig.def, rig.in, rig.panel),
               OscOutcome::Unknown);
     EXPECT_TRUE(rig.panel.calls().empty());
 }
@@ -170,7 +170,7 @@ TEST(OscPanelTest, RocAndFxShareOneFrameAndFxTitleStandsFurtherRight) {
     rig.def.RocA = 3;
     rig.def.FXF = 10;
     rig.def.FXX = 4;
-    DrawOscillatorPanel(rig.chart, "R/F", 'A', rig.def, rig.in, rig.panel);
+    ShowOscillator(rig.chart, "R/F", 'A', rig.def, rig.in, rig.panel);
     int boxes = 0, clears = 0;
     for (const auto& c : rig.panel.calls()) {
         boxes += c.rfind("Box ", 0) == 0;
@@ -206,7 +206,7 @@ TEST(OscPanelTest, RsiLineWorkedByHand) {
     // bar 2 on, the first segment ends at bar 5.
     PanelRig rig(test::CloseBars({10, 12, 11, 13, 12, 16, 15}));
     rig.def.RsiP = 3;
-    DrawOscillatorPanel(rig.chart, "RSI", 'A', rig.def, rig.in, rig.panel);
+    ShowOscillator(rig.chart, "RSI", 'A', rig.def, rig.in, rig.panel);
     const auto segs = LinesIn(rig.panel, 45);
     ASSERT_EQ(segs.size(), 2u);
     // Panel 4 to 216: Span 192, Unit 1.92, y = 206 - RSI x 1.92.
@@ -243,7 +243,7 @@ TEST(OscPanelTest, SymmetricScaleKeepsZeroInTheMiddle) {
 TEST(OscPanelTest, FlatChartStopsMomentumAfterTheTitle) {
     PanelRig rig(test::CloseBars({5, 5, 5, 5, 5, 5, 5, 5, 5, 5}));
     rig.def.MMA = 3;
-    DrawOscillatorPanel(rig.chart, "MOM", 'A', rig.def, rig.in, rig.panel);
+    ShowOscillator(rig.chart, "MOM", 'A', rig.def, rig.in, rig.panel);
     const auto texts = TextsOf(rig.panel);
     ASSERT_EQ(texts.size(), 1u);
     EXPECT_NE(texts[0].find("Momentum Oscillator ( 3 Period)   0 Ave"), std::string::npos);
@@ -254,12 +254,12 @@ TEST(OscPanelTest, FxUpsideDownSwapsLabelsNotLines) {
     PanelRig rig(Rising(60));
     rig.def.FXF = 10;
     rig.def.FXX = 5;
-    DrawOscillatorPanel(rig.chart, "FX", 'A', rig.def, rig.in, rig.panel);
+    ShowOscillator(rig.chart, "FX", 'A', rig.def, rig.in, rig.panel);
     const auto upright = LinesIn(rig.panel, 16);
     const auto uprightTexts = TextsOf(rig.panel);
     rig.def.FXRev = true;
     rig.panel.ClearCalls();
-    DrawOscillatorPanel(rig.chart, "FX", 'A', rig.def, rig.in, rig.panel);
+    ShowOscillator(rig.chart, "FX", 'A', rig.def, rig.in, rig.panel);
     EXPECT_EQ(LinesIn(rig.panel, 16), upright);
     // Panel 4 to 215 by whole-number division, Span 195 - 24 = 171: value 25 stands at
     // 195 - 25 x 171 / 100 = 152.25.
@@ -273,7 +273,7 @@ TEST(OscPanelTest, FxUpsideDownSwapsLabelsNotLines) {
 
 TEST(OscPanelTest, NoVolumeDataMessage) {
     PanelRig rig(test::CloseBars({5, 6, 7, 6, 5, 6}));
-    DrawOscillatorPanel(rig.chart, "OBV", 'A', rig.def, rig.in, rig.panel);
+    ShowOscillator(rig.chart, "OBV", 'A', rig.def, rig.in, rig.panel);
     EXPECT_TRUE(AnyTextEndsWith(rig.panel, "No Volume Data"));
     bool streamed = false;
     for (const auto& l : rig.Stream()) streamed |= l == "T, 8.25, 7, 34,No Volume Data, 27";
@@ -288,7 +288,7 @@ TEST(OscPanelTest, ClassicMacdLinesGoOnThePriceChartUnlessSwitchedOff) {
     rig.def.Md3 = 2;
     platform::RecordingSurface price(1000, 500);
     rig.in.PriceSurface = &price;
-    DrawOscillatorPanel(rig.chart, "MACD", 'A', rig.def, rig.in, rig.panel);
+    ShowOscillator(rig.chart, "MACD", 'A', rig.def, rig.in, rig.panel);
     EXPECT_FALSE(price.calls().empty());
     const auto histogram = LinesIn(rig.panel, 45);
     // From bar P1 + P2 + P3 = 10 to bar 119, one bar each.
@@ -297,13 +297,13 @@ TEST(OscPanelTest, ClassicMacdLinesGoOnThePriceChartUnlessSwitchedOff) {
     price.ClearCalls();
     rig.def.NoClassicMACD = true;
     rig.panel.ClearCalls();
-    DrawOscillatorPanel(rig.chart, "MACD", 'A', rig.def, rig.in, rig.panel);
+    ShowOscillator(rig.chart, "MACD", 'A', rig.def, rig.in, rig.panel);
     EXPECT_TRUE(price.calls().empty());
     EXPECT_EQ(LinesIn(rig.panel, 45), histogram);
 
     rig.def.NoClassicMACD = false;
     rig.in.TargetName = "anal";
-    DrawOscillatorPanel(rig.chart, "MACD", 'A', rig.def, rig.in, rig.panel);
+    ShowOscillator(rig.chart, "MACD", 'A', rig.def, rig.in, rig.panel);
     EXPECT_TRUE(price.calls().empty());
 }
 
@@ -331,7 +331,7 @@ TEST(OscPanelTest, ZeroClosesAndPeriodsLongerThanTheChart) {
             for (const auto& k : OscPeriodKeys())
                 rig.def.*k.DailyField =
                     longPeriods ? std::int16_t{300} : k.DefaultDaily ? k.DefaultDaily : std::int16_t{5};
-            EXPECT_EQ(DrawOscillatorPanel(rig.chart, name, 'A', rig.def, rig.in, rig.panel),
+            EXPECT_EQ(ShowOscillator(rig.chart, name, 'A', rig.def, rig.in, rig.panel),
                       OscOutcome::Drawn)
                 << name;
             EXPECT_TRUE(HasCall(rig.panel, "Box 5,4,900,21")) << name; // 215 for STO and FX
@@ -383,11 +383,11 @@ TEST(OscPanelTest, StochasticCrossingMarksOnThePriceChart) {
     rig.def.StochD = 3;
     platform::RecordingSurface price(1000, 500);
     rig.in.PriceSurface = &price;
-    DrawOscillatorPanel(rig.chart, "STO", 'A', rig.def, rig.in, rig.panel);
+    ShowOscillator(rig.chart, "STO", 'A', rig.def, rig.in, rig.panel);
     EXPECT_TRUE(price.calls().empty()); // only with the start-up words that ask for them
 
     rig.in.ShowStochSignals = true;
-    DrawOscillatorPanel(rig.chart, "STO", 'A', rig.def, rig.in, rig.panel);
+    ShowOscillator(rig.chart, "STO", 'A', rig.def, rig.in, rig.panel);
     const auto buy = LinesIn(price, 10), sell = LinesIn(price, 12);
     ASSERT_EQ(buy.size(), 3u);
     ASSERT_EQ(sell.size(), 3u);
@@ -414,7 +414,7 @@ TEST(OscPanelTest, WilliamsShowsTheMeanOfThreePositions) {
     PanelRig rig(test::HlcBars({{10, 8, 9}, {11, 9, 10}, {12, 10, 12}, {12, 10, 10},
                                 {11, 9, 9}, {13, 9, 11}, {13, 11, 13}, {14, 12, 12}}));
     rig.def.WmsA = 2;
-    DrawOscillatorPanel(rig.chart, "WMS", 'A', rig.def, rig.in, rig.panel);
+    ShowOscillator(rig.chart, "WMS", 'A', rig.def, rig.in, rig.panel);
     const auto segs = LinesIn(rig.panel, 45);
     ASSERT_EQ(segs.size(), 2u);
     EXPECT_EQ(segs[0], (Seg{15, 174, 17, 110}));
@@ -430,7 +430,7 @@ TEST(OscPanelTest, CoppockAndObvStepAfterTheirTest) {
     // These two routines start at OscLeft for bar 1, one bar left of the others.
     store::ChartSeries s = Rising(80);
     PanelRig rig(s);
-    DrawOscillatorPanel(rig.chart, "OBV", 'A', rig.def, rig.in, rig.panel);
+    ShowOscillator(rig.chart, "OBV", 'A', rig.def, rig.in, rig.panel);
     std::vector<Seg> obv = LinesIn(rig.panel, 38);
     for (const auto& seg : LinesIn(rig.panel, 40)) obv.push_back(seg);
     ASSERT_FALSE(obv.empty());
@@ -449,14 +449,14 @@ TEST(OscPanelTest, SlowStochasticSecondLineBeginsAfterBothPeriods) {
     PanelRig rig(Rising(40));
     rig.def.StochK = 5;
     rig.def.StochD = 3;
-    DrawOscillatorPanel(rig.chart, "STO", 'A', rig.def, rig.in, rig.panel);
+    ShowOscillator(rig.chart, "STO", 'A', rig.def, rig.in, rig.panel);
     // Fast: both lines from the second bar with a figure, bar K + 2 = 7 (x 19).
     ASSERT_FALSE(LinesIn(rig.panel, 46).empty());
     EXPECT_EQ(LinesIn(rig.panel, 45).front()[2], 19);
     EXPECT_EQ(LinesIn(rig.panel, 46).front()[2], 19);
     rig.panel.ClearCalls();
     rig.in.SlowStochastic = true;
-    DrawOscillatorPanel(rig.chart, "STO", 'A', rig.def, rig.in, rig.panel);
+    ShowOscillator(rig.chart, "STO", 'A', rig.def, rig.in, rig.panel);
     EXPECT_TRUE(AnyTextEndsWith(rig.panel, "SLOW Stochastic Oscillator (K= 5 Period  D= 3 Period)"));
     // Slow: the smoothed line leads in the first colour; the second smoothing joins after
     // K + D bars, from bar 8 to bar 9 (x 21 to 23).
