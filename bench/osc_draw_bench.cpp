@@ -1,15 +1,24 @@
 // The drawing of each oscillator panel on a 1000-bar chart at the default periods: the
 // computation, the scale and every line, with the stream written to a scratch file as the
-// chart window writes TCht.Tmp. The surface takes the calls and draws nothing, so the
-// figures are the routine's own cost; painting pixels belongs to the surface.
+// chart window writes TCht.Tmp. BM_DrawPanel's surface takes the calls and draws nothing,
+// so its figures are the routine's own cost; BM_PaintPanel paints a 2100 x 210 picture
+// through Qt as the screen does.
 #include "osc/osc_draw.h"
 #include "osc/osc_identifiers.h"
 
 #include <benchmark/benchmark.h>
 
+#if __has_include(<QGuiApplication>)
+#include "gui/paint/qt_surface.h"
+
+#include <QGuiApplication>
+#define KORI_BENCH_QT 1
+#endif
+
 #include <algorithm>
 #include <cstdint>
 #include <filesystem>
+#include <memory>
 #include <random>
 #include <string>
 
@@ -69,7 +78,8 @@ public:
     double ScaleHeight() const override { return 210; }
 };
 
-void BM_DrawPanel(benchmark::State& state, const char* name) {
+template <class MakeSurface>
+void RunPanel(benchmark::State& state, const char* name, MakeSurface makeSurface) {
     const store::ChartSeries reference = SyntheticBars(11, 3000.0f, kBars);
     chart::Chart c;
     c.Series = SyntheticBars(7, 2.5f, kBars);
@@ -88,20 +98,43 @@ void BM_DrawPanel(benchmark::State& state, const char* name) {
     in.CompareFile = &reference;
     in.CompareCode = "XAO";
     in.SecurityFile = &c.Series;
-    NullSurface panel;
+    auto panel = makeSurface();
     for (auto _ : state) {
         // Each pass starts the stream afresh, as a new chart does.
         std::filesystem::remove(in.StreamPath);
-        benchmark::DoNotOptimize(ShowOscillator(c, name, 'A', def, in, panel));
+        benchmark::DoNotOptimize(ShowOscillator(c, name, 'A', def, in, *panel));
     }
     std::filesystem::remove(in.StreamPath);
 }
+
+void BM_DrawPanel(benchmark::State& state, const char* name) {
+    RunPanel(state, name, [] { return std::make_unique<NullSurface>(); });
+}
+
+#ifdef KORI_BENCH_QT
+void BM_PaintPanel(benchmark::State& state, const char* name) {
+    if (!QCoreApplication::instance()) {
+        if (qEnvironmentVariableIsEmpty("QT_QPA_PLATFORM")) qputenv("QT_QPA_PLATFORM", "offscreen");
+        static int argc = 1;
+        static char arg0[] = "kori_bench_osc_draw";
+        static char* argv[] = {arg0, nullptr};
+        static QGuiApplication app(argc, argv);
+    }
+    RunPanel(state, name, [] { return std::make_unique<gui::ImageSurface>(2100, 210); });
+}
+#endif
 
 const int kRegistered = [] {
     for (const char* name : kNames)
         benchmark::RegisterBenchmark((std::string("BM_DrawPanel/") + name).c_str(), BM_DrawPanel,
                                      name)
             ->Unit(benchmark::kMicrosecond);
+#ifdef KORI_BENCH_QT
+    for (const char* name : kNames)
+        benchmark::RegisterBenchmark((std::string("BM_PaintPanel/") + name).c_str(), BM_PaintPanel,
+                                     name)
+            ->Unit(benchmark::kMicrosecond);
+#endif
     return 0;
 }();
 

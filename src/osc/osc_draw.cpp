@@ -845,12 +845,7 @@ void OscRMX(chart::Chart& c, const OscDef& d, char period, const OscDrawInputs& 
     PositionRing ring(a);
     Pen line, avg;
     int averages = 0;
-    // The middle line, where a ratio equals its own mean, dotted bar by bar from bar 3.
-    const double centerY = Round(yOf(0));
-    const bool centerInside = centerY > panel.OscTop && centerY < panel.OscBottom;
     for (int i = 0; i <= c.LastBar(); ++i) {
-        if (centerInside && i >= 3)
-            pt.Dotted(BarX(c, panel, i - 1), centerY, BarX(c, panel, i), centerY, oscpal::Frame);
         const double v = ValueOr(r.value, i, 0);
         if (v == 0) continue;
         const double x = BarX(c, panel, i);
@@ -864,6 +859,11 @@ void OscRMX(chart::Chart& c, const OscDef& d, char period, const OscDrawInputs& 
             avg.MoveTo(x, ay);
         }
     }
+    // The middle line, where a ratio equals its own mean, dotted from bar 2 on; it stands at
+    // the same height at every bar, so one line carries it.
+    const double centerY = Round(yOf(0));
+    if (c.LastBar() >= 3 && centerY > panel.OscTop && centerY < panel.OscBottom)
+        pt.Dotted(BarX(c, panel, 2), centerY, BarX(c, panel, c.LastBar()), centerY, oscpal::Frame);
     // Frame and title come last on this panel.
     DrawFrameAndTitle(pt, panel,
                       titleStart + "           CenterLine = " +
