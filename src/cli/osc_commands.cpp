@@ -1,10 +1,12 @@
 // kori chart --osc (the panel under the price chart) and kori indicator (an oscillator's
 // values as CSV, one row a bar).
+#include "app/colour_table.h"
 #include "app/osc_service.h"
 #include "cli/cli_context.h"
 #include "cli/osc_chart.h"
 #include "osc/osc_identifiers.h"
 #include "osc/osc_panel.h"
+#include "platform/files.h"
 #include "platform/sub_surface.h"
 #include "platform/text.h"
 #include "store/load_chart_series.h"
@@ -49,6 +51,19 @@ void WriteSampleOscSettings(app::Session& session) {
         def.CompFile = session.folders.DataFolder + "XAO.WDT";
     if (!osc::WriteOscSettings(session.ini(), def))
         throw CliError{"Cannot write the oscillator settings to Kori.ini"};
+
+    // Without scheme files the built-in colours stop at entry 44, leaving the oscillator
+    // lines (45 to 48) black on the black panel; the sample gives them colours of their own.
+    auto& pal = session.palette;
+    if (pal[45] == 0 && pal[46] == 0 && pal[47] == 0 && pal[48] == 0) {
+        pal[45] = platform::kStandardColours[10]; // light green
+        pal[46] = platform::kStandardColours[14]; // yellow
+        pal[47] = platform::kStandardColours[11]; // light cyan
+        pal[48] = platform::kStandardColours[13]; // light magenta
+        const auto file = platform::ResolveIn(session.folders.SystemFolder, "koriclr.dat");
+        if (!app::WriteColourFile(file.string(), pal))
+            throw CliError{"Cannot write " + file.string()};
+    }
 }
 
 void ApplyOscSets(osc::OscDef& def, const std::vector<std::string>& sets) {
