@@ -467,3 +467,34 @@ TEST(OscPanelTest, SlowStochasticSecondLineBeginsAfterBothPeriods) {
 
 } // namespace
 } // namespace kori::osc
+
+namespace kori::osc {
+namespace {
+
+TEST(OscPanelTest, RateOfChangeOnItsSymmetricScaleByHand) {
+    // P = 1: ROC of bars 2 to 5 against the current close: 20, -25, -25, 20; bars 0 and 1
+    // hold 0. Hi 20, Lo -25 become 25 and -25: Per 50 / 192, y = 206 - (v + 25) x 3.84.
+    PanelRig rig(test::CloseBars({100, 100, 125, 100, 80, 100}));
+    rig.def.RocP = 1;
+    rig.def.RocA = 2;
+    ShowOscillator(rig.chart, "ROC", 'A', rig.def, rig.in, rig.panel);
+    const auto refs = LinesIn(rig.panel, 16);
+    ASSERT_EQ(refs.size(), 3u);
+    EXPECT_EQ(refs[0][1], 110); // 0
+    EXPECT_EQ(refs[1][1], 33);  // round(0.8 x 25) = 20 -> 33.2
+    EXPECT_EQ(refs[2][1], 187); // -20 -> 186.8
+    EXPECT_TRUE(AnyTextEndsWith(rig.panel, "[  0%]"));
+    EXPECT_TRUE(AnyTextEndsWith(rig.panel, "[+80%]"));
+    EXPECT_TRUE(AnyTextEndsWith(rig.panel, "[-80%]"));
+    EXPECT_TRUE(AnyTextEndsWith(rig.panel, "[Rate of Change Oscillator ( 1 Period)   2 Ave]"));
+    // The line from bar 2 on, from the bar before.
+    EXPECT_EQ(LinesIn(rig.panel, 45), (std::vector<Seg>{{7, 110, 9, 33}, {9, 33, 11, 206},
+                                                        {11, 206, 13, 206}, {13, 206, 15, 33}}));
+    // The average of the last two positions, rounded half to even: 110, 71.5, 119.5, 206,
+    // 119.5 -> 110, 72, 120, 206, 120, joined from the second average on.
+    EXPECT_EQ(LinesIn(rig.panel, 46), (std::vector<Seg>{{7, 110, 9, 72}, {9, 72, 11, 120},
+                                                        {11, 120, 13, 206}, {13, 206, 15, 120}}));
+}
+
+} // namespace
+} // namespace kori::osc
