@@ -72,7 +72,9 @@ public:
     void SetFontItalic(bool) override {}
     void SetTextPosition(double, double) override {}
     void PrintText(std::string_view) override {}
-    double TextWidth(std::string_view text) override { return 5.0 * static_cast<double>(text.size()); }
+    double TextWidth(std::string_view text) override {
+        return 5.0 * static_cast<double>(text.size());
+    }
     double TextHeight(std::string_view) override { return 12; }
     double ScaleWidth() const override { return 2100; }
     double ScaleHeight() const override { return 210; }
@@ -87,7 +89,8 @@ void RunPanel(benchmark::State& state, const char* name, MakeSurface makeSurface
     c.FirstRecord = 1;
     c.PlotRight = 2010;
     OscDef def;
-    for (const auto& id : OscIdentifiers()) FillOscDefaults(def, id.OscName, false);
+    for (const auto& id : OscIdentifiers())
+        FillOscDefaults(def, id.OscName, false);
     def.AtrD = 14;
     def.NoClassicMACD = true;
     platform::Palette palette{};

@@ -35,7 +35,7 @@ struct OscPanelJob {
     double PanelOffset = 0; // top of the panel within the chart page
     std::string TargetName = "CHTS";
     platform::Surface* PriceSurface = nullptr; // for the classic MACD lines
-    std::optional<osc::OscDef> Settings;        // none: as Kori.ini has them
+    std::optional<osc::OscDef> Settings;       // none: as Kori.ini has them
 };
 
 // Draws the panel of `job.OscName` for the chart just built from `chartJob` onto `panel`,

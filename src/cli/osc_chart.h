@@ -20,9 +20,8 @@ struct OscChartOptions {
 
 // Builds the chart of `job` on `area`, with the panel when `o.osc` is set. Throws CliError
 // for an identifier the panel cannot draw.
-platform::Status BuildChartWithPanel(app::Session& session, app::ChartJob& job,
-                                     chart::Chart& c, platform::Surface& area,
-                                     const OscChartOptions& o);
+platform::Status BuildChartWithPanel(app::Session& session, app::ChartJob& job, chart::Chart& c,
+                                     platform::Surface& area, const OscChartOptions& o);
 
 // The oscillator settings a new sample library starts with: the settings dialog's defaults,
 // ATR at 14, the sample All Ordinaries file to compare with, and colours for the oscillator

@@ -80,9 +80,8 @@ void PreparePanelPage(app::ChartJob& job, double areaHeight, const OscChartOptio
     job.Page->SecondPanelHeight = osc::SplitChartArea(static_cast<int>(areaHeight)).PanelHeight;
 }
 
-platform::Status BuildChartWithPanel(app::Session& session, app::ChartJob& job,
-                                     chart::Chart& c, platform::Surface& area,
-                                     const OscChartOptions& o) {
+platform::Status BuildChartWithPanel(app::Session& session, app::ChartJob& job, chart::Chart& c,
+                                     platform::Surface& area, const OscChartOptions& o) {
     if (o.osc.empty()) return app::BuildSecurityChart(session, job, c, area);
     const std::string name = CheckedOscName(o.osc);
     const osc::PanelSplit split = osc::SplitChartArea(static_cast<int>(area.ScaleHeight()));
@@ -159,8 +158,8 @@ void RunIndicator(CliContext& ctx, const IndicatorOptions& o) {
     q.LastRecord = static_cast<std::int16_t>(o.last > 0 ? o.last : pf.Count());
     if (o.first < 1 || q.LastRecord > pf.Count() || q.LastRecord < q.FirstRecord)
         throw CliError{"Records " + std::to_string(o.first) + " to " +
-                       std::to_string(q.LastRecord) + " are not in " +
-                       path.filename().string() + " (1 to " + std::to_string(pf.Count()) + ")"};
+                       std::to_string(q.LastRecord) + " are not in " + path.filename().string() +
+                       " (1 to " + std::to_string(pf.Count()) + ")"};
     q.Period = o.period[0];
     q.WantVolume = true;
     q.RecordType = rec.RecordType;
@@ -189,11 +188,11 @@ void RunIndicator(CliContext& ctx, const IndicatorOptions& o) {
     if (!table) throw CliError{name + " has no values to export"};
 
     std::string out = "index,date";
-    for (const auto& col : table->columns) out += "," + col;
+    for (const auto& col : table->columns)
+        out += "," + col;
     out += "\n";
     for (std::size_t i = 0; i < table->RowCount(); ++i) {
-        out += std::to_string(i) + "," +
-               platform::Trim(series.ChartBars[i].DateText());
+        out += std::to_string(i) + "," + platform::Trim(series.ChartBars[i].DateText());
         for (const auto& v : table->Row(i)) {
             out += ',';
             if (v) out += CsvNumber(*v);
@@ -208,8 +207,9 @@ void RunIndicator(CliContext& ctx, const IndicatorOptions& o) {
 void AddIndicatorCommand(CLI::App& app, CliContext& ctx) {
     auto o = std::make_shared<IndicatorOptions>();
     auto* cmd = app.add_subcommand("indicator", "An oscillator's values for every bar, as CSV");
-    cmd->add_option("NAME", o->name, "Oscillator: RSI STO FX ROC R/F MOM MACD COP ERY ATR VTY "
-                                     "OBV DM WMS JHG RMO RMX")
+    cmd->add_option("NAME", o->name,
+                    "Oscillator: RSI STO FX ROC R/F MOM MACD COP ERY ATR VTY "
+                    "OBV DM WMS JHG RMO RMX")
         ->required();
     cmd->add_option("CODE", o->code, "Security code")->required();
     cmd->add_option("--period", o->period, "A daily, W weekly, M monthly")

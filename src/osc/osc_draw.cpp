@@ -72,7 +72,8 @@ public:
         if (static_cast<int>(m_ring.size()) > m_n) m_ring.erase(m_ring.begin());
         if (static_cast<int>(m_ring.size()) < m_n) return false;
         double sum = 0;
-        for (double v : m_ring) sum += v;
+        for (double v : m_ring)
+            sum += v;
         mean = Round(sum / m_n);
         return true;
     }
@@ -92,8 +93,8 @@ void OscRSI(chart::Chart& c, const OscDef& d, char period, const OscDrawInputs& 
     if (p == 0) return;
     OscPainter pt(c, in, s);
     const OscPanel panel = SetOscPanel(pt, false);
-    DrawFrameAndTitle(pt, panel, "Relative Strength Index Oscillator (" + TitleNumber(p) +
-                                     " Period)");
+    DrawFrameAndTitle(pt, panel,
+                      "Relative Strength Index Oscillator (" + TitleNumber(p) + " Period)");
     const FixedScale sc = MakeFixedScale(panel);
     if (sc.Unit == 0) return;
     const double top = panel.OscTop + 10;
@@ -150,8 +151,7 @@ void OscStochFX(chart::Chart& c, std::string_view oscName, const OscDef& d, char
         title = std::string(slow ? "SLOW Stochastic Oscillator (K=" : "Stochastic Oscillator (K=") +
                 TitleNumber(k) + " Period  D=" + TitleNumber(dp) + " Period)";
     else
-        title = "FX Oscillator (F=" + TitleNumber(k) + " Period  X=" + TitleNumber(dp) +
-                " Period)";
+        title = "FX Oscillator (F=" + TitleNumber(k) + " Period  X=" + TitleNumber(dp) + " Period)";
     DrawFrameAndTitle(pt, panel, title);
 
     const double base = panel.OscBottom - 20;
@@ -248,7 +248,8 @@ void DrawChangePanel(chart::Chart& c, const OscDrawInputs& in, platform::Surface
 
 template <class T> std::vector<double> Repeated(const Series<T>& s, int bars) {
     std::vector<double> v(static_cast<std::size_t>(std::max(bars, 0)), 0.0);
-    for (int i = 0; i < bars; ++i) v[static_cast<std::size_t>(i)] = ValueOr(s, i, 0);
+    for (int i = 0; i < bars; ++i)
+        v[static_cast<std::size_t>(i)] = ValueOr(s, i, 0);
     return v;
 }
 
@@ -295,7 +296,8 @@ void OscMACD(chart::Chart& c, const OscDef& d, char period, const OscDrawInputs&
     float hiH = 0, loH = 10000;
     for (int i = p1 + p2 + p3 - 1; i <= last; ++i) {
         if (!Has(r.macd, i) || !Has(r.signal, i)) continue;
-        const float h = *r.macd[static_cast<std::size_t>(i)] - *r.signal[static_cast<std::size_t>(i)];
+        const float h =
+            *r.macd[static_cast<std::size_t>(i)] - *r.signal[static_cast<std::size_t>(i)];
         hiH = std::max(hiH, h);
         loH = std::min(loH, h);
     }
@@ -309,15 +311,14 @@ void OscMACD(chart::Chart& c, const OscDef& d, char period, const OscDrawInputs&
     const double mid = Round((panel.OscBottom - panel.OscTop) / 2.0);
     const double zeroWidth = pt.Width("0.0");
     pt.Text(panel.OscRight + (30 - zeroWidth), mid - 6, "0.0", oscpal::Text);
-    pt.Line('L', panel.OscRight + (30 - zeroWidth) + 2, mid, panel.OscRight, mid,
-            oscpal::Frame);
+    pt.Line('L', panel.OscRight + (30 - zeroWidth) + 2, mid, panel.OscRight, mid, oscpal::Frame);
     for (double v : {double(hiH), 0.5 * hiH, double(loH), 0.5 * loH}) {
         const double y = (panel.OscBottom - 10) - (v - loH) / per;
         ReferenceLine(pt, panel, y, chart::FormatNumber(v, "####.00"));
     }
 
-    const bool classic = !d.NoClassicMACD && platform::Upper(in.TargetName) != "ANAL" &&
-                         in.PriceSurface != nullptr;
+    const bool classic =
+        !d.NoClassicMACD && platform::Upper(in.TargetName) != "ANAL" && in.PriceSurface != nullptr;
     // The fast average by another road and the slow one, on the price chart.
     const platform::Colour fastColour = pt.Col(9); // light blue
     bool prevOk = false;
@@ -348,8 +349,8 @@ void OscMACD(chart::Chart& c, const OscDef& d, char period, const OscDrawInputs&
             }
         }
         if (i >= p1 + p2 + p3 && Has(r.macd, i) && Has(r.signal, i)) {
-            const double h = *r.macd[static_cast<std::size_t>(i)] -
-                             *r.signal[static_cast<std::size_t>(i)];
+            const double h =
+                *r.macd[static_cast<std::size_t>(i)] - *r.signal[static_cast<std::size_t>(i)];
             const double y = (panel.OscBottom - 10) - (mid + h / per - 10);
             pt.Line('H', x, mid, x, y, oscpal::Line1);
         }
@@ -509,8 +510,8 @@ void OscATR(chart::Chart& c, const OscDef& d, char period, const OscDrawInputs& 
     const double titleWidth = pt.Width(title);
     for (int k = 1; k <= 5; ++k) {
         const double y = span / 5 * k + panel.OscTop + 10;
-        pt.Line('L', k == 1 ? panel.OscLeft + titleWidth + 10 : panel.OscLeft, y, panel.OscRight,
-                y, oscpal::Frame);
+        pt.Line('L', k == 1 ? panel.OscLeft + titleWidth + 10 : panel.OscLeft, y, panel.OscRight, y,
+                oscpal::Frame);
         const std::string label = chart::FormatNumber(hi - step * k, pattern);
         pt.Text(c.PlotRight + 5 + (40 - pt.Width(label)), y - 6, label, oscpal::Text);
     }
@@ -640,8 +641,9 @@ void OscDirectional(chart::Chart& c, const OscDef& d, char period, const OscDraw
     DrawFrameAndTitle(pt, panel, title);
     // Paper sets the title wider than the screen measures it: the legend keeps clear of both.
     double lx = panel.OscLeft + 2 + pt.Width(title) * 1.25 + 12;
-    for (auto [text, entry] : {std::pair{"+DI ", oscpal::Series1}, std::pair{"-DI ", oscpal::Series2},
-                               std::pair{"ADX ", oscpal::Line1}}) {
+    for (auto [text, entry] :
+         {std::pair{"+DI ", oscpal::Series1}, std::pair{"-DI ", oscpal::Series2},
+          std::pair{"ADX ", oscpal::Line1}}) {
         pt.Text(lx, panel.OscTop + 2, text, entry);
         lx += pt.Width(text) + 6;
     }
@@ -775,9 +777,8 @@ void OscRMO(chart::Chart& c, const OscDef& d, char period, const OscDrawInputs& 
     pt.Text(panel.OscRight + 15, panel.OscBottom - 25 - 6, " -80", oscpal::Text);
 
     const bool whole = in.SecurityFile != nullptr;
-    const CompareResult r =
-        ComputeRMO(whole ? *in.SecurityFile : c.Series, *in.CompareFile, p,
-                   whole ? c.FirstRecord : std::int16_t{1}, c.LastBar() + 1);
+    const CompareResult r = ComputeRMO(whole ? *in.SecurityFile : c.Series, *in.CompareFile, p,
+                                       whole ? c.FirstRecord : std::int16_t{1}, c.LastBar() + 1);
     const double height = panel.OscBottom - 20 - (panel.OscTop + 20);
     double hi = -100000, lo = 100000;
     PositionRing ring(a);
@@ -855,7 +856,8 @@ void OscRMX(chart::Chart& c, const OscDef& d, char period, const OscDrawInputs& 
         double ay = 0;
         if (ring.Add(y, ay)) {
             ++averages;
-            if (i >= p && averages > a && avg.down) pt.Line('L', avg.x, avg.y, x, ay, oscpal::Line2);
+            if (i >= p && averages > a && avg.down)
+                pt.Line('L', avg.x, avg.y, x, ay, oscpal::Line2);
             avg.MoveTo(x, ay);
         }
     }
@@ -867,15 +869,13 @@ void OscRMX(chart::Chart& c, const OscDef& d, char period, const OscDrawInputs& 
     // Frame and title come last on this panel.
     DrawFrameAndTitle(pt, panel,
                       titleStart + "           CenterLine = " +
-                          chart::FormatNumber(lastValue, "0.00") + "  (" + Str(centerValue) +
-                          ")");
+                          chart::FormatNumber(lastValue, "0.00") + "  (" + Str(centerValue) + ")");
 }
 
 // ---- Dispatch ----
 
 OscOutcome ShowOscillator(chart::Chart& chart, std::string_view oscName, char chartPeriod,
-                               const OscDef& def, const OscDrawInputs& in,
-                               platform::Surface& panel) {
+                          const OscDef& def, const OscDrawInputs& in, platform::Surface& panel) {
     const std::string name = platform::Trim(oscName);
     const OscIdentifier* id = FindOscIdentifier(name);
     if (id == nullptr) return OscOutcome::Unknown;
@@ -889,25 +889,39 @@ OscOutcome ShowOscillator(chart::Chart& chart, std::string_view oscName, char ch
         if (periods.empty() || periods[0] == 0) return OscOutcome::NotSet;
     }
     try {
-        if (name == "ATR") OscATR(chart, def, chartPeriod, in, panel);
+        if (name == "ATR")
+            OscATR(chart, def, chartPeriod, in, panel);
         else if (name == "STO" || name == "FX")
             OscStochFX(chart, name, def, chartPeriod, in, panel, false);
-        else if (name == "ROC") OscROC(chart, name, def, chartPeriod, in, panel);
-        else if (name == "RMX") OscRMX(chart, def, chartPeriod, in, panel);
-        else if (name == "RMO") OscRMO(chart, def, chartPeriod, in, panel);
+        else if (name == "ROC")
+            OscROC(chart, name, def, chartPeriod, in, panel);
+        else if (name == "RMX")
+            OscRMX(chart, def, chartPeriod, in, panel);
+        else if (name == "RMO")
+            OscRMO(chart, def, chartPeriod, in, panel);
         else if (name == "R/F") {
             OscROC(chart, name, def, chartPeriod, in, panel);
             OscStochFX(chart, name, def, chartPeriod, in, panel, true);
-        } else if (name == "RSI") OscRSI(chart, def, chartPeriod, in, panel);
-        else if (name == "MACD") OscMACD(chart, def, chartPeriod, in, panel);
-        else if (name == "WMS") OscWilliams(chart, def, chartPeriod, in, panel);
-        else if (name == "ERY") OscElderRay(chart, def, chartPeriod, in, panel);
-        else if (name == "MOM") OscMomentum(chart, def, chartPeriod, in, panel);
-        else if (name == "DM") OscDirectional(chart, def, chartPeriod, in, panel);
-        else if (name == "JHG") OscHolyGrail(chart, def, chartPeriod, in, panel);
-        else if (name == "COP") OscCoppock(chart, def, chartPeriod, in, panel);
-        else if (name == "VTY") OscVolatility(chart, def, chartPeriod, in, panel);
-        else if (name == "OBV") OscOBV(chart, in, panel, false);
+        } else if (name == "RSI")
+            OscRSI(chart, def, chartPeriod, in, panel);
+        else if (name == "MACD")
+            OscMACD(chart, def, chartPeriod, in, panel);
+        else if (name == "WMS")
+            OscWilliams(chart, def, chartPeriod, in, panel);
+        else if (name == "ERY")
+            OscElderRay(chart, def, chartPeriod, in, panel);
+        else if (name == "MOM")
+            OscMomentum(chart, def, chartPeriod, in, panel);
+        else if (name == "DM")
+            OscDirectional(chart, def, chartPeriod, in, panel);
+        else if (name == "JHG")
+            OscHolyGrail(chart, def, chartPeriod, in, panel);
+        else if (name == "COP")
+            OscCoppock(chart, def, chartPeriod, in, panel);
+        else if (name == "VTY")
+            OscVolatility(chart, def, chartPeriod, in, panel);
+        else if (name == "OBV")
+            OscOBV(chart, in, panel, false);
     } catch (const std::bad_alloc&) {
         chart.Stream.Close();
         ShowOscFailure(in.Dialogs, 480, "");

@@ -11,12 +11,12 @@
 namespace kori::osc {
 
 enum class OscOutcome {
-    Drawn,         // the routine ran (it may have stopped early, as its rules say)
-    NotSet,        // its first period is 0: nothing drawn
-    OnPriceChart,  // "PARA", "PARAV": the overlays draw them
-    DailyOnly,     // "RMO" on a weekly or monthly chart: message shown, panel not wanted
-    Unknown,       // no such identifier
-    Failed,        // a run-time failure, shown as the chart shows it
+    Drawn,        // the routine ran (it may have stopped early, as its rules say)
+    NotSet,       // its first period is 0: nothing drawn
+    OnPriceChart, // "PARA", "PARAV": the overlays draw them
+    DailyOnly,    // "RMO" on a weekly or monthly chart: message shown, panel not wanted
+    Unknown,      // no such identifier
+    Failed,       // a run-time failure, shown as the chart shows it
 };
 
 // The dispatcher, the one entry point of the chart window and the CLI: `chart` is the price
@@ -24,8 +24,7 @@ enum class OscOutcome {
 // surface of the oscillator panel. "R/F" draws ROC, then FX over it. Making the panel show
 // and redrawing the price chart short beforehand is the window's part.
 OscOutcome ShowOscillator(chart::Chart& chart, std::string_view oscName, char chartPeriod,
-                               const OscDef& def, const OscDrawInputs& in,
-                               platform::Surface& panel);
+                          const OscDef& def, const OscDrawInputs& in, platform::Surface& panel);
 
 // The routines, each on its own (for the benchmarks and tests). `secondOsc`: drawn over the
 // panel of the first routine of a pair.

@@ -41,23 +41,20 @@ void OscPainter::Dotted(double x1, double y1, double x2, double y2, int entry) {
     screen.SetLineStyle(platform::LineStyle::Dot);
     screen.Line(x1, y1, x2, y2, Col(entry));
     screen.SetLineStyle(platform::LineStyle::Solid);
-    chart.Stream.Shape('V', StreamUnits(x1), StreamY(y1), StreamUnits(x2), StreamY(y2),
-                       Col(entry));
+    chart.Stream.Shape('V', StreamUnits(x1), StreamY(y1), StreamUnits(x2), StreamY(y2), Col(entry));
 }
 
 void OscPainter::Dashed(double x1, double y1, double x2, double y2, int entry) {
     screen.SetLineStyle(platform::LineStyle::Dash);
     screen.Line(x1, y1, x2, y2, Col(entry));
     screen.SetLineStyle(platform::LineStyle::Solid);
-    chart.Stream.Shape('E', StreamUnits(x1), StreamY(y1), StreamUnits(x2), StreamY(y2),
-                       Col(entry));
+    chart.Stream.Shape('E', StreamUnits(x1), StreamY(y1), StreamUnits(x2), StreamY(y2), Col(entry));
 }
 
 void OscPainter::Box(double x1, double y1, double x2, double y2, int entry) {
     screen.SetLineWidth(1);
     screen.Box(x1, y1, x2, y2, Col(entry));
-    chart.Stream.Shape('B', StreamUnits(x1), StreamY(y1), StreamUnits(x2), StreamY(y2),
-                       Col(entry));
+    chart.Stream.Shape('B', StreamUnits(x1), StreamY(y1), StreamUnits(x2), StreamY(y2), Col(entry));
 }
 
 void OscPainter::Text(double x, double y, std::string_view text, int entry) {
@@ -112,8 +109,7 @@ void DrawTitle(OscPainter& p, const OscPanel& panel, std::string_view title) {
     p.Text(screenX, streamX, panel.OscTop + 2, title, oscpal::Text);
 }
 
-void DrawFrameAndTitle(OscPainter& p, const OscPanel& panel, std::string_view title,
-                       bool frame) {
+void DrawFrameAndTitle(OscPainter& p, const OscPanel& panel, std::string_view title, bool frame) {
     if (frame && !panel.SecondOsc)
         p.Box(panel.OscLeft, panel.OscTop, panel.OscRight, panel.OscBottom, oscpal::Frame);
     DrawTitle(p, panel, title);

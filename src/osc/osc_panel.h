@@ -18,8 +18,8 @@ namespace kori::osc {
 
 // Palette entries of the panels.
 namespace oscpal {
-inline constexpr int Frame = 16, Background = 17, Text = 27, Series1 = 38, Series2 = 40,
-                     Line1 = 45, Line2 = 46, PairLine1 = 47, PairLine2 = 48;
+inline constexpr int Frame = 16, Background = 17, Text = 27, Series1 = 38, Series2 = 40, Line1 = 45,
+                     Line2 = 46, PairLine1 = 47, PairLine2 = 48;
 }
 
 // What the caller hands to the drawing of a panel besides the chart and the settings.
@@ -34,8 +34,8 @@ struct OscDrawInputs {
     // The stream the price chart was written to; the panel appends to it. Empty, or
     // RedrawOnly on the chart: nothing is written.
     std::filesystem::path StreamPath;
-    double DisplayScale = 1; // the chart window's "Zoom" / 100
-    double PanelOffset = 0;  // top of the panel within the chart page, in stream units
+    double DisplayScale = 1;         // the chart window's "Zoom" / 100
+    double PanelOffset = 0;          // top of the panel within the chart page, in stream units
     std::string TargetName = "CHTS"; // "ANAL" (the scan window) keeps the price chart clean
     bool SlowStochastic = false;
     bool ShowStochSignals = false; // the start-up words "RM" and "GD": crossing marks on STO
@@ -72,9 +72,7 @@ public:
     // Stream positions keep quarters of a unit, finer than screen or paper can show; a
     // quarter is exact in binary, so the numbers stay short and quick to write.
     static double StreamUnits(double v) { return std::nearbyint(v * 4) / 4; }
-    double StreamY(double y) const {
-        return StreamUnits(y / m_in.DisplayScale + m_in.PanelOffset);
-    }
+    double StreamY(double y) const { return StreamUnits(y / m_in.DisplayScale + m_in.PanelOffset); }
 
     void Line(char letter, double x1, double y1, double x2, double y2, int entry);
     void Dotted(double x1, double y1, double x2, double y2, int entry); // "V"

@@ -12,7 +12,9 @@ public:
         : m_whole(whole), m_top(top), m_height(height) {}
 
     // Only the band is cleared, in the back colour given to it.
-    void Clear() override { m_whole.FilledBox(0, m_top, m_whole.ScaleWidth(), m_top + m_height, m_back); }
+    void Clear() override {
+        m_whole.FilledBox(0, m_top, m_whole.ScaleWidth(), m_top + m_height, m_back);
+    }
     void SetBackColour(Colour c) override {
         m_back = c;
         m_whole.SetBackColour(c);

@@ -27,7 +27,8 @@ done
 # RSI with period 3: the window ends one bar before the bar in hand, holds two differences and
 # is divided by 3; a window without a fall keeps the figure before it.
 "$kori" bars KRM "${k[@]}" --last 120 | tail -n +3 | awk '{print $5}' >"$root/closes"
-"$kori" indicator RSI KRM "${k[@]}" --last 120 --set RsiP=3 --csv | tail -n +2 | cut -d, -f3 >"$root/rsi"
+"$kori" indicator RSI KRM "${k[@]}" --last 120 --set RsiP=3 --csv | tail -n +2 |
+  cut -d, -f3 >"$root/rsi"
 awk -v P=3 'NR==FNR { c[n++] = $1; next }
   { i = FNR - 1; want = ""
     if (i >= P) {
@@ -39,19 +40,26 @@ awk -v P=3 'NR==FNR { c[n++] = $1; next }
       if (ad != 0) { last = 100 - 100 / (1 + au / ad); have = 1 }
       if (have) want = last
     }
-    if ((want == "") != ($1 == "")) { print "bar " i ": want [" want "] got [" $1 "]"; bad = 1 }
-    else if (want != "" && (want - $1 > 0.01 || $1 - want > 0.01)) { print "bar " i ": " want " vs " $1; bad = 1 }
+    if ((want == "") != ($1 == "")) {
+      print "bar " i ": want [" want "] got [" $1 "]"; bad = 1
+    } else if (want != "" && (want - $1 > 0.01 || $1 - want > 0.01)) {
+      print "bar " i ": " want " vs " $1; bad = 1
+    }
   }
   END { exit bad }' "$root/closes" "$root/rsi"
 
 # --set changes one key for the run: RSI 9 has its first figure no earlier than bar 9.
-first=$("$kori" indicator RSI KRM "${k[@]}" --set RsiP=9 --csv | awk -F, 'NR > 1 && $3 != "" && !seen { print $1; seen = 1 }')
+first=$("$kori" indicator RSI KRM "${k[@]}" --set RsiP=9 --csv |
+  awk -F, 'NR > 1 && $3 != "" && !seen { print $1; seen = 1 }')
 [ "$first" -ge 9 ] || { echo "RSI 9 starts at $first"; exit 1; }
-if "$kori" indicator RSI KRM "${k[@]}" --set NoSuchKey=1 --csv 2>/dev/null; then echo "bad key accepted"; exit 1; fi
+if "$kori" indicator RSI KRM "${k[@]}" --set NoSuchKey=1 --csv 2>/dev/null; then
+  echo "bad key accepted"; exit 1
+fi
 if "$kori" indicator PARA KRM "${k[@]}" --csv 2>/dev/null; then echo "PARA accepted"; exit 1; fi
 
 # The panel under the price chart: in the stream after the price chart, and in the picture.
-"$kori" chart KRM "${k[@]}" --osc RSI --png "$root/rsi.png" --pdf "$root/rsi.pdf" --stream "$root/rsi.cht" 2>/dev/null
+"$kori" chart KRM "${k[@]}" --osc RSI --png "$root/rsi.png" --pdf "$root/rsi.pdf" \
+  --stream "$root/rsi.cht" 2>/dev/null
 grep -q 'Relative Strength Index Oscillator ( 14 Period)' "$root/rsi.cht"
 grep -q '%PDF' <(head -c 4 "$root/rsi.pdf")
 "$kori" chart KRM "${k[@]}" --png "$root/plain.png" 2>/dev/null

@@ -18,7 +18,8 @@ namespace {
 
 platform::Palette NumberedPalette() {
     platform::Palette p{};
-    for (std::size_t i = 0; i < p.size(); ++i) p[i] = static_cast<platform::Colour>(i);
+    for (std::size_t i = 0; i < p.size(); ++i)
+        p[i] = static_cast<platform::Colour>(i);
     return p;
 }
 
@@ -122,8 +123,7 @@ TEST(OscPanelTest, StreamGoesUnderThePriceChartAtTheDisplayScale) {
     rig.def.RsiP = 14;
     rig.in.DisplayScale = 2;
     rig.in.PanelOffset = 500;
-    EXPECT_EQ(ShowOscillator(rig.chart, "RSI", 'A', rig.def, rig.in, rig.panel),
-              OscOutcome::Drawn);
+    EXPECT_EQ(ShowOscillator(rig.chart, "RSI", 'A', rig.def, rig.in, rig.panel), OscOutcome::Drawn);
     const auto lines = rig.Stream();
     ASSERT_GE(lines.size(), 2u);
     // Panel 4 to 216 on the screen: 4 / 2 + 500 and 216 / 2 + 500 in the stream.
@@ -276,7 +276,8 @@ TEST(OscPanelTest, NoVolumeDataMessage) {
     ShowOscillator(rig.chart, "OBV", 'A', rig.def, rig.in, rig.panel);
     EXPECT_TRUE(AnyTextEndsWith(rig.panel, "No Volume Data"));
     bool streamed = false;
-    for (const auto& l : rig.Stream()) streamed |= l == "T, 8.25, 7, 34,No Volume Data, 27";
+    for (const auto& l : rig.Stream())
+        streamed |= l == "T, 8.25, 7, 34,No Volume Data, 27";
     EXPECT_TRUE(streamed);
 }
 
@@ -323,14 +324,16 @@ TEST(OscPanelTest, ZeroClosesAndPeriodsLongerThanTheChart) {
     // its frame; with the long periods none has a line, except the Volatility bars, which
     // stand from bar 0 whatever the period of their mean.
     auto zeros = Rising(60);
-    for (int i : {0, 7, 8, 30}) zeros.ChartBars[static_cast<std::size_t>(i)].Close = 0;
+    for (int i : {0, 7, 8, 30})
+        zeros.ChartBars[static_cast<std::size_t>(i)].Close = 0;
     for (const auto* name : {"ATR", "STO", "FX", "ROC", "R/F", "RSI", "MACD", "WMS", "ERY", "MOM",
                              "DM", "JHG", "COP", "VTY", "OBV"}) {
         for (bool longPeriods : {false, true}) {
             PanelRig rig(zeros);
             for (const auto& k : OscPeriodKeys())
-                rig.def.*k.DailyField =
-                    longPeriods ? std::int16_t{300} : k.DefaultDaily ? k.DefaultDaily : std::int16_t{5};
+                rig.def.*k.DailyField = longPeriods      ? std::int16_t{300}
+                                        : k.DefaultDaily ? k.DefaultDaily
+                                                         : std::int16_t{5};
             EXPECT_EQ(ShowOscillator(rig.chart, name, 'A', rig.def, rig.in, rig.panel),
                       OscOutcome::Drawn)
                 << name;
@@ -338,8 +341,9 @@ TEST(OscPanelTest, ZeroClosesAndPeriodsLongerThanTheChart) {
             if (longPeriods && std::string_view(name) != "VTY")
                 EXPECT_TRUE(LinesIn(rig.panel, 45).empty()) << name;
             if (!longPeriods && std::string_view(name) != "OBV")
-                EXPECT_FALSE(LinesIn(rig.panel, std::string_view(name) == "R/F" ? 47
-                                                : std::string_view(name) == "ERY" ? 38 : 45)
+                EXPECT_FALSE(LinesIn(rig.panel, std::string_view(name) == "R/F"   ? 47
+                                                : std::string_view(name) == "ERY" ? 38
+                                                                                  : 45)
                                  .empty())
                     << name;
         }
@@ -411,8 +415,14 @@ TEST(OscPanelTest, WilliamsShowsTheMeanOfThreePositions) {
     // 14 + %R x 1.92 rounded the positions are 14, 206, 206, 110, 14, 142, and their
     // three-bar means 142, 174, 110, 89 at bars 4 to 7. The line joins the means from the
     // third on.
-    PanelRig rig(test::HlcBars({{10, 8, 9}, {11, 9, 10}, {12, 10, 12}, {12, 10, 10},
-                                {11, 9, 9}, {13, 9, 11}, {13, 11, 13}, {14, 12, 12}}));
+    PanelRig rig(test::HlcBars({{10, 8, 9},
+                                {11, 9, 10},
+                                {12, 10, 12},
+                                {12, 10, 10},
+                                {11, 9, 9},
+                                {13, 9, 11},
+                                {13, 11, 13},
+                                {14, 12, 12}}));
     rig.def.WmsA = 2;
     ShowOscillator(rig.chart, "WMS", 'A', rig.def, rig.in, rig.panel);
     const auto segs = LinesIn(rig.panel, 45);
@@ -422,7 +432,7 @@ TEST(OscPanelTest, WilliamsShowsTheMeanOfThreePositions) {
     // "o/b" at the top tenth of Span, "o/s" at the bottom tenth.
     const auto refs = LinesIn(rig.panel, 16);
     ASSERT_EQ(refs.size(), 2u);
-    EXPECT_EQ(refs[0][1], 33); // 14 + 19.2
+    EXPECT_EQ(refs[0][1], 33);  // 14 + 19.2
     EXPECT_EQ(refs[1][1], 187); // 14 + 172.8
 }
 
@@ -432,10 +442,12 @@ TEST(OscPanelTest, CoppockAndObvStepAfterTheirTest) {
     PanelRig rig(s);
     ShowOscillator(rig.chart, "OBV", 'A', rig.def, rig.in, rig.panel);
     std::vector<Seg> obv = LinesIn(rig.panel, 38);
-    for (const auto& seg : LinesIn(rig.panel, 40)) obv.push_back(seg);
+    for (const auto& seg : LinesIn(rig.panel, 40))
+        obv.push_back(seg);
     ASSERT_FALSE(obv.empty());
     double leftmost = 1e9;
-    for (const auto& seg : obv) leftmost = std::min(leftmost, seg[0]);
+    for (const auto& seg : obv)
+        leftmost = std::min(leftmost, seg[0]);
     EXPECT_EQ(leftmost, 5); // bar 1
 }
 
@@ -457,7 +469,8 @@ TEST(OscPanelTest, SlowStochasticSecondLineBeginsAfterBothPeriods) {
     rig.panel.ClearCalls();
     rig.in.SlowStochastic = true;
     ShowOscillator(rig.chart, "STO", 'A', rig.def, rig.in, rig.panel);
-    EXPECT_TRUE(AnyTextEndsWith(rig.panel, "SLOW Stochastic Oscillator (K= 5 Period  D= 3 Period)"));
+    EXPECT_TRUE(
+        AnyTextEndsWith(rig.panel, "SLOW Stochastic Oscillator (K= 5 Period  D= 3 Period)"));
     // Slow: the smoothed line leads in the first colour; the second smoothing joins after
     // K + D bars, from bar 8 to bar 9 (x 21 to 23).
     EXPECT_EQ(LinesIn(rig.panel, 45).front()[2], 19);
@@ -488,12 +501,14 @@ TEST(OscPanelTest, RateOfChangeOnItsSymmetricScaleByHand) {
     EXPECT_TRUE(AnyTextEndsWith(rig.panel, "[-80%]"));
     EXPECT_TRUE(AnyTextEndsWith(rig.panel, "[Rate of Change Oscillator ( 1 Period)   2 Ave]"));
     // The line from bar 2 on, from the bar before.
-    EXPECT_EQ(LinesIn(rig.panel, 45), (std::vector<Seg>{{7, 110, 9, 33}, {9, 33, 11, 206},
-                                                        {11, 206, 13, 206}, {13, 206, 15, 33}}));
+    EXPECT_EQ(LinesIn(rig.panel, 45),
+              (std::vector<Seg>{
+                  {7, 110, 9, 33}, {9, 33, 11, 206}, {11, 206, 13, 206}, {13, 206, 15, 33}}));
     // The average of the last two positions, rounded half to even: 110, 71.5, 119.5, 206,
     // 119.5 -> 110, 72, 120, 206, 120, joined from the second average on.
-    EXPECT_EQ(LinesIn(rig.panel, 46), (std::vector<Seg>{{7, 110, 9, 72}, {9, 72, 11, 120},
-                                                        {11, 120, 13, 206}, {13, 206, 15, 120}}));
+    EXPECT_EQ(LinesIn(rig.panel, 46),
+              (std::vector<Seg>{
+                  {7, 110, 9, 72}, {9, 72, 11, 120}, {11, 120, 13, 206}, {13, 206, 15, 120}}));
 }
 
 } // namespace
