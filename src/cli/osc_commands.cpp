@@ -174,6 +174,8 @@ void RunIndicator(CliContext& ctx, const IndicatorOptions& o) {
     in.FirstRecord = q.FirstRecord;
     app::LoadedCompareFile compare;
     std::optional<store::ChartSeries> own;
+    // RMO pairs records, not bars: on weekly and monthly bars it has no meaning.
+    if (name == "RMO" && o.period != "A") throw CliError{"RMO only available on Daily Charts"};
     if (name == "RMO" || name == "RMX") {
         compare = app::LoadCompareFile(session, def.CompFile);
         if (compare.CompareCode.empty())

@@ -56,6 +56,9 @@ if "$kori" indicator RSI KRM "${k[@]}" --set NoSuchKey=1 --csv 2>/dev/null; then
   echo "bad key accepted"; exit 1
 fi
 if "$kori" indicator PARA KRM "${k[@]}" --csv 2>/dev/null; then echo "PARA accepted"; exit 1; fi
+if "$kori" indicator RMO KRM "${k[@]}" --period W --csv 2>/dev/null; then
+  echo "weekly RMO exported"; exit 1
+fi
 
 # The panel under the price chart: in the stream after the price chart, and in the picture.
 "$kori" chart KRM "${k[@]}" --osc RSI --png "$root/rsi.png" --pdf "$root/rsi.pdf" \
