@@ -1,9 +1,9 @@
 // Oscillator computations over 30,000 daily bars, at the default periods and at period 200:
 // each routine alone, all seventeen together, and the same through the table entry point.
-// Each routine returns fresh arrays of about 1 to 5 MB; between routines of different sizes
-// glibc's default heap trimming gives that memory back, so the loop of all seventeen pays a
-// first-touch page fault per page again on every pass. Running with
-// GLIBC_TUNABLES=glibc.malloc.trim_threshold=1073741824 shows the computation alone.
+// Each routine returns fresh arrays of about 1 to 5 MB; with glibc's default heap trimming
+// that memory goes back to the system between routines and every pass pays a page fault a
+// page again. The programs keep freed memory for reuse (platform/heap.h), and so does this
+// benchmark; --default-heap measures the library's default behaviour instead.
 #include "osc/atr_volatility_obv.h"
 #include "osc/compare_osc.h"
 #include "osc/directional.h"
@@ -13,6 +13,7 @@
 #include "osc/rsi.h"
 #include "osc/stoch_fx.h"
 #include "osc/williams_holy_grail.h"
+#include "platform/heap.h"
 
 #include <benchmark/benchmark.h>
 
@@ -20,6 +21,7 @@
 #include <cstdint>
 #include <random>
 #include <string_view>
+#include <cstring>
 
 namespace {
 
@@ -162,4 +164,20 @@ const int kRegistered = [] {
 
 } // namespace
 
-BENCHMARK_MAIN();
+int main(int argc, char** argv) {
+    bool defaultHeap = false;
+    int kept = 1;
+    for (int i = 1; i < argc; ++i) {
+        if (std::strcmp(argv[i], "--default-heap") == 0)
+            defaultHeap = true;
+        else
+            argv[kept++] = argv[i];
+    }
+    argc = kept;
+    if (!defaultHeap) kori::platform::KeepFreedMemoryForReuse();
+    benchmark::Initialize(&argc, argv);
+    if (benchmark::ReportUnrecognizedArguments(argc, argv)) return 1;
+    benchmark::RunSpecifiedBenchmarks();
+    benchmark::Shutdown();
+    return 0;
+}

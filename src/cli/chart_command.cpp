@@ -6,6 +6,7 @@
 #include "chart/swing.h"
 #include "cli/cli_context.h"
 #include "cli/gui_app.h"
+#include "cli/osc_chart.h"
 #include "gui/paint/pdf_printer.h"
 #include "gui/paint/qt_surface.h"
 #include "platform/date_text.h"
@@ -39,6 +40,7 @@ struct ChartOptions {
     std::string bands, swing;
     int reversal = 0;
     float boxValue = 0;
+    OscChartOptions osc;
 };
 
 void ApplySwing(const std::string& text, app::ChartJob& job) {
@@ -148,13 +150,14 @@ void Run(CliContext& ctx, const ChartOptions& o) {
     ApplyOverlays(o, job);
     chart::PrinterPage page;
     job.Page = &page;
+    PreparePanelPage(job, h, o.osc);
 
     chart::Chart c;
     platform::Status built;
     if (!o.png.empty() || !o.pdf.empty()) EnsureGuiApplication();
     if (!o.svg.empty()) {
         platform::SvgSurface area(w, h);
-        built = app::BuildSecurityChart(session, job, c, area);
+        built = BuildChartWithPanel(session, job, c, area, o.osc);
         if (built) {
             if (auto s = area.Save(o.svg); !s) throw CliError{s.message()};
         }
@@ -162,11 +165,11 @@ void Run(CliContext& ctx, const ChartOptions& o) {
     if (o.png.empty() && o.svg.empty()) {
         // Numbers, stream or page only: the chart is built on a surface that draws nothing.
         platform::RecordingSurface area(w, h);
-        built = app::BuildSecurityChart(session, job, c, area);
+        built = BuildChartWithPanel(session, job, c, area, o.osc);
     }
     if (built && !o.png.empty()) {
         gui::ImageSurface area(w, h);
-        built = app::BuildSecurityChart(session, job, c, area);
+        built = BuildChartWithPanel(session, job, c, area, o.osc);
         const QImage& picture = area.Finish();
         if (built && !o.png.empty()) {
             if (auto s = gui::SavePng(picture, o.png); !s) throw CliError{s.message()};
@@ -222,6 +225,11 @@ void AddChartCommand(CLI::App& app, CliContext& ctx) {
         ->check(CLI::Range(1, 20));
     cmd->add_option("--box-value", o->boxValue, "Point-and-figure box value (automatic scale)")
         ->check(CLI::PositiveNumber);
+    cmd->add_option("--osc", o->osc.osc, "Oscillator panel under the price chart (RSI, MACD, ...)")
+        ->option_text("NAME");
+    cmd->add_flag("--slow", o->osc.slow, "Slow stochastic with --osc STO");
+    cmd->add_option("--set", o->osc.sets, "Override one OscDef key for this run, such as RsiP=9")
+        ->option_text("KEY=VALUE");
     cmd->callback([&ctx, o] { Run(ctx, *o); });
 }
 

@@ -50,5 +50,6 @@ void AddListsCommand(CLI::App& app, CliContext& ctx);
 void AddPlayCommand(CLI::App& app, CliContext& ctx);
 void AddChartCommand(CLI::App& app, CliContext& ctx);
 void AddScaleCommand(CLI::App& app, CliContext& ctx);
+void AddIndicatorCommand(CLI::App& app, CliContext& ctx);
 
 } // namespace kori::cli

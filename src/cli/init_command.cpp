@@ -4,6 +4,7 @@
 #include "app/sample_library.h"
 #include "app/session.h"
 #include "app/start_up.h"
+#include "cli/osc_chart.h"
 #include "platform/files.h"
 
 #include <CLI/CLI.hpp>
@@ -34,6 +35,7 @@ void AddInitCommand(CLI::App& app, CliContext& ctx) {
             auto st = app::MakeSampleLibrary(f.SystemFolder, f.DataFolder,
                                              session.services().settings, summary);
             if (!st) throw CliError{st.message()};
+            WriteSampleOscSettings(session);
             std::cout << "Sample library: " << summary.Securities << " securities, "
                       << summary.Records << " daily records to " << summary.LastDate << " in "
                       << f.DataFolder << "\n";

@@ -1,11 +1,13 @@
 // kori: the command-line tool over the charting core.
 #include "cli/cli_context.h"
+#include "platform/heap.h"
 
 #include <CLI/CLI.hpp>
 
 #include <iostream>
 
 int main(int argc, char** argv) {
+    kori::platform::KeepFreedMemoryForReuse();
     CLI::App app{"kori - KORI Charting from the command line"};
     app.require_subcommand(1);
     app.fallthrough(); // global options may follow the subcommand: kori names --root DIR
@@ -23,6 +25,7 @@ int main(int argc, char** argv) {
     kori::cli::AddPlayCommand(app, ctx);
     kori::cli::AddChartCommand(app, ctx);
     kori::cli::AddScaleCommand(app, ctx);
+    kori::cli::AddIndicatorCommand(app, ctx);
 
     try {
         app.parse(argc, argv);

@@ -7,7 +7,7 @@ WilliamsResult ComputeWilliams(const store::ChartSeries& series, std::int16_t pe
     const int n = BarCount(series);
     WilliamsResult result;
     result.r.assign(static_cast<std::size_t>(n), std::nullopt);
-    if (period <= 0 || n < period) return result;
+    if (period <= 0 || n <= period) return result;
 
     // Zeros are skipped: a bar without a figure stands as the starting value, which never wins.
     const bool closeOnly = recordType >= 1 && recordType <= 3;
@@ -22,7 +22,8 @@ WilliamsResult ComputeWilliams(const store::ChartSeries& series, std::int16_t pe
     }
     const std::vector<float> hi = WindowMax(hiC, period);
     const std::vector<float> lo = WindowMin(loC, period);
-    for (std::size_t i = static_cast<std::size_t>(period) - 1; i < hi.size(); ++i) {
+    // The first bar is P, though the window of bar P - 1 would already be full.
+    for (std::size_t i = static_cast<std::size_t>(period); i < hi.size(); ++i) {
         const float range = hi[i] - lo[i];
         if (hi[i] == 0 || range == 0) continue;
         result.r[i] = (hi[i] - series.ChartBars[i].Close) / range * 100.0f;

@@ -7,7 +7,7 @@
 namespace kori::osc {
 
 struct WilliamsResult {
-    Series<float> r; // from bar P - 1; a window without range (or a high of 0) has none
+    Series<float> r; // from bar P; a window without range (or a high of 0) has none
 };
 struct HolyGrailResult {
     Series<float> col0; // close - 3-bar mean (the first two bars keep their close)

@@ -112,25 +112,28 @@ TEST(StochCompute, FlatWindowAndShortCharts) {
     EXPECT_EQ(Computed(ComputeStochFX(flat, 0, 2, false, 4).k), 0);
 }
 
-// P = 3: %R = (Hi - close) / (Hi - Lo) x 100 over bars i-2..i, zeros skipped.
+// P = 3: %R = (Hi - close) / (Hi - Lo) x 100 over bars i-2..i, zeros skipped, from bar P
+// (bar 2's window is full, but the routine starts one bar later).
 //   bars (H L C): 10 8 9 | 12 9 11 | 11 10 10 | 13 11 12 | 0 0 12
-//   i=2: Hi 12 Lo 8: (12-10)/4 -> 50;  i=3: Hi 13 Lo 9: 1/4 -> 25
+//   i=3: Hi 13 Lo 9: 1/4 -> 25
 //   i=4: bar 4's zeros skipped, Hi 13 Lo 10: 1/3 -> 33.33
 TEST(WilliamsCompute, RawPercentOfTheWindow) {
     const auto bars = HlcBars({{10, 8, 9}, {12, 9, 11}, {11, 10, 10}, {13, 11, 12}, {0, 0, 12}});
     const auto r = ComputeWilliams(bars, 3, 4).r;
-    EXPECT_FALSE(r[1]);
-    EXPECT_FLOAT_EQ(*r[2], 50.0f);
+    EXPECT_FALSE(r[2]);
     EXPECT_FLOAT_EQ(*r[3], 25.0f);
     EXPECT_NEAR(*r[4], 33.3333f, 1e-4);
-    // Closes only: i=2 closes 9 11 10 -> (11-10)/2 -> 50.
-    EXPECT_FLOAT_EQ(*ComputeWilliams(bars, 3, 2).r[2], 50.0f);
+    // Closes only: i=3 closes 11 10 12 -> (12-12)/2 -> 0; highs and lows 1 play no part in
+    // closes 9 12 10 11: i=3 -> (12-11)/2 -> 50.
+    EXPECT_FLOAT_EQ(*ComputeWilliams(bars, 3, 2).r[3], 0.0f);
+    const auto closes = HlcBars({{1, 1, 9}, {1, 1, 12}, {1, 1, 10}, {1, 1, 11}});
+    EXPECT_FLOAT_EQ(*ComputeWilliams(closes, 3, 2).r[3], 50.0f);
 }
 
 TEST(WilliamsCompute, WindowsWithoutRangeAreSkipped) {
     const auto bars = HlcBars({{10, 8, 9}, {12, 9, 11}, {11, 10, 10}});
     EXPECT_EQ(Computed(ComputeWilliams(bars, 1, 3).r), 0); // one close: no range
-    EXPECT_EQ(Computed(ComputeWilliams(bars, 1, 4).r), 3); // one bar's high and low
+    EXPECT_EQ(Computed(ComputeWilliams(bars, 1, 4).r), 2); // one bar's high and low, from bar 1
     EXPECT_EQ(Computed(ComputeWilliams(bars, 4, 4).r), 0);
     EXPECT_EQ(Computed(ComputeWilliams(CloseBars({4, 4, 4}), 2, 4).r), 0);
 }

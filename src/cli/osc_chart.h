@@ -1,0 +1,37 @@
+#pragma once
+// kori chart --osc: the price chart on the top part of the area and the oscillator panel
+// under it, split as the chart window splits them, one stream for both.
+#include "app/chart_service.h"
+#include "app/session.h"
+#include "chart/chart.h"
+#include "osc/osc_settings.h"
+#include "platform/surface.h"
+
+#include <string>
+#include <vector>
+
+namespace kori::cli {
+
+struct OscChartOptions {
+    std::string osc; // empty: the price chart alone
+    bool slow = false;
+    std::vector<std::string> sets; // KEY=VALUE overrides of section OscDef for this run
+};
+
+// Builds the chart of `job` on `area`, with the panel when `o.osc` is set. Throws CliError
+// for an identifier the panel cannot draw.
+platform::Status BuildChartWithPanel(app::Session& session, app::ChartJob& job, chart::Chart& c,
+                                     platform::Surface& area, const OscChartOptions& o);
+
+// The oscillator settings a new sample library starts with: the settings dialog's defaults,
+// ATR at 14, the sample All Ordinaries file to compare with, and colours for the oscillator
+// lines when the colour table has none.
+void WriteSampleOscSettings(app::Session& session);
+
+// "KEY=VALUE" overrides of section OscDef; throws CliError for a key it does not have.
+void ApplyOscSets(osc::OscDef& def, const std::vector<std::string>& sets);
+
+// The page height the printer centres: with a panel, the price chart and the panel.
+void PreparePanelPage(app::ChartJob& job, double areaHeight, const OscChartOptions& o);
+
+} // namespace kori::cli
