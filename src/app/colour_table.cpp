@@ -85,6 +85,17 @@ std::optional<std::string> SchemeFileName(std::string_view scheme) {
     return std::nullopt;
 }
 
+Palette StartingPalette() {
+    Palette p{};
+    for (std::size_t i = 0; i < platform::kStandardColours.size(); ++i)
+        p[i] = platform::kStandardColours[i];
+    p[45] = platform::kStandardColours[10]; // light green
+    p[46] = platform::kStandardColours[14]; // yellow
+    p[47] = platform::kStandardColours[11]; // light cyan
+    p[48] = platform::kStandardColours[13]; // light magenta
+    return p;
+}
+
 Status ApplyColourScheme(std::string_view scheme, const std::string& systemFolder,
                          Palette& palette) {
     const auto name = SchemeFileName(scheme);

@@ -16,6 +16,11 @@ namespace kori::app {
 inline constexpr int kFirstRole = 16;
 inline constexpr int kRoleCount = 32;
 
+// The table a session starts from, before koriclr.dat or a scheme is read: the standard
+// colours, and for the oscillator lines (45 to 48), which the built-in role colours do not
+// reach, colours that show on a dark panel. Whatever a file or scheme gives replaces these.
+platform::Palette StartingPalette();
+
 // The role names in the order the colours window shows them, from entry 16 on.
 const std::array<std::string_view, kRoleCount>& ColourRoleNames();
 

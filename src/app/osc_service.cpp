@@ -1,6 +1,7 @@
 #include "app/osc_service.h"
 
 #include "osc/compare_osc.h"
+#include "osc/osc_identifiers.h"
 #include "platform/files.h"
 #include "platform/text.h"
 #include "store/load_chart_series.h"
@@ -44,6 +45,25 @@ bool SetBool(bool& field, std::string_view value) {
 }
 
 } // namespace
+
+
+platform::Status InstallOscDefaults(Session& session) {
+    if (platform::Trim(session.ini().Read("OscDef", "RsiP")) != platform::kUnknown)
+        return platform::Status::Ok();
+    osc::OscDef def = osc::ReadOscSettings(session.ini());
+    for (const auto& id : osc::OscIdentifiers()) {
+        osc::FillOscDefaults(def, id.OscName, false);
+        osc::FillOscDefaults(def, id.OscName, true);
+    }
+    // The settings window has no ATR period; the chart defaults set it.
+    if (def.AtrD == 0) def.AtrD = 14;
+    if (def.AtrW == 0) def.AtrW = 14;
+    if (def.CompFile.empty() || def.CompFile == platform::kUnknown)
+        def.CompFile = session.folders.DataFolder + "XAO.WDT";
+    if (!osc::WriteOscSettings(session.ini(), def))
+        return platform::Status::Error("Cannot write the oscillator settings to Kori.ini");
+    return platform::Status::Ok();
+}
 
 bool SetOscKey(osc::OscDef& def, std::string_view key, std::string_view value) {
     const std::string k = platform::Trim(key);

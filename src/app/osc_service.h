@@ -25,6 +25,11 @@ struct LoadedCompareFile {
 };
 LoadedCompareFile LoadCompareFile(Session& session, std::string_view compFile);
 
+// A new install has no section OscDef, and every oscillator would read period 0 and draw
+// nothing: the section is written with the settings window's defaults, ATR 14, and the index
+// file XAO.WDT of the data folder to compare with. An existing section is left as it is.
+platform::Status InstallOscDefaults(Session& session);
+
 // Sets one key of section OscDef for this run, by its daily or weekly name ("RsiP", "RsiPW",
 // "CompFile", "FXRev", ...). False for a key the section does not have.
 bool SetOscKey(osc::OscDef& def, std::string_view key, std::string_view value);

@@ -57,7 +57,7 @@ public:
     std::int16_t zoom = 100;
     AdjustmentSettings adjustments;
     SubListSettings subLists;
-    platform::Palette palette{};
+    platform::Palette palette = StartingPalette();
     PrinterColours printer;
     CommandLineSwitches switches;
     bool pathsMissing = false; // set when the SystemFolder is blank, until paths are saved

@@ -1,6 +1,7 @@
 #include "app/start_up.h"
 
 #include "app/folder_config.h"
+#include "app/osc_service.h"
 #include "platform/files.h"
 #include "platform/text.h"
 
@@ -78,6 +79,7 @@ void InitialiseSession(Session& session, std::string_view commandLine) {
     MakeChartFolders(session);
     LoadColours(session);
     LoadPrinterColours(session);
+    (void)InstallOscDefaults(session); // a failed write leaves the oscillators unset, no worse
     session.ReadSettings();
     session.pathsMissing = Trim(session.folders.SystemFolder).empty();
 }

@@ -1,10 +1,10 @@
 #include "cli/cli_context.h"
 
 #include "app/folder_config.h"
+#include "app/osc_service.h"
 #include "app/sample_library.h"
 #include "app/session.h"
 #include "app/start_up.h"
-#include "cli/osc_chart.h"
 #include "platform/files.h"
 
 #include <CLI/CLI.hpp>
@@ -25,6 +25,7 @@ void AddInitCommand(CLI::App& app, CliContext& ctx) {
                                    f.PFMBackUp, f.DownloadFolder, f.ChtMiscFolder, f.ChtSaveFolder})
             if (!platform::CreateFolder(folder)) throw CliError{"Cannot create " + folder};
         app::WritePaths(session);
+        if (auto st = app::InstallOscDefaults(session); !st) throw CliError{st.message()};
         // Colours as start-up has them: an existing koriclr.dat stays, else the "Black" scheme.
         app::LoadColours(session);
         if (!platform::FileExists(platform::ResolveIn(f.SystemFolder, "koriclr.dat")))
@@ -35,7 +36,6 @@ void AddInitCommand(CLI::App& app, CliContext& ctx) {
             auto st = app::MakeSampleLibrary(f.SystemFolder, f.DataFolder,
                                              session.services().settings, summary);
             if (!st) throw CliError{st.message()};
-            WriteSampleOscSettings(session);
             std::cout << "Sample library: " << summary.Securities << " securities, "
                       << summary.Records << " daily records to " << summary.LastDate << " in "
                       << f.DataFolder << "\n";

@@ -23,11 +23,6 @@ struct OscChartOptions {
 platform::Status BuildChartWithPanel(app::Session& session, app::ChartJob& job, chart::Chart& c,
                                      platform::Surface& area, const OscChartOptions& o);
 
-// The oscillator settings a new sample library starts with: the settings dialog's defaults,
-// ATR at 14, the sample All Ordinaries file to compare with, and colours for the oscillator
-// lines when the colour table has none.
-void WriteSampleOscSettings(app::Session& session);
-
 // "KEY=VALUE" overrides of section OscDef; throws CliError for a key it does not have.
 void ApplyOscSets(osc::OscDef& def, const std::vector<std::string>& sets);
 

@@ -38,34 +38,6 @@ std::string CheckedOscName(const std::string& text) {
 
 } // namespace
 
-void WriteSampleOscSettings(app::Session& session) {
-    osc::OscDef def = osc::ReadOscSettings(session.ini());
-    for (const auto& id : osc::OscIdentifiers()) {
-        osc::FillOscDefaults(def, id.OscName, false);
-        osc::FillOscDefaults(def, id.OscName, true);
-    }
-    // The settings dialog has no ATR period; the chart defaults set it.
-    if (def.AtrD == 0) def.AtrD = 14;
-    if (def.AtrW == 0) def.AtrW = 14;
-    if (def.CompFile.empty() || def.CompFile == "unknown")
-        def.CompFile = session.folders.DataFolder + "XAO.WDT";
-    if (!osc::WriteOscSettings(session.ini(), def))
-        throw CliError{"Cannot write the oscillator settings to Kori.ini"};
-
-    // Without scheme files the built-in colours stop at entry 44, leaving the oscillator
-    // lines (45 to 48) black on the black panel; the sample gives them colours of their own.
-    auto& pal = session.palette;
-    if (pal[45] == 0 && pal[46] == 0 && pal[47] == 0 && pal[48] == 0) {
-        pal[45] = platform::kStandardColours[10]; // light green
-        pal[46] = platform::kStandardColours[14]; // yellow
-        pal[47] = platform::kStandardColours[11]; // light cyan
-        pal[48] = platform::kStandardColours[13]; // light magenta
-        const auto file = platform::ResolveIn(session.folders.SystemFolder, "koriclr.dat");
-        if (!app::WriteColourFile(file.string(), pal))
-            throw CliError{"Cannot write " + file.string()};
-    }
-}
-
 void ApplyOscSets(osc::OscDef& def, const std::vector<std::string>& sets) {
     for (const std::string& set : sets) {
         const auto eq = set.find('=');

@@ -1,3 +1,4 @@
+#include "app/colour_table.h"
 #include "app/folder_config.h"
 #include "app/instance_lock.h"
 #include "app/start_up.h"
@@ -57,6 +58,25 @@ TEST_F(StartUp, MissingIniSetsTheFoldersFromTheRootAndWritesThem) {
     EXPECT_EQ(root.Read("koriprn.dat"), std::string("\x00\x00\x01\x00", 4));
     EXPECT_EQ(session.zoom, 100);
     EXPECT_FALSE(session.pathsMissing);
+    // The oscillator lines, beyond the built-in role colours, still show on a dark panel.
+    EXPECT_NE(session.palette[45], session.palette[0]);
+    kori::platform::Palette written{};
+    ASSERT_TRUE(ReadColourFile(sys + "koriclr.dat", written));
+    EXPECT_EQ(written[45], session.palette[45]);
+    // Oscillator settings are there to draw with, and the index is the comparison file.
+    EXPECT_EQ(Ini("OscDef", "RsiP"), "14");
+    EXPECT_EQ(Ini("OscDef", "CompFile"), sys + "data/XAO.WDT");
+}
+
+TEST_F(StartUp, OscillatorSettingsOfAnExistingInstallAreLeftAsTheyAre) {
+    KnownInstall();
+    Set("OscDef", "RsiP", "0"); // switched off on purpose
+    Set("OscDef", "StochK", "9");
+    dialogs.QueueAnswer(Answer::No);
+    InitialiseSession(session, "");
+    EXPECT_EQ(Ini("OscDef", "RsiP"), "0");
+    EXPECT_EQ(Ini("OscDef", "StochK"), "9");
+    EXPECT_EQ(Ini("OscDef", "Md1"), "unknown");
 }
 
 TEST_F(StartUp, AKnownInstallKeepsItsPathsAndAStaleDriveResetsThem) {

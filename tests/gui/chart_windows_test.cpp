@@ -29,6 +29,7 @@
 #include <gtest/gtest.h>
 
 #include <cstdlib>
+#include <fstream>
 
 using namespace kori;
 
@@ -283,11 +284,13 @@ TEST_F(Road, FibonacciTimeLinesByTradingOrCalendarDays) {
 TEST_F(Road, TheOscillatorPanelIsASeamThatShowsOnlyWithAnOscillatorChosen) {
     TypeCode("krm");
     int painted = 0;
-    chts()->SetOscillatorPainter([&](chart::Chart& c, const chart::ChartRequest& r, platform::Surface& panel) {
+    chts()->SetOscillatorPainter([&](chart::Chart& c, const app::ChartJob& job, platform::Surface&,
+                                     platform::Surface& panel) {
         ++painted;
         EXPECT_GT(c.LastBar(), 0);
-        EXPECT_EQ(r.AutoOscCode, "RSI");
+        EXPECT_EQ(job.Request.AutoOscCode, "RSI");
         panel.FilledBox(0, 0, 50, 50, 0xFF);
+        return true;
     });
     Key("ref");
     EXPECT_EQ(painted, 0);
@@ -298,6 +301,31 @@ TEST_F(Road, TheOscillatorPanelIsASeamThatShowsOnlyWithAnOscillatorChosen) {
     EXPECT_EQ(painted, 1);
     EXPECT_TRUE(chts()->picture2()->isVisible());
     EXPECT_FALSE(chts()->picture2()->picture().isNull());
+}
+
+TEST_F(Road, AChosenOscillatorDrawsItsPanelUnderTheChartAndTheParabolicNone) {
+    TypeCode("krm");
+    auto& req = charts()->state().Request;
+    req.AutoOsc = true;
+    req.AutoOscCode = "RSI";
+    Key("ref");
+    ASSERT_TRUE(chts()->picture2()->isVisible());
+    // The panel lies below the price chart in the one stream: some line starts below its area.
+    std::filesystem::copy_file(app::ChartStreamPath(s.session), "/tmp/dbg.tmp", std::filesystem::copy_options::overwrite_existing);
+    std::ifstream stream(app::ChartStreamPath(s.session));
+    const double priceHeight = chts()->picture1()->picture().height();
+    bool below = false;
+    for (std::string l; std::getline(stream, l);) {
+        const auto comma = l.find(',', 2); // y1 follows the second comma
+        if (l.size() > 2 && l[0] == 'H' && comma != std::string::npos &&
+            std::atof(l.c_str() + comma + 1) > priceHeight)
+            below = true;
+    }
+    EXPECT_TRUE(below) << priceHeight << " " << app::ChartStreamPath(s.session);
+
+    req.AutoOscCode = "PARA";
+    Key("ref");
+    EXPECT_FALSE(chts()->picture2()->isVisible());
 }
 
 TEST_F(Road, ScrollAndStepsMoveTheEndOfTheChart) {

@@ -419,12 +419,14 @@ TEST_F(SampleRoot, ScalesWriteTheNameRecordAndChart2NamesTheLowerChart) {
 }
 
 TEST_F(SampleRoot, OscillatorSettingsFillDefaultsValidateAndStore) {
+    // Periods never set read 0; the window offers the defaults for them.
+    for (const char* key : {"Md1W", "Md2W", "Md3W", "Md3"}) (void)session.ini().Write("OscDef", key, "0");
     gui::OscFrm w(session, hub, "MACD", 'B', "W");
     EXPECT_EQ(w.windowTitle(), "MACD");
     ASSERT_EQ(w.fieldCount(), 3);
     EXPECT_EQ(w.field(0)->objectName(), "Md1W");
     EXPECT_EQ(w.field(1)->text(), "26");
-    EXPECT_EQ(Ini("OscDef", "Md1W"), "unknown"); // defaults are held only on OK
+    EXPECT_EQ(Ini("OscDef", "Md1W"), "0"); // defaults are held only on OK
     w.field(2)->setText("201");
     Click(w, "cmdOK");
     EXPECT_EQ(Messages(), std::vector<std::string>{" Periods must be between 1 - 200 "});
@@ -460,6 +462,7 @@ TEST_F(SampleRoot, CompareOscillatorsNeedTheirFile) {
 }
 
 TEST_F(SampleRoot, PointAndFigureBoxValueForm) {
+    (void)session.ini().Write("OscDef", "RsiP", "9");
     gui::OscFrm w(session, hub, "RSI", 'P', "A");
     EXPECT_EQ(w.windowTitle(), "Point and Figure");
     EXPECT_EQ(w.fieldCount(), 0);
@@ -476,7 +479,7 @@ TEST_F(SampleRoot, PointAndFigureBoxValueForm) {
     ASSERT_TRUE(w.boxAnswer());
     EXPECT_FALSE(w.boxAnswer()->Auto);
     EXPECT_FLOAT_EQ(w.boxAnswer()->Value, 0.25f);
-    EXPECT_EQ(Ini("OscDef", "RsiP"), "unknown"); // the box form writes no oscillator settings
+    EXPECT_EQ(Ini("OscDef", "RsiP"), "9"); // the box form writes no oscillator settings
 
     gui::OscFrm autoForm(session, hub, "", 'P', "A");
     Click(autoForm, "cmdAuto");

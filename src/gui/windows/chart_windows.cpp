@@ -1,5 +1,8 @@
 #include "gui/windows/chart_windows.h"
 
+#include "app/osc_service.h"
+#include "osc/osc_panel.h"
+
 #include "gui/windows/cht_page.h"
 #include "gui/windows/cht_sel.h"
 #include "gui/windows/chts.h"
@@ -79,6 +82,19 @@ Chts* ChartWindows::EnsureChts() {
     m_chartWindow->setAttribute(Qt::WA_DeleteOnClose);
     connect(c, &Chts::ChartSelectionRequested, this, &ChartWindows::BackToSelection);
     c->SetPrinter(&printer());
+    c->SetOscillatorPainter([this](chart::Chart& chart, const app::ChartJob& job,
+                                   platform::Surface& price, platform::Surface& panel) {
+        auto& session = m_main.session();
+        panel.SetBackColour(session.palette[osc::oscpal::Background]);
+        panel.Clear();
+        app::OscPanelJob p;
+        p.OscName = job.Request.AutoOscCode;
+        p.SlowStochastic = job.Request.AutoOscSlow;
+        p.PanelOffset = price.ScaleHeight();
+        p.PriceSurface = &price;
+        const auto outcome = app::DrawSecurityOscillator(session, job, chart, p, panel);
+        return outcome != osc::OscOutcome::DailyOnly && outcome != osc::OscOutcome::OnPriceChart;
+    });
     // Closing the chart window on its own goes back to the selection it came from.
     connect(m_chartWindow, &QObject::destroyed, this, [this] {
         if (!m_closingAll && m_selWindow && !m_main.ending()) {

@@ -8,6 +8,7 @@
 #include "gui/paint/qt_surface.h"
 #include "gui/services/qt_printer.h"
 #include "gui/widgets/chart_view.h"
+#include "osc/osc_identifiers.h"
 #include "gui/windows/cht_page.h"
 #include "platform/date_text.h"
 #include "platform/files.h"
@@ -44,6 +45,12 @@ namespace {
 QString Q(const std::string& s) { return QString::fromStdString(s); }
 constexpr int kPanes = 5;
 constexpr int kOscPanelHeight = 170;
+
+// The parabolic is chosen as an oscillator but drawn over the bars: no panel for it.
+bool OnPriceChart(const std::string& oscName) {
+    const auto* id = osc::FindOscIdentifier(oscName);
+    return id != nullptr && id->OnPriceChart;
+}
 constexpr int kFibTimeLineEntry = 21;
 // "d/m/yy" for the scroll read-out.
 std::string ShortDate(const std::string& yyyymmdd) {
@@ -280,7 +287,8 @@ bool Chts::Rebuild() {
     const bool longer = req.ChartPeriod != 'A';
     req.AvOnePeriod = longer ? m_state.Defaults.MAPeriod1Long : m_state.Defaults.MAPeriod1Daily;
     req.AvTwoPeriod = longer ? m_state.Defaults.MAPeriod2Long : m_state.Defaults.MAPeriod2Daily;
-    req.SecondPanelShowing = req.AutoOsc && static_cast<bool>(m_oscPainter) && req.ChartStyle != 'P';
+    req.SecondPanelShowing = req.AutoOsc && static_cast<bool>(m_oscPainter) &&
+                             req.ChartStyle != 'P' && !OnPriceChart(req.AutoOscCode);
     const QSize size = AreaSize();
     ImageSurface area(size.width(), size.height());
     app::ChartJob job;
@@ -297,16 +305,23 @@ bool Chts::Rebuild() {
     };
     m_trendEnds.clear();
     m_chart = std::make_unique<chart::Chart>();
-    const auto built = app::BuildSecurityChart(m_session, job, *m_chart, area);
-    m_picture1->SetPicture(area.Finish());
+    auto built = app::BuildSecurityChart(m_session, job, *m_chart, area);
+    bool panelShown = false;
     if (req.SecondPanelShowing && built) {
         ImageSurface panel(size.width(), kOscPanelHeight);
-        m_oscPainter(*m_chart, req, panel);
-        m_picture2->SetPicture(panel.Finish());
-        m_picture2->show();
-    } else {
-        m_picture2->hide();
+        panelShown = m_oscPainter(*m_chart, job, area, panel);
+        if (panelShown) m_picture2->SetPicture(panel.Finish());
     }
+    m_picture2->setVisible(panelShown);
+    if (req.SecondPanelShowing && built && !panelShown) {
+        // The price chart takes the whole area again.
+        req.SecondPanelShowing = job.Request.SecondPanelShowing = false;
+        area.Clear();
+        m_trendEnds.clear();
+        m_chart = std::make_unique<chart::Chart>();
+        built = app::BuildSecurityChart(m_session, job, *m_chart, area);
+    }
+    m_picture1->SetPicture(area.Finish());
     DrawLegend();
     m_oscBox->setCurrentIndex(app::OscChoiceOf(req));
     setWindowTitle(Q(code + "  " + platform::Trim(m_name.Name)));

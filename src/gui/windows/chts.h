@@ -50,11 +50,13 @@ public:
     Chts(app::Session& session, app::ChartState& state, QWidget* parent = nullptr);
     ~Chts() override;
 
-    // Seams for the overlay and oscillator code: drawn on every build. The oscillator painter
-    // draws the panel into Picture2 (its surface is the panel's own area).
+    // Seams for extra drawing: the overlay hook runs on every build; the oscillator painter
+    // draws the panel into Picture2 (`panel` is the panel's own area) and may add to the price
+    // chart (`price`, still open), as the classic MACD lines do. It answers whether the panel
+    // is wanted; when not (RMO on a weekly chart), the price chart is built again on its own.
     using OverlayHook = std::function<void(chart::Chart&, const chart::ChartRequest&, platform::Surface&)>;
-    using OscillatorPainter =
-        std::function<void(chart::Chart&, const chart::ChartRequest&, platform::Surface&)>;
+    using OscillatorPainter = std::function<bool(chart::Chart&, const app::ChartJob&,
+                                                 platform::Surface& price, platform::Surface& panel)>;
     void SetOverlayHook(OverlayHook hook) { m_overlayHook = std::move(hook); }
     void SetOscillatorPainter(OscillatorPainter painter) { m_oscPainter = std::move(painter); }
 
