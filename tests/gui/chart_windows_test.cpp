@@ -9,6 +9,7 @@
 #include "gui/windows/chts.h"
 #include "gui/windows/main_window.h"
 #include "gui/windows/search.h"
+#include "gui/windows/settings_hub.h"
 #include "gui/windows/register_windows.h"
 #include "platform/files.h"
 #include "store/price_file.h"
@@ -311,7 +312,6 @@ TEST_F(Road, AChosenOscillatorDrawsItsPanelUnderTheChartAndTheParabolicNone) {
     Key("ref");
     ASSERT_TRUE(chts()->picture2()->isVisible());
     // The panel lies below the price chart in the one stream: some line starts below its area.
-    std::filesystem::copy_file(app::ChartStreamPath(s.session), "/tmp/dbg.tmp", std::filesystem::copy_options::overwrite_existing);
     std::ifstream stream(app::ChartStreamPath(s.session));
     const double priceHeight = chts()->picture1()->picture().height();
     bool below = false;
@@ -321,11 +321,35 @@ TEST_F(Road, AChosenOscillatorDrawsItsPanelUnderTheChartAndTheParabolicNone) {
             std::atof(l.c_str() + comma + 1) > priceHeight)
             below = true;
     }
-    EXPECT_TRUE(below) << priceHeight << " " << app::ChartStreamPath(s.session);
+    EXPECT_TRUE(below);
 
     req.AutoOscCode = "PARA";
     Key("ref");
     EXPECT_FALSE(chts()->picture2()->isVisible());
+}
+
+TEST_F(Road, SwingAndSettingsWindowsReachTheChartOnShow) {
+    TypeCode("krm");
+    auto& req = charts()->state().Request;
+    req.BarSpacing = 2;
+    auto* swing = chts()->findChild<QAction*>(QStringLiteral("cmSwing"));
+    ASSERT_NE(swing, nullptr);
+    swing->setChecked(true);
+    EXPECT_TRUE(req.SwingOn);
+    EXPECT_EQ(req.ChartStyle, 'B');
+    EXPECT_EQ(req.BarSpacing, 3);
+    EXPECT_EQ(chts()->chart().BarSpacing, 3);
+    swing->setChecked(false);
+    EXPECT_FALSE(req.SwingOn);
+    EXPECT_EQ(req.BarSpacing, 2) << "the spacing in force before comes back";
+
+    // OK in the oscillator settings shows that oscillator under the chart.
+    auto* hub = main.findChild<gui::SettingsHub*>(QStringLiteral("SettingsHub"));
+    ASSERT_NE(hub, nullptr);
+    emit hub->ShowOscillator(QStringLiteral("MACD"));
+    QApplication::processEvents();
+    EXPECT_EQ(req.AutoOscCode, "MACD");
+    EXPECT_TRUE(chts()->picture2()->isVisible());
 }
 
 TEST_F(Road, ScrollAndStepsMoveTheEndOfTheChart) {

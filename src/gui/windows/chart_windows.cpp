@@ -7,6 +7,7 @@
 #include "gui/windows/cht_sel.h"
 #include "gui/windows/chts.h"
 #include "gui/windows/main_window.h"
+#include "gui/windows/settings_windows.h"
 
 #include <QApplication>
 #include <QMdiArea>
@@ -19,6 +20,22 @@ namespace kori::gui {
 
 ChartWindows::ChartWindows(MainWindow& main) : QObject(&main), m_main(main) {
     setObjectName(QStringLiteral("ChartWindows"));
+    // The settings windows change what the chart on show is built from.
+    SettingsHub& hub = Hub(m_main);
+    const auto reload = [this] { m_state.Defaults = chart::LoadChartDefaults(m_main.session().ini()); };
+    const auto rebuild = [this, reload] {
+        reload();
+        if (Chts* c = chts(); c && m_chartWindow->isVisible()) c->Rebuild();
+    };
+    connect(&hub, &SettingsHub::ChartDefaultsSaved, this, reload);
+    connect(&hub, &SettingsHub::RebuildChart, this, rebuild);
+    connect(&hub, &SettingsHub::ColoursChanged, this, rebuild);
+    connect(&hub, &SettingsHub::FontsChanged, this, rebuild);
+    connect(&hub, &SettingsHub::ShowOscillator, this, [this, rebuild](const QString& name) {
+        m_state.Request.AutoOsc = !name.isEmpty();
+        m_state.Request.AutoOscCode = name.toStdString();
+        rebuild();
+    });
 }
 
 ChartWindows::~ChartWindows() = default;
@@ -50,20 +67,22 @@ void ChartWindows::OpenCharts() {
         auto* sel = new ChtSel(m_main.session(), m_state);
         m_selWindow = m_main.mdiArea()->addSubWindow(sel);
         m_selWindow->setAttribute(Qt::WA_DeleteOnClose);
-        sel->SetFolderButton(m_main.session().download.DataService == 3 && m_main.HasAction("DataPaths"));
-        sel->SetDefaultsButton(m_main.HasAction("ChtDef"));
+        sel->SetFolderButton(m_main.session().download.DataService == 3);
+        sel->SetDefaultsButton(true);
         connect(sel, &ChtSel::ShowChartRequested, this, &ChartWindows::ShowChart);
         connect(sel, &ChtSel::CloseRequested, this, &ChartWindows::CloseAll);
         connect(sel, &ChtSel::ChangeFolderRequested, this, [this] {
             const std::string before = m_main.session().folders.DataFolder;
-            m_main.Open("DataPaths");
+            (void)PickDataFolderWindow(m_main);
             if (m_main.session().folders.DataFolder != before)
                 if (ChtSel* s = chtSel()) {
                     s->selection().FolderChanged();
                     s->Load();
                 }
         });
-        connect(sel, &ChtSel::SetDefaultsRequested, this, [this] { m_main.Open("ChtDef"); });
+        connect(sel, &ChtSel::SetDefaultsRequested, this, [this] {
+            OpenChartDefaults(m_main, ChtDef::Caller::ChartSelection);
+        });
         // Placed from the main window's size, as the selection has always sat.
         const QRect area = m_main.mdiArea()->rect();
         m_selWindow->move(static_cast<int>(0.006 * area.width()), static_cast<int>(0.077 * area.height()));

@@ -3,8 +3,10 @@
 #include "app/chart_navigation.h"
 #include "app/chart_window_tools.h"
 #include "app/colour_table.h"
+#include "app/window_rules.h"
 #include "chart/number_format.h"
 #include "chart/saved_chart.h"
+#include "chart/swing.h"
 #include "gui/paint/qt_surface.h"
 #include "gui/services/qt_printer.h"
 #include "gui/widgets/chart_view.h"
@@ -96,6 +98,18 @@ Chts::Chts(app::Session& session, app::ChartState& state, QWidget* parent)
     m_timeLinesCaption = tools->addAction(QStringLiteral("Fib Time Lines - Trading Days"));
     m_timeLinesCaption->setObjectName(QStringLiteral("cmFibTimeKind"));
     connect(m_timeLinesCaption, &QAction::triggered, this, [this] { SetCalendarTimeLines(!m_calendarLines); });
+    QMenu* overlays = menus->addMenu(QStringLiteral("&Overlays"));
+    QAction* mma = overlays->addAction(QStringLiteral("&Multiple Moving Averages"));
+    mma->setObjectName(QStringLiteral("cmMMA"));
+    mma->setCheckable(true);
+    connect(mma, &QAction::toggled, this, [this](bool on) {
+        m_state.Request.MMAOn = on;
+        Rebuild();
+    });
+    QAction* swing = overlays->addAction(QStringLiteral("S&wing Chart"));
+    swing->setObjectName(QStringLiteral("cmSwing"));
+    swing->setCheckable(true);
+    connect(swing, &QAction::toggled, this, [this](bool on) { SetSwing(on); });
     layout->setMenuBar(menus);
 
     BuildToolBar();
@@ -274,6 +288,22 @@ bool Chts::NextChart(int delta) {
     m_haveName = true;
     if (delta != 0) m_state.Request.ByFinishDate = m_state.Request.ByFinishDate && !m_koriScroll->isVisible();
     return Rebuild();
+}
+
+void Chts::SetSwing(bool on) {
+    auto& r = m_state.Request;
+    if (on) {
+        const app::SwingSettings settings = app::ReadSwingSettings(m_session.ini());
+        r.SwingMethod = settings.SwingMethod;
+        r.SwingValue = settings.SwingValue;
+        r.SwingPanel = r.SwingMethod == "NORM"         ? chart::SidePanel::None
+                       : r.SwingMethod == "XPointAuto" ? chart::SidePanel::XPointAuto
+                                                       : chart::SidePanel::Other;
+    } else {
+        r.SwingPanel = chart::SidePanel::None;
+    }
+    m_swingSwitch.Set(r, on);
+    Rebuild();
 }
 
 bool Chts::Rebuild() {

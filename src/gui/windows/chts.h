@@ -7,6 +7,7 @@
 #include "app/chart_service.h"
 #include "chart/chart_tools.h"
 #include "chart/print_chart.h"
+#include "chart/swing.h"
 
 #include <QWidget>
 
@@ -71,6 +72,8 @@ public:
     void SetTool(int mode);
     int toolMode() const { return m_tool; }
     void SetCalendarTimeLines(bool calendar);
+    // Swing lines on or off, by the method and value of the swing settings.
+    void SetSwing(bool on);
 
     // The printer "Printer Setup" shapes, kept for the run; without one each print starts afresh.
     void SetPrinter(QPrinter* printer) { m_printer = printer; }
@@ -155,6 +158,7 @@ private:
     QToolBar* m_toolbar2; // the mouse tools, scroll, print and save
     QComboBox* m_oscBox;
     QAction* m_timeLinesCaption = nullptr;
+    chart::SwingSwitch m_swingSwitch;
     ChartView* m_picture1;
     ChartView* m_picture2;
     ChartView* m_picture4;
