@@ -5,6 +5,7 @@
 #include "app/sample_library.h"
 #include "app/session.h"
 #include "app/start_up.h"
+#include "chart/chart_defaults.h"
 #include "platform/files.h"
 
 #include <CLI/CLI.hpp>
@@ -36,6 +37,10 @@ void AddInitCommand(CLI::App& app, CliContext& ctx) {
             auto st = app::MakeSampleLibrary(f.SystemFolder, f.DataFolder,
                                              session.services().settings, summary);
             if (!st) throw CliError{st.message()};
+            // The sample's charts keep their volume bars inside the volume panel.
+            auto defaults = chart::LoadChartDefaults(session.ini());
+            defaults.LimitVolumeHeight = true;
+            chart::SaveChartDefaults(session.ini(), defaults);
             std::cout << "Sample library: " << summary.Securities << " securities, "
                       << summary.Records << " daily records to " << summary.LastDate << " in "
                       << f.DataFolder << "\n";
