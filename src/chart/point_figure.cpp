@@ -270,6 +270,7 @@ platform::Status DrawPointFigureChart(Chart& c, const DrawInputs& inputs, const 
     ChartPainter p(c, pfIn, surface);
     const float box = SettleBoxValue(c, pfIn, dialogs, RowsOf(c));
     c.ChartCeiling = box; // the ceiling carries the box value from here on
+    c.Map.PreparePointFigure(c.ChartBase, box, c.PlotBottom, pf::CellSize); // for the tools
     PFDrawing pfDraw(p, box);
     DrawHeading(p);
     pfDraw.FrameAndLabels();

@@ -175,6 +175,7 @@ std::int16_t ToY16(double v, std::int16_t fallback) {
 bool PriceMap::Prepare(bool logarithmic, bool lineChart, float chartBase, float chartCeiling,
                        std::int16_t plotTop, std::int16_t plotBottom) {
     m_log = logarithmic;
+    m_boxValue = 0;
     m_base = chartBase;
     m_top = plotTop;
     m_bottom = plotBottom;
@@ -197,7 +198,20 @@ bool PriceMap::Prepare(bool logarithmic, bool lineChart, float chartBase, float 
     return std::isfinite(m_logFactor) && m_logFactor != 0;
 }
 
+void PriceMap::PreparePointFigure(float chartBase, float boxValue, std::int16_t plotBottom,
+                                  std::int16_t cellSize) {
+    m_log = false;
+    m_base = chartBase;
+    m_bottom = plotBottom;
+    m_boxValue = boxValue;
+    m_cellSize = cellSize;
+}
+
 std::int16_t PriceMap::PriceToY(double value) const {
+    if (m_boxValue > 0) {
+        const double boxes = std::nearbyint((value - m_base) / static_cast<double>(m_boxValue));
+        return ToY16(m_bottom - m_cellSize * boxes, m_bottom);
+    }
     if (!m_log) {
         const float y =
             static_cast<float>(m_bottom) - (static_cast<float>(value) - m_base) / m_unitsPerY;
@@ -215,6 +229,10 @@ std::int16_t PriceMap::PriceToY(double value) const {
 }
 
 double PriceMap::YToPrice(double y) const {
+    if (m_boxValue > 0) {
+        const std::int16_t boxes = ToY16(std::floor((m_bottom - y) / m_cellSize), 0);
+        return boxes * static_cast<double>(m_boxValue) + static_cast<double>(m_base);
+    }
     if (!m_log)
         return static_cast<double>(m_base) + (m_bottom - y) * static_cast<double>(m_unitsPerY);
     return std::exp(m_logBase + (y - m_bottom) / m_logFactor);

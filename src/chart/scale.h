@@ -50,6 +50,11 @@ public:
     bool Prepare(bool logarithmic, bool lineChart, float chartBase, float chartCeiling,
                  std::int16_t plotTop, std::int16_t plotBottom);
 
+    // A point-and-figure chart maps whole boxes: `cellSize` units a box of `boxValue` from the
+    // base. Prepare() goes back to the price scale.
+    void PreparePointFigure(float chartBase, float boxValue, std::int16_t plotBottom,
+                            std::int16_t cellSize);
+
     std::int16_t PriceToY(double value) const;
     double YToPrice(double y) const;
 
@@ -66,6 +71,8 @@ private:
     double m_logBase = 0;
     // Kept from one chart to the next: a line chart with a ceiling of 0 reuses it.
     double m_logFactor = 0;
+    float m_boxValue = 0; // above 0: point and figure
+    std::int16_t m_cellSize = 0;
 };
 
 // A 16-bit coordinate from a computed one: held inside the type, NaN to `fallback`.

@@ -96,6 +96,12 @@ TEST(PointFigureChart, OneCloseGivesOneBoxAndTheLabels) {
                             [](const std::string& l) { return l.ends_with(",142.00, 27"); }));
     EXPECT_TRUE(HasRun(lines, {"T, 8.25, 300, 114,Box Value = 1, 16"}));
     EXPECT_EQ(r.chart.ChartCeiling, 1); // the ceiling carries the box value
+    // The tools read whole boxes: 40 boxes over the base stand at 710, and a y reads the box
+    // it lies in, counted up from the bottom.
+    EXPECT_EQ(r.chart.PriceToY(50), 710);
+    EXPECT_EQ(r.chart.PriceToY(50.4), 710);
+    EXPECT_DOUBLE_EQ(r.chart.YToPrice(707), 50);
+    EXPECT_DOUBLE_EQ(r.chart.YToPrice(711), 49);
 }
 
 TEST(PointFigureChart, BoxDialogAnswers) {
