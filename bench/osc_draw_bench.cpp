@@ -3,6 +3,7 @@
 // chart window writes TCht.Tmp. BM_DrawPanel's surface takes the calls and draws nothing,
 // so its figures are the routine's own cost; BM_PaintPanel paints a 2100 x 210 picture
 // through Qt as the screen does.
+#include "bench_history.h"
 #include "osc/osc_draw.h"
 #include "osc/osc_identifiers.h"
 
@@ -53,33 +54,6 @@ store::ChartSeries SyntheticBars(unsigned seed, float start, int bars) {
     return s;
 }
 
-class NullSurface : public platform::Surface {
-public:
-    void Clear() override {}
-    void SetBackColour(platform::Colour) override {}
-    void SetLineWidth(int) override {}
-    void SetLineStyle(platform::LineStyle) override {}
-    void SetForeColour(platform::Colour) override {}
-    void Line(double x1, double y1, double, double, platform::Colour) override {
-        benchmark::DoNotOptimize(x1 + y1);
-    }
-    void Box(double, double, double, double, platform::Colour) override {}
-    void FilledBox(double, double, double, double, platform::Colour) override {}
-    void Point(double, double, platform::Colour) override {}
-    void SetFontName(std::string_view) override {}
-    void SetFontSize(double) override {}
-    void SetFontBold(bool) override {}
-    void SetFontItalic(bool) override {}
-    void SetTextPosition(double, double) override {}
-    void PrintText(std::string_view) override {}
-    double TextWidth(std::string_view text) override {
-        return 5.0 * static_cast<double>(text.size());
-    }
-    double TextHeight(std::string_view) override { return 12; }
-    double ScaleWidth() const override { return 2100; }
-    double ScaleHeight() const override { return 210; }
-};
-
 template <class MakeSurface>
 void RunPanel(benchmark::State& state, const char* name, MakeSurface makeSurface) {
     const store::ChartSeries reference = SyntheticBars(11, 3000.0f, kBars);
@@ -111,7 +85,7 @@ void RunPanel(benchmark::State& state, const char* name, MakeSurface makeSurface
 }
 
 void BM_DrawPanel(benchmark::State& state, const char* name) {
-    RunPanel(state, name, [] { return std::make_unique<NullSurface>(); });
+    RunPanel(state, name, [] { return std::make_unique<bench::NullSurface>(2100, 210); });
 }
 
 #ifdef KORI_BENCH_QT

@@ -1,6 +1,7 @@
 // Overlays, swing and point-and-figure charts on a 1000 x 700 area from a 30,000-record daily
 // history, on a RecordingSurface: a point-and-figure build over the whole file (counting pass
 // and drawing pass), a swing chart build, and the overlays alone on a drawn daily chart.
+#include "bench_history.h"
 #include "chart/build_chart.h"
 #include "chart/draw_price_chart.h"
 #include "chart/overlays.h"
@@ -8,91 +9,23 @@
 
 #include <benchmark/benchmark.h>
 
-#include <algorithm>
-#include <cmath>
-#include <cstdio>
-#include <filesystem>
 
 using namespace kori;
 
 namespace {
 
-constexpr int kRecords = 30000;
+using bench::kRecords;
 
-class HistorySource : public chart::PriceSource {
-public:
-    HistorySource() {
-        m_bars.reserve(kRecords);
-        for (int i = 0; i < kRecords; ++i) {
-            store::ChartBar b;
-            char date[16];
-            std::snprintf(date, sizeof date, "%04d%02d%02d", 1900 + i / 250, 1 + (i / 21) % 12,
-                          1 + i % 21);
-            b.SetDate(date);
-            const float mid = 20 + 8 * std::sin(static_cast<float>(i) / 300) +
-                              2 * std::sin(static_cast<float>(i) / 13) +
-                              static_cast<float>(i % 7) * 0.1f;
-            b.Open = mid - 0.2f;
-            b.High = mid + 0.5f;
-            b.Low = mid - 0.5f;
-            b.Close = mid + 0.1f;
-            b.Volume = 10000 + (i * 7919) % 50000;
-            m_bars.push_back(b);
-        }
-    }
-    std::string FileName() const override { return "BENCH.WDT"; }
-    std::int16_t RecordCount() override { return static_cast<std::int16_t>(kRecords); }
-    std::string DateOf(std::int16_t rec) override {
-        return std::string(m_bars[static_cast<std::size_t>(rec - 1)].DateText());
-    }
-    std::string NoteText(std::int16_t) override { return {}; }
-    platform::Status Load(const chart::LoadRequest& req, store::ChartSeries& s) override {
-        s.ChartBars.assign(m_bars.begin() + (req.FirstRecord - 1), m_bars.begin() + req.LastRecord);
-        s.LastBar = static_cast<std::int16_t>(req.LastRecord - req.FirstRecord);
-        store::LoadResults r;
-        std::int64_t sum = 0;
-        for (const auto& b : s.ChartBars) {
-            r.HighestPrice = std::max(r.HighestPrice, b.High);
-            r.LowestPrice = std::min(r.LowestPrice, b.Low);
-            r.HighestVolume = std::max(r.HighestVolume, b.Volume);
-            r.LowestVolume = std::min(r.LowestVolume, b.Volume);
-            sum += b.Volume;
-        }
-        r.AverageVolume =
-            static_cast<std::int32_t>(sum / static_cast<std::int64_t>(s.ChartBars.size()));
-        r.VolumesPresent = req.WantVolume;
-        s.Results = r;
-        return platform::Status::Ok();
-    }
-
-private:
-    std::vector<store::ChartBar> m_bars;
-};
-
-struct Setup {
-    platform::Palette palette{};
-    platform::ChartFonts fonts;
-    chart::ChartDefaults defaults;
-    chart::ChartName name{"BENCH", "BENCHMARK SECURITY", "", 4, 0, 0, 5, 5};
-    chart::ChartRequest request;
-    platform::ScriptedDialogs dialogs;
+// The history has a faster ripple on its wave, so that swings and reversals turn often.
+struct Setup : bench::ChartSetup {
     platform::RecordingSurface surface{1000, 700};
-    HistorySource source;
-    std::filesystem::path stream = std::filesystem::temp_directory_path() / "kori-obench-TCht.Tmp";
-    Setup() {
-        for (std::size_t i = 0; i < palette.size(); ++i)
-            palette[i] = static_cast<platform::Colour>(i * 0x10101);
-        request.ChartStyle = 'B';
-        request.BarSpacing = 2;
-        request.ShowVolume = true;
-    }
-    ~Setup() { std::filesystem::remove(stream); }
+    bench::HistorySource source{2};
+    Setup() : ChartSetup("kori-obench-TCht.Tmp") {}
 };
 
 void RunBuild(benchmark::State& state, Setup& s) {
     chart::Chart c;
-    const chart::ChartBuild build{s.request, s.defaults, s.name,  s.palette,
-                                  s.fonts,   s.dialogs,  s.stream};
+    const chart::ChartBuild build = s.Build();
     for (auto _ : state) {
         s.surface.ClearCalls();
         if (!chart::BuildChart(c, build, s.source, s.surface)) state.SkipWithError("build failed");
