@@ -2,6 +2,7 @@
 
 #include "gui/widgets/window_place.h"
 
+#include <QHBoxLayout>
 #include <QPushButton>
 
 namespace kori::gui {
@@ -19,6 +20,21 @@ QPushButton* SettingsDialog::Button(const QString& caption, const char* name) {
     b->setObjectName(QString::fromLatin1(name));
     b->setAutoDefault(false);
     return b;
+}
+
+QHBoxLayout* SettingsDialog::SaveRow(std::function<bool()> save, const QString& leaveCaption,
+                                     const char* leaveName) {
+    auto* saveButton = Button(QStringLiteral("SAVE"), "cmdSave");
+    auto* leave = Button(leaveCaption, leaveName);
+    connect(saveButton, &QPushButton::clicked, this, [this, save = std::move(save)] {
+        if (save()) accept();
+    });
+    connect(leave, &QPushButton::clicked, this, &QDialog::reject);
+    auto* row = new QHBoxLayout;
+    row->addStretch();
+    row->addWidget(saveButton);
+    row->addWidget(leave);
+    return row;
 }
 
 } // namespace kori::gui

@@ -7,8 +7,10 @@
 #include <QDialog>
 #include <QString>
 
+#include <functional>
 #include <string>
 
+class QHBoxLayout;
 class QPushButton;
 
 namespace kori::gui {
@@ -30,6 +32,10 @@ protected:
     platform::Dialogs& dialogs() { return m_session.dialogs(); }
     // A push button with a control name, so tests and the keyboard reach it.
     QPushButton* Button(const QString& caption, const char* name);
+    // The row of "SAVE" (which closes the window once `save` has stored the values) and the
+    // button that leaves without storing, to the right.
+    QHBoxLayout* SaveRow(std::function<bool()> save, const QString& leaveCaption,
+                         const char* leaveName);
 
     app::Session& m_session;
     SettingsHub& m_hub;

@@ -45,16 +45,7 @@ CPath::CPath(app::Session& session, SettingsHub& hub, QWidget* parent)
         grid->addWidget(browse, i, 2);
         m_fields[static_cast<std::size_t>(i)] = edit;
     }
-    auto* save = Button(QStringLiteral("SAVE"), "cmdSave");
-    auto* exit = Button(QStringLiteral("Exit"), "cmdExit");
-    connect(save, &QPushButton::clicked, this, [this] {
-        if (Save()) accept();
-    });
-    connect(exit, &QPushButton::clicked, this, &CPath::reject);
-    auto* buttons = new QHBoxLayout;
-    buttons->addStretch();
-    buttons->addWidget(save);
-    buttons->addWidget(exit);
+    auto* buttons = SaveRow([this] { return Save(); }, QStringLiteral("Exit"), "cmdExit");
     auto* layout = new QVBoxLayout(this);
     layout->addLayout(grid);
     layout->addLayout(buttons);

@@ -122,16 +122,7 @@ ChtDef::ChtDef(app::Session& session, SettingsHub& hub, Caller caller, const std
         ++n;
     }
 
-    auto* save = Button(QStringLiteral("SAVE"), "cmdSave");
-    auto* close = Button(QStringLiteral("Close"), "cmdClose");
-    connect(save, &QPushButton::clicked, this, [this] {
-        if (Save()) accept();
-    });
-    connect(close, &QPushButton::clicked, this, &QDialog::reject);
-    auto* buttons = new QHBoxLayout;
-    buttons->addStretch();
-    buttons->addWidget(save);
-    buttons->addWidget(close);
+    auto* buttons = SaveRow([this] { return Save(); }, QStringLiteral("Close"), "cmdClose");
 
     auto* left = new QVBoxLayout;
     left->addWidget(averages);

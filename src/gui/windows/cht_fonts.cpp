@@ -58,16 +58,7 @@ ChtFonts::ChtFonts(app::Session& session, SettingsHub& hub, QWidget* parent)
     listLayout->addWidget(all);
     listLayout->addWidget(m_printerOnly);
 
-    auto* save = Button(QStringLiteral("SAVE"), "cmdSave");
-    auto* exit = Button(QStringLiteral("Exit"), "cmdExit");
-    connect(save, &QPushButton::clicked, this, [this] {
-        if (Save()) accept();
-    });
-    connect(exit, &QPushButton::clicked, this, &QDialog::reject);
-    auto* buttons = new QHBoxLayout;
-    buttons->addStretch();
-    buttons->addWidget(save);
-    buttons->addWidget(exit);
+    auto* buttons = SaveRow([this] { return Save(); }, QStringLiteral("Exit"), "cmdExit");
     auto* layout = new QVBoxLayout(this);
     layout->addLayout(grid);
     layout->addWidget(listBox);
