@@ -11,6 +11,7 @@
 #include "gui/windows/main_window.h"
 #include "platform/clock.h"
 #include "platform/files.h"
+#include "platform/heap.h"
 #include "platform/settings_store.h"
 
 #include <QApplication>
@@ -20,6 +21,7 @@
 #include <memory>
 
 int main(int argc, char** argv) {
+    kori::platform::KeepFreedMemoryForReuse();
     QApplication qapp(argc, argv);
     QApplication::setApplicationName(QStringLiteral("kori-charting"));
     QCommandLineParser parser;
