@@ -41,8 +41,7 @@ void SplitChart::AfterNextChart(int delta) {
 }
 
 bool SplitChart::Applies(const chart::ChartRequest& request) const {
-    return m_lower.has_value() && !m_waiting && request.ChartStyle != 'P' &&
-           request.ChartSlot == 0;
+    return m_lower.has_value() && !m_waiting && request.ChartStyle != 'P' && request.ChartSlot == 0;
 }
 
 void SplitChart::Apply(chart::ChartRequest& request) const {

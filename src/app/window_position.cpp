@@ -12,8 +12,12 @@ namespace kori::app {
 namespace {
 constexpr std::string_view kMainKey = "Main";
 
-std::string WidthKey(std::string_view key) { return std::string(key) + "SW"; }
-std::string HeightKey(std::string_view key) { return std::string(key) + "SH"; }
+std::string WidthKey(std::string_view key) {
+    return std::string(key) + "SW";
+}
+std::string HeightKey(std::string_view key) {
+    return std::string(key) + "SH";
+}
 
 std::int32_t Scale(std::int32_t v, std::int32_t from, std::int32_t to) {
     const double scaled = std::nearbyint(static_cast<double>(v) * to / from);
@@ -22,7 +26,9 @@ std::int32_t Scale(std::int32_t v, std::int32_t from, std::int32_t to) {
     return static_cast<std::int32_t>(std::fmin(std::fmax(scaled, lo), hi));
 }
 
-bool Known(ScreenSize s) { return s.width > 0 && s.height > 0; }
+bool Known(ScreenSize s) {
+    return s.width > 0 && s.height > 0;
+}
 
 // A stored size in twips when it is a positive number.
 std::optional<std::int32_t> StoredSize(const platform::SettingsStore& store, std::string_view key) {
@@ -37,7 +43,8 @@ std::optional<WindowPosition> ParseWindowPosition(std::string_view text) {
     std::size_t start = 0;
     for (;;) {
         const auto comma = text.find(',', start);
-        const auto part = text.substr(start, comma == std::string_view::npos ? text.npos : comma - start);
+        const auto part =
+            text.substr(start, comma == std::string_view::npos ? text.npos : comma - start);
         parts.push_back(platform::CLng(platform::Val(part)).value_or(0));
         if (comma == std::string_view::npos) break;
         start = comma + 1;

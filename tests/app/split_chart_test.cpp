@@ -33,7 +33,8 @@ struct Split : ::testing::Test {
     }
     std::vector<std::string> Lines() {
         std::vector<std::string> out;
-        std::istringstream in(platform::ReadWholeFile(app::ChartStreamPath(s.session)).value_or(""));
+        std::istringstream in(
+            platform::ReadWholeFile(app::ChartStreamPath(s.session)).value_or(""));
         for (std::string line; std::getline(in, line);) {
             if (!line.empty() && line.back() == '\r') line.pop_back();
             out.push_back(line);

@@ -34,7 +34,8 @@ TEST(WindowPosition, ScreenIsKeptBesideTheFourNumbers) {
     EXPECT_EQ(store.Get("ChtFontsSH", ""), "14400");
     EXPECT_EQ(StoredScreen(store, "ChtFonts"), kOld);
 
-    EXPECT_EQ(LoadWindowPosition(store, "ChtFonts", kWide), (WindowPosition{2250, 1012, 13500, 6750}));
+    EXPECT_EQ(LoadWindowPosition(store, "ChtFonts", kWide),
+              (WindowPosition{2250, 1012, 13500, 6750}));
     EXPECT_EQ(LoadWindowPosition(store, "ChtFonts", kOld), (WindowPosition{1500, 900, 9000, 6000}));
     EXPECT_FALSE(LoadWindowPosition(store, "Scales", kWide)) << "absent: the design position";
 

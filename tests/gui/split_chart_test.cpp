@@ -82,7 +82,9 @@ struct SplitRoad : ::testing::Test {
 };
 
 // The code of a split title line "T, 9.75, x, y,CODE" (its colour cut off).
-std::string CodeOf(const std::string& title) { return title.substr(title.rfind(',') + 1); }
+std::string CodeOf(const std::string& title) {
+    return title.substr(title.rfind(',') + 1);
+}
 
 } // namespace
 
@@ -99,14 +101,16 @@ TEST_F(SplitRoad, SecondChartSplitsTheChartOnShowAndPrintAndSaveCarryIt) {
     EXPECT_EQ(CodeOf(titles[0]), "ALX");
     EXPECT_EQ(CodeOf(titles[1]), "KRM");
     EXPECT_TRUE(chts()->windowTitle().endsWith(QStringLiteral("/   KRM")));
-    const std::string stream = platform::ReadWholeFile(app::ChartStreamPath(s.session)).value_or("");
+    const std::string stream =
+        platform::ReadWholeFile(app::ChartStreamPath(s.session)).value_or("");
     EXPECT_NE(stream.find("WEEKLY - "), std::string::npos);
     EXPECT_NE(stream.find("DAILY - "), std::string::npos);
     EXPECT_FALSE(chts()->picture2()->isVisible());
     EXPECT_NE(chts()->picture1()->picture(), single);
     // The mouse tools stay quiet over two charts.
     chts()->MouseMove(200, 200, Qt::NoButton);
-    for (const auto& pane : chts()->StatusPanes()) EXPECT_TRUE(pane.empty()) << pane;
+    for (const auto& pane : chts()->StatusPanes())
+        EXPECT_TRUE(pane.empty()) << pane;
     if (const char* dir = std::getenv("KORI_SHOTS"))
         chts()->grab().save(QString::fromLatin1(dir) + "/split.png");
 
@@ -147,7 +151,8 @@ TEST_F(SplitRoad, NextChartOrSingleChartEndsTheSplit) {
     EXPECT_TRUE(chts()->splitShown());
     chts()->ToolKey("wky")->trigger(); // the upper half's period changes, the lower's stays
     ASSERT_TRUE(chts()->splitShown());
-    const std::string weekly = platform::ReadWholeFile(app::ChartStreamPath(s.session)).value_or("");
+    const std::string weekly =
+        platform::ReadWholeFile(app::ChartStreamPath(s.session)).value_or("");
     EXPECT_LT(weekly.find("WEEKLY - "), weekly.find("DAILY - "));
 
     chts()->ToolKey("fwd")->trigger();
