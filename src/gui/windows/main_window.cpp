@@ -37,7 +37,8 @@ MainWindow::MainWindow(app::Session& session, QWidget* parent)
     if (place.left && place.top) {
         // The same client geometry that closing wrote, unless no screen shows it any more.
         const QRect stored(QPoint(*place.left / kTwipsPerPixel, *place.top / kTwipsPerPixel), size);
-        if (!screen() || screen()->availableVirtualGeometry().intersects(stored)) setGeometry(stored);
+        if (!screen() || screen()->availableVirtualGeometry().intersects(stored))
+            setGeometry(stored);
     }
     SetAction("Exit", [this] {
         m_ending = true;
