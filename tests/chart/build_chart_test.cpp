@@ -217,6 +217,18 @@ TEST(BuildChart, SplitLowerHalfShowsItsOwnSecurityAndPeriod) {
     EXPECT_TRUE(HasRun(lines, {"T, 8.25, 7, 492,WEEKLY - ARITHMETIC -, 26"}));
     EXPECT_TRUE(HasRun(lines, {"T, 8.25, 380, 512,Last date processed 08-03-24, 27",
                                "T, 8.25, 380, 530,Closing Price : 35.00  (.00), 27"}));
+    // An empty lower file is told by its own name; the request is left as a single chart at
+    // the period in hand.
+    kori::test::MemorySource empty;
+    empty.Name = "RIO.WDT";
+    const SplitLowerHalf none{&lowerName, &empty, 'M'};
+    b.Lower = &none;
+    r.request.SplitMode = true;
+    EXPECT_FALSE(BuildChart(r.chart, b, r.source, r.surface).ok());
+    EXPECT_EQ(r.dialogs.messages().back(), "No Data for RIO.WDT");
+    EXPECT_FALSE(r.request.SplitMode);
+    EXPECT_EQ(r.request.SplitHalf, 1);
+    EXPECT_EQ(r.request.ChartPeriod, 'A');
     // Without a lower half of its own, the split repeats the security in hand.
     ChartRig same;
     same.request.SplitMode = true;

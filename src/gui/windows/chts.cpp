@@ -334,8 +334,10 @@ bool Chts::Rebuild() {
     if (app::IsCloseOnly(m_name.RecordType)) job.Request.ChartStyle = 'L';
     job.Defaults = m_state.Defaults;
     job.Page = &m_page;
-    m_state.Split.Apply(job.Request);
-    if (m_splitShown) job.Lower = m_state.Split.Lower();
+    if (m_splitShown) {
+        m_state.Split.Apply(job.Request);
+        job.Lower = m_state.Split.Lower();
+    }
     const std::string code = Code();
     job.DrawOverlays = [this, &job, code](chart::Chart& c, platform::Surface& s) {
         if (m_overlayHook) m_overlayHook(c, job.Request, s);
