@@ -4,6 +4,7 @@
 // "SHOW CHART" and "Close". The window shows `form()` and hands every user action here.
 #include "app/chart_navigation.h"
 #include "app/session.h"
+#include "app/split_chart.h"
 #include "chart/chart_defaults.h"
 #include "chart/chart_request.h"
 
@@ -25,6 +26,8 @@ struct ChartState {
     std::string ClassCode;
     bool GicsWalk = false;
     std::string GicsCode;
+    // The second chart of a split, chosen in Chart2, and whether the chart window shows it.
+    SplitChart Split;
 };
 
 struct OscChoice {

@@ -50,6 +50,20 @@ platform::Status BuildSecurityChart(Session& session, ChartJob& job, chart::Char
         return s;
     }
     const chart::ChartName name = ChartNameOf(job.Name);
+    const bool split = job.Request.SplitMode && job.Lower.has_value();
+    const std::string lowerCode = split ? platform::Trim(job.Lower->Name.Code) : std::string();
+    chart::FilePriceSource lowerSource(
+        store::PriceFile::PathFor(session.folders.DataFolder, split ? lowerCode : job.Name.Code));
+    chart::ChartName lowerName;
+    chart::SplitLowerHalf lower;
+    if (split) {
+        if (auto s = lowerSource.Open(); !s) {
+            session.dialogs().MsgBox(s.message(), "Chart Display");
+            return s;
+        }
+        lowerName = ChartNameOf(job.Lower->Name);
+        lower = {&lowerName, &lowerSource, job.Lower->ChartPeriod};
+    }
     chart::ChartBuild build{job.Request,
                             job.Defaults,
                             name,
@@ -61,11 +75,16 @@ platform::Status BuildSecurityChart(Session& session, ChartJob& job, chart::Char
                             session.download.VolumeDivisor,
                             job.Page,
                             {}};
-    // Target lines go on last, while the stream is still open.
-    const std::vector<float> targets = chart::ReadTargetPrices(
-        std::filesystem::path(session.folders.SystemFolder) / "Targets.txt", name.Code);
-    build.DrawOverlays = [&job, &session, &targets](chart::Chart& c, platform::Surface& s) {
-        chart::DrawTargetLines(c, s, session.palette, targets);
+    if (split) build.Lower = &lower;
+    // Target lines go on last, while the stream is still open; each half has its security's.
+    const auto targetsFile = std::filesystem::path(session.folders.SystemFolder) / "Targets.txt";
+    const std::vector<float> targets = chart::ReadTargetPrices(targetsFile, name.Code);
+    const std::vector<float> lowerTargets =
+        split ? chart::ReadTargetPrices(targetsFile, lowerCode) : std::vector<float>();
+    build.DrawOverlays = [&job, &session, &targets, &lowerTargets](chart::Chart& c,
+                                                                   platform::Surface& s) {
+        const bool lowerHalf = job.Request.SplitMode && job.Request.SplitHalf == 2;
+        chart::DrawTargetLines(c, s, session.palette, lowerHalf ? lowerTargets : targets);
         if (job.DrawOverlays) job.DrawOverlays(c, s);
     };
     return chart::BuildChart(chart, build, source, surface);

@@ -102,6 +102,21 @@ platform::Status BuildOneChart(Chart& c, const ChartBuild& b, PriceSource& sourc
     return platform::Status::Ok();
 }
 
+// The request carries the lower security's period for this half only; the upper half's stays
+// in force for the chart window.
+platform::Status BuildLowerHalf(Chart& c, const ChartBuild& b, const SplitLowerHalf& lower,
+                                platform::Surface& surface) {
+    ChartRequest& r = b.Request;
+    const char period = r.ChartPeriod;
+    r.ChartPeriod = lower.ChartPeriod;
+    const ChartBuild half{r,         b.Defaults,  *lower.Name,     b.Palette,
+                          b.Fonts,   b.Dialogs,   b.StreamPath,    b.PrintBold,
+                          b.VolumeDivisor, b.Page, b.DrawOverlays, nullptr};
+    const platform::Status s = BuildOneChart(c, half, *lower.Source, surface);
+    r.ChartPeriod = period;
+    return s;
+}
+
 } // namespace
 
 void WorkOutPrinterMargins(PrinterPage& page, double areaWidth, double areaHeight,
@@ -130,7 +145,11 @@ platform::Status BuildChart(Chart& chart, const ChartBuild& build, PriceSource& 
         return s;
     }
     r.SplitHalf = 2;
-    s = BuildOneChart(chart, build, source, surface);
+    if (build.Lower && build.Lower->Name && build.Lower->Source) {
+        s = BuildLowerHalf(chart, build, *build.Lower, surface);
+    } else {
+        s = BuildOneChart(chart, build, source, surface);
+    }
     r.SplitMode = false;
     r.SplitHalf = 1;
     return s;

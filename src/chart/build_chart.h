@@ -26,6 +26,14 @@ struct PrinterPage {
     std::int32_t PageLeft = 0, PageTop = 0;
 };
 
+// The lower half of a split: its own security and period, built on the same area and into the
+// same stream straight after the upper half. Without it the lower half repeats the upper.
+struct SplitLowerHalf {
+    const ChartName* Name = nullptr;
+    PriceSource* Source = nullptr;
+    char ChartPeriod = 'A';
+};
+
 struct ChartBuild {
     ChartRequest& Request; // the split flags are cleared when a split is done
     const ChartDefaults& Defaults;
@@ -40,6 +48,7 @@ struct ChartBuild {
     // Overlays, trendlines and target lines go on after the trailing labels, into the same
     // stream while it is still open.
     std::function<void(Chart&, platform::Surface&)> DrawOverlays;
+    const SplitLowerHalf* Lower = nullptr; // read only while SplitMode is set
 };
 
 platform::Status BuildChart(Chart& chart, const ChartBuild& build, PriceSource& source,

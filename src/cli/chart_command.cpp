@@ -40,6 +40,7 @@ struct ChartOptions {
     std::string bands, swing;
     int reversal = 0;
     float boxValue = 0;
+    std::string split; // CODE or CODE:PERIOD of the lower half
     OscChartOptions osc;
 };
 
@@ -86,6 +87,24 @@ void ApplyOverlays(const ChartOptions& o, app::ChartJob& job) {
     if (!o.swing.empty()) ApplySwing(o.swing, job);
     if (o.reversal > 0) r.BarSpacing = static_cast<std::int16_t>(o.reversal);
     if (o.boxValue > 0) job.Name.PFIncrement = o.boxValue;
+}
+
+// "--split CODE[:PERIOD]": the lower half of a split, at the chart's own period unless named.
+void ApplySplit(const app::Session& session, const std::string& text, const ChartOptions& o,
+                app::ChartJob& job, app::SplitChart& split) {
+    const auto colon = text.find(':');
+    const std::string code = platform::Upper(platform::Trim(text.substr(0, colon)));
+    const std::string period = colon == std::string::npos ? std::string(1, job.Request.ChartPeriod)
+                                                          : platform::Upper(text.substr(colon + 1));
+    if (period != "A" && period != "W" && period != "M")
+        throw CliError{"--split wants CODE or CODE:PERIOD with the period A, W or M"};
+    const auto found = code.empty() ? std::nullopt : app::FindSecurity(session, code);
+    if (!found) throw CliError{"No record on file for that code: " + code};
+    if (!o.osc.osc.empty()) throw CliError{"--split draws no oscillator panel: leave out --osc"};
+    split.Choose({found->second, period[0]}, true);
+    if (!split.Applies(job.Request))
+        throw CliError{"A point-and-figure chart is never split"};
+    job.Lower = split.Lower();
 }
 
 std::pair<int, int> ParseArea(const std::string& text) {
@@ -151,13 +170,20 @@ void Run(CliContext& ctx, const ChartOptions& o) {
     chart::PrinterPage page;
     job.Page = &page;
     PreparePanelPage(job, h, o.osc);
+    app::SplitChart split;
+    if (!o.split.empty()) ApplySplit(session, o.split, o, job, split);
+    // The builder clears the split flags when a split is done: each build sets them again.
+    const auto build = [&](chart::Chart& into, platform::Surface& area) {
+        split.Apply(job.Request);
+        return BuildChartWithPanel(session, job, into, area, o.osc);
+    };
 
     chart::Chart c;
     platform::Status built;
     if (!o.png.empty() || !o.pdf.empty()) EnsureGuiApplication();
     if (!o.svg.empty()) {
         platform::SvgSurface area(w, h);
-        built = BuildChartWithPanel(session, job, c, area, o.osc);
+        built = build(c, area);
         if (built) {
             if (auto s = area.Save(o.svg); !s) throw CliError{s.message()};
         }
@@ -165,11 +191,11 @@ void Run(CliContext& ctx, const ChartOptions& o) {
     if (o.png.empty() && o.svg.empty()) {
         // Numbers, stream or page only: the chart is built on a surface that draws nothing.
         platform::RecordingSurface area(w, h);
-        built = BuildChartWithPanel(session, job, c, area, o.osc);
+        built = build(c, area);
     }
     if (built && !o.png.empty()) {
         gui::ImageSurface area(w, h);
-        built = BuildChartWithPanel(session, job, c, area, o.osc);
+        built = build(c, area);
         const QImage& picture = area.Finish();
         if (built && !o.png.empty()) {
             if (auto s = gui::SavePng(picture, o.png); !s) throw CliError{s.message()};
@@ -225,6 +251,9 @@ void AddChartCommand(CLI::App& app, CliContext& ctx) {
         ->check(CLI::Range(1, 20));
     cmd->add_option("--box-value", o->boxValue, "Point-and-figure box value (automatic scale)")
         ->check(CLI::PositiveNumber);
+    cmd->add_option("--split", o->split,
+                    "Split chart: this security (at period A, W or M) in the lower half")
+        ->option_text("CODE[:PERIOD]");
     cmd->add_option("--osc", o->osc.osc, "Oscillator panel under the price chart (RSI, MACD, ...)")
         ->option_text("NAME");
     cmd->add_flag("--slow", o->osc.slow, "Slow stochastic with --osc STO");

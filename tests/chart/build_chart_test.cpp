@@ -190,3 +190,49 @@ TEST(BuildChart, OverlaysFollowTheTrailingLabelsInTheSameStream) {
     EXPECT_EQ(lines[lines.size() - 2], "Z, 7, 269.4, 120,KORI Charting, 27");
     EXPECT_EQ(lines.back(), "L, 5, 900, 354, 900, 20");
 }
+
+TEST(BuildChart, SplitLowerHalfShowsItsOwnSecurityAndPeriod) {
+    ChartRig r;
+    r.request.SplitMode = true;
+    r.Add("20240304", 15, 20, 12.5f, 17);
+    kori::test::MemorySource lowerSource;
+    lowerSource.Name = "RIO.WDT";
+    lowerSource.Records.push_back({"20240308", 30, 40, 25, 35, 0, {}});
+    ChartName lowerName = r.name;
+    lowerName.Code = "RIO";
+    const SplitLowerHalf lower{&lowerName, &lowerSource, 'W'};
+    ChartBuild b{r.request, r.defaults,   r.name,    r.palette, r.fonts, r.dialogs,
+                 r.streamPath, false, 1, nullptr, {}};
+    b.Lower = &lower;
+    ASSERT_TRUE(BuildChart(r.chart, b, r.source, r.surface).ok());
+    EXPECT_EQ(r.source.LastLoad.ChartPeriod, 'A');
+    EXPECT_EQ(lowerSource.LastLoad.ChartPeriod, 'W');
+    EXPECT_EQ(r.request.ChartPeriod, 'A') << "the period in hand comes back after the split";
+    EXPECT_FALSE(r.request.SplitMode);
+    const auto lines = r.Lines();
+    EXPECT_EQ(Starting(lines, "T, 9.75,"),
+              (std::vector<std::string>{"T, 9.75, 20, 12,BHP, 26", "T, 9.75, 20, 512,RIO, 26"}));
+    // The lower heading 18 above its plot top of 510; the labels of the lower half at 512 and
+    // 530 carry the lower security's last date and close.
+    EXPECT_TRUE(HasRun(lines, {"T, 8.25, 7, 492,WEEKLY - ARITHMETIC -, 26"}));
+    EXPECT_TRUE(HasRun(lines, {"T, 8.25, 380, 512,Last date processed 08-03-24, 27",
+                               "T, 8.25, 380, 530,Closing Price : 35.00  (.00), 27"}));
+    // An empty lower file is told by its own name; the request is left as a single chart at
+    // the period in hand.
+    kori::test::MemorySource empty;
+    empty.Name = "RIO.WDT";
+    const SplitLowerHalf none{&lowerName, &empty, 'M'};
+    b.Lower = &none;
+    r.request.SplitMode = true;
+    EXPECT_FALSE(BuildChart(r.chart, b, r.source, r.surface).ok());
+    EXPECT_EQ(r.dialogs.messages().back(), "No Data for RIO.WDT");
+    EXPECT_FALSE(r.request.SplitMode);
+    EXPECT_EQ(r.request.SplitHalf, 1);
+    EXPECT_EQ(r.request.ChartPeriod, 'A');
+    // Without a lower half of its own, the split repeats the security in hand.
+    ChartRig same;
+    same.request.SplitMode = true;
+    same.Add("20240304", 15, 20, 12.5f, 17);
+    ASSERT_TRUE(same.Build().ok());
+    EXPECT_EQ(Starting(same.Lines(), "T, 9.75,").back(), "T, 9.75, 20, 512,BHP, 26");
+}

@@ -9,8 +9,6 @@
 namespace kori::gui {
 
 namespace {
-constexpr int kTwipsPerPixel = 15;
-
 class PositionKeeper : public QObject {
 public:
     PositionKeeper(QWidget* window, platform::SettingsStore& store, std::string key)
@@ -23,7 +21,7 @@ protected:
         if (watched != m_window) return false;
         if (e->type() == QEvent::Show && !m_placed) {
             m_placed = true;
-            if (const auto p = app::LoadWindowPosition(m_store, m_key)) {
+            if (const auto p = app::LoadWindowPosition(m_store, m_key, ScreenTwips(m_window))) {
                 // The same client geometry that closing wrote.
                 const QSize size = p->width > 0 && p->height > 0 ? QSize(p->width / kTwipsPerPixel,
                                                                          p->height / kTwipsPerPixel)
@@ -46,7 +44,8 @@ private:
         const QRect g = m_window->geometry();
         app::SaveWindowPosition(m_store, m_key,
                                 {g.x() * kTwipsPerPixel, g.y() * kTwipsPerPixel,
-                                 g.width() * kTwipsPerPixel, g.height() * kTwipsPerPixel});
+                                 g.width() * kTwipsPerPixel, g.height() * kTwipsPerPixel},
+                                ScreenTwips(m_window));
     }
 
     QWidget* m_window;
@@ -55,6 +54,13 @@ private:
     bool m_placed = false;
 };
 } // namespace
+
+app::ScreenSize ScreenTwips(const QWidget* window) {
+    const QScreen* screen = window->screen();
+    if (!screen) return {};
+    const QSize s = screen->geometry().size();
+    return {s.width() * kTwipsPerPixel, s.height() * kTwipsPerPixel};
+}
 
 void KeepWindowPosition(QWidget* window, platform::SettingsStore& store, const std::string& key) {
     new PositionKeeper(window, store, key);

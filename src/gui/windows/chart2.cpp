@@ -1,8 +1,6 @@
 #include "gui/windows/chart2.h"
 
-#include "app/chart_service.h"
-#include "app/window_rules.h"
-#include "platform/text.h"
+#include "app/split_chart.h"
 
 #include <QComboBox>
 #include <QFormLayout>
@@ -25,13 +23,10 @@ Chart2::Chart2(app::Session& session, SettingsHub& hub, QWidget* parent)
 }
 
 bool Chart2::Ok() {
-    const std::string code = platform::Upper(platform::Trim(S(m_code->text())));
-    if (code.empty() || !app::FindSecurity(m_session, code)) {
-        dialogs().MsgBox("No record on file for that code", "Second Chart");
-        return false;
-    }
-    static constexpr char kPeriods[] = {'A', 'W', 'M'};
-    m_hub.SecondChart(Q(code), QChar::fromLatin1(kPeriods[m_period->currentIndex()]));
+    const auto lower =
+        app::ChooseSecondChart(m_session, S(m_code->text()), m_period->currentIndex(), dialogs());
+    if (!lower) return false;
+    m_hub.SecondChart(Q(lower->Name.TrimmedCode()), QChar::fromLatin1(lower->ChartPeriod));
     return true;
 }
 

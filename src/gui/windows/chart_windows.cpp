@@ -1,5 +1,6 @@
 #include "gui/windows/chart_windows.h"
 
+#include "app/chart_service.h"
 #include "app/osc_service.h"
 #include "osc/osc_panel.h"
 
@@ -35,6 +36,16 @@ ChartWindows::ChartWindows(MainWindow& main) : QObject(&main), m_main(main) {
         m_state.Request.AutoOsc = !name.isEmpty();
         m_state.Request.AutoOscCode = name.toStdString();
         rebuild();
+    });
+    // Chart2: the chart on show is split at once; with none on show the next chart comes split.
+    connect(&hub, &SettingsHub::SecondChart, this, [this](const QString& code, QChar period) {
+        const auto found = app::FindSecurity(m_main.session(), code.toStdString());
+        if (!found) return;
+        const app::SecondChart lower{found->second, period.toLatin1()};
+        if (Chts* c = chts(); c && m_chartWindow->isVisible())
+            c->ShowSplit(lower);
+        else
+            m_state.Split.Choose(lower, false);
     });
 }
 

@@ -110,6 +110,10 @@ Chts::Chts(app::Session& session, app::ChartState& state, QWidget* parent)
     swing->setObjectName(QStringLiteral("cmSwing"));
     swing->setCheckable(true);
     connect(swing, &QAction::toggled, this, [this](bool on) { SetSwing(on); });
+    overlays->addSeparator();
+    m_singleChart = overlays->addAction(QStringLiteral("Single C&hart"), this, &Chts::EndSplit);
+    m_singleChart->setObjectName(QStringLiteral("cmSingleChart"));
+    m_singleChart->setEnabled(false);
     layout->setMenuBar(menus);
 
     BuildToolBar();
@@ -286,6 +290,7 @@ bool Chts::NextChart(int delta) {
     if (!r) return false;
     m_name = *r;
     m_haveName = true;
+    m_state.Split.AfterNextChart(delta);
     if (delta != 0) m_state.Request.ByFinishDate = m_state.Request.ByFinishDate && !m_koriScroll->isVisible();
     return Rebuild();
 }
@@ -317,7 +322,9 @@ bool Chts::Rebuild() {
     const bool longer = req.ChartPeriod != 'A';
     req.AvOnePeriod = longer ? m_state.Defaults.MAPeriod1Long : m_state.Defaults.MAPeriod1Daily;
     req.AvTwoPeriod = longer ? m_state.Defaults.MAPeriod2Long : m_state.Defaults.MAPeriod2Daily;
-    req.SecondPanelShowing = req.AutoOsc && static_cast<bool>(m_oscPainter) &&
+    // A split fills the whole area with its two charts: no oscillator panel under them.
+    m_splitShown = m_state.Split.Applies(req);
+    req.SecondPanelShowing = req.AutoOsc && static_cast<bool>(m_oscPainter) && !m_splitShown &&
                              req.ChartStyle != 'P' && !OnPriceChart(req.AutoOscCode);
     const QSize size = AreaSize();
     ImageSurface area(size.width(), size.height());
@@ -327,9 +334,15 @@ bool Chts::Rebuild() {
     if (app::IsCloseOnly(m_name.RecordType)) job.Request.ChartStyle = 'L';
     job.Defaults = m_state.Defaults;
     job.Page = &m_page;
+    if (m_splitShown) {
+        m_state.Split.Apply(job.Request);
+        job.Lower = m_state.Split.Lower();
+    }
     const std::string code = Code();
     job.DrawOverlays = [this, &job, code](chart::Chart& c, platform::Surface& s) {
         if (m_overlayHook) m_overlayHook(c, job.Request, s);
+        // Trendlines and notes belong to one security's single chart.
+        if (job.Request.SplitMode) return;
         m_trendEnds = app::DrawChartLines(m_session, c, job.Request, code, s);
         app::DrawTextNotes(m_session, c, job.Request, code, s);
     };
@@ -354,7 +367,10 @@ bool Chts::Rebuild() {
     m_picture1->SetPicture(area.Finish());
     DrawLegend();
     m_oscBox->setCurrentIndex(app::OscChoiceOf(req));
-    setWindowTitle(Q(code + "  " + platform::Trim(m_name.Name)));
+    std::string title = code + "  " + platform::Trim(m_name.Name);
+    if (m_splitShown) title += "   /   " + m_state.Split.Lower()->Name.TrimmedCode();
+    setWindowTitle(Q(title));
+    m_singleChart->setEnabled(m_state.Split.Chosen());
     if (m_koriScroll->isVisible()) {
         m_koriScroll->blockSignals(true);
         m_koriScroll->setRange(1, std::max(1, app::PriceRecordCount(m_session, code)));
@@ -363,6 +379,16 @@ bool Chts::Rebuild() {
     }
     QApplication::restoreOverrideCursor();
     return built.ok();
+}
+
+bool Chts::ShowSplit(const app::SecondChart& lower) {
+    m_state.Split.Choose(lower, m_haveName);
+    return m_haveName && Rebuild();
+}
+
+void Chts::EndSplit() {
+    m_state.Split.End();
+    if (m_haveName) Rebuild();
 }
 
 void Chts::DrawLegend() {
@@ -470,7 +496,7 @@ void Chts::PaintOnPicture(const std::function<void(platform::Surface&)>& draw) {
 }
 
 void Chts::MouseMove(double x, double y, Qt::MouseButtons buttons) {
-    if (!m_haveName || m_showingSaved || m_chart->LastBar() < 0) return;
+    if (!m_haveName || m_showingSaved || m_splitShown || m_chart->LastBar() < 0) return;
     if ((m_tool == kToolTrendline && (buttons & Qt::LeftButton)) || m_moving >= 0) {
         const double ax = m_moving >= 0 ? m_fixedX : m_downX;
         const double ay = m_moving >= 0 ? m_fixedY : m_downY;
@@ -486,7 +512,7 @@ void Chts::MouseMove(double x, double y, Qt::MouseButtons buttons) {
 }
 
 void Chts::MousePress(double x, double y, Qt::MouseButton button) {
-    if (!m_haveName || m_showingSaved || m_chart->LastBar() < 0) return;
+    if (!m_haveName || m_showingSaved || m_splitShown || m_chart->LastBar() < 0) return;
     m_downX = x;
     m_downY = y;
     m_leftDown = button == Qt::LeftButton;
@@ -591,7 +617,7 @@ void Chts::MousePress(double x, double y, Qt::MouseButton button) {
 }
 
 void Chts::MouseRelease(double x, double y, Qt::MouseButton button) {
-    if (!m_haveName || m_showingSaved) return;
+    if (!m_haveName || m_showingSaved || m_splitShown) return;
     m_picture1->SetRubberBand(std::nullopt);
     const auto& req = m_state.Request;
     if (m_moving >= 0 && button == Qt::RightButton) {
@@ -715,6 +741,7 @@ bool Chts::DisplaySavedChart(const std::string& chosen) {
     m_picture1->SetPicture(picture);
     m_picture2->hide();
     m_showingSaved = true;
+    m_splitShown = false;
     m_savedPath = chosen;
     setWindowTitle(Q("Saved chart  " + std::filesystem::path(chosen).filename().string()));
     return true;

@@ -74,6 +74,11 @@ public:
     void SetCalendarTimeLines(bool calendar);
     // Swing lines on or off, by the method and value of the swing settings.
     void SetSwing(bool on);
+    // Chart2's choice: the security in hand above, `lower` at its own period below, until the
+    // next-chart command steps on or "Single Chart" is chosen.
+    bool ShowSplit(const app::SecondChart& lower);
+    void EndSplit();
+    bool splitShown() const { return m_splitShown; }
 
     // The printer "Printer Setup" shapes, kept for the run; without one each print starts afresh.
     void SetPrinter(QPrinter* printer) { m_printer = printer; }
@@ -152,12 +157,14 @@ private:
     double m_fixedX = 0, m_fixedY = 0;
     bool m_calendarLines = false;
     bool m_showingSaved = false;
+    bool m_splitShown = false; // the picture holds two charts: the mouse tools stay quiet
     std::string m_savedPath;
 
     QToolBar* m_toolbar;
     QToolBar* m_toolbar2; // the mouse tools, scroll, print and save
     QComboBox* m_oscBox;
     QAction* m_timeLinesCaption = nullptr;
+    QAction* m_singleChart = nullptr;
     chart::SwingSwitch m_swingSwitch;
     ChartView* m_picture1;
     ChartView* m_picture2;

@@ -1,6 +1,8 @@
 #include "gui/windows/main_window.h"
 
+#include "app/window_position.h"
 #include "gui/services/qt_progress.h"
+#include "gui/widgets/window_place.h"
 #include "platform/files.h"
 #include "platform/text.h"
 
@@ -11,17 +13,13 @@
 #include <QMdiSubWindow>
 #include <QMenuBar>
 #include <QMessageBox>
+#include <QScreen>
 #include <QStatusBar>
 
 namespace kori::gui {
 
 namespace {
 QString Q(const std::string& s) { return QString::fromStdString(s); }
-// Sizes in the settings store are twips; fifteen twips make a pixel at 96 dots per inch.
-int TwipsToPixels(const std::string& text, int fallback) {
-    const double v = platform::Val(text);
-    return v > 0 ? static_cast<int>(v / 15.0) : fallback / 15;
-}
 } // namespace
 
 MainWindow::MainWindow(app::Session& session, QWidget* parent)
@@ -30,10 +28,18 @@ MainWindow::MainWindow(app::Session& session, QWidget* parent)
     setObjectName(QStringLiteral("Main"));
     setCentralWidget(m_mdi);
     m_mdi->setViewMode(QMdiArea::SubWindowView);
-    auto& store = m_session.services().settings;
-    const int h = TwipsToPixels(store.Get("Height", "6645"), 6645);
-    const int w = TwipsToPixels(store.Get("Width", "9045"), 9045);
-    resize(std::max(w, 640), std::max(h, 480));
+    // Sizes in the settings store are twips, scaled when the screen is not the one they were
+    // written on.
+    const auto place = app::LoadMainWindowPlace(m_session.services().settings, ScreenTwips(this));
+    const QSize size(std::max(place.width / kTwipsPerPixel, 640),
+                     std::max(place.height / kTwipsPerPixel, 480));
+    resize(size);
+    if (place.left && place.top) {
+        // The same client geometry that closing wrote, unless no screen shows it any more.
+        const QRect stored(QPoint(*place.left / kTwipsPerPixel, *place.top / kTwipsPerPixel), size);
+        if (!screen() || screen()->availableVirtualGeometry().intersects(stored))
+            setGeometry(stored);
+    }
     SetAction("Exit", [this] {
         m_ending = true;
         ULForms();
@@ -138,10 +144,12 @@ void MainWindow::ULForms() { m_mdi->closeAllSubWindows(); }
 
 void MainWindow::closeEvent(QCloseEvent* e) {
     // Unloading saves the main window's size (in twips, as the settings hold it).
-    auto& store = m_session.services().settings;
     if (!isMaximized() && !isMinimized()) {
-        store.Save("Height", std::to_string(height() * 15));
-        store.Save("Width", std::to_string(width() * 15));
+        const QRect g = geometry();
+        app::SaveMainWindowPlace(m_session.services().settings,
+                                 {g.x() * kTwipsPerPixel, g.y() * kTwipsPerPixel,
+                                  g.width() * kTwipsPerPixel, g.height() * kTwipsPerPixel},
+                                 ScreenTwips(this));
     }
     m_ending = true;
     ULForms();
