@@ -59,7 +59,8 @@ void SaveSLNames(platform::SettingsStore& store, const std::array<std::string, 1
         store.Save("SubList" + std::string(1, kListLetters[i]), platform::Trim(names[i]));
 }
 
-Status SaveListFromCodes(std::string_view dataFolder, char letter, const std::vector<std::string>& codes) {
+Status SaveListFromCodes(std::string_view dataFolder, char letter,
+                         const std::vector<std::string>& codes) {
     std::vector<NameRecord> names;
     NameFile nf(NameFile::PathIn(dataFolder));
     if (auto s = nf.Open(); !s) return s;
@@ -147,7 +148,8 @@ Status ShowList(std::string_view dataFolder, char letter, std::vector<std::strin
         if (auto s = WriteList(path, {}); !s) return s;
     std::vector<ChartListEntry> entries;
     if (auto s = ReadList(path, entries); !s) return s;
-    for (const auto& e : entries) codes.push_back(platform::Trim(e.Code));
+    for (const auto& e : entries)
+        codes.push_back(platform::Trim(e.Code));
     return Status::Ok();
 }
 
@@ -156,7 +158,8 @@ std::vector<std::string> StockList(std::string_view dataFolder) {
     const auto path = NameFile::PathIn(dataFolder);
     std::vector<NameRecord> names;
     if (!platform::FileExists(path) || !NameFile(path).ReadAll(names)) return codes;
-    for (const auto& n : names) codes.push_back(platform::Trim(n.Code));
+    for (const auto& n : names)
+        codes.push_back(platform::Trim(n.Code));
     return codes;
 }
 

@@ -32,7 +32,8 @@ char ListLetterOfMode(int listMode);
 std::filesystem::path ListPath(std::string_view dataFolder, char letter);
 
 platform::Status ReadList(const std::filesystem::path& path, std::vector<ChartListEntry>& out);
-platform::Status WriteList(const std::filesystem::path& path, const std::vector<ChartListEntry>& entries);
+platform::Status WriteList(const std::filesystem::path& path,
+                           const std::vector<ChartListEntry>& entries);
 
 // Display names of the ten user lists ("Chart List A" ... by default).
 std::array<std::string, 10> GetSubLists(const platform::SettingsStore& store);
@@ -56,7 +57,8 @@ platform::Status BuildTmpNames(std::string_view dataFolder, std::string_view lis
 
 // `ShowList`: the trimmed codes of a list in its order. An absent list file is created empty,
 // as opening it for the editors does.
-platform::Status ShowList(std::string_view dataFolder, char letter, std::vector<std::string>& codes);
+platform::Status ShowList(std::string_view dataFolder, char letter,
+                          std::vector<std::string>& codes);
 // `StockList`: every trimmed code of Names.dat in file order (empty when there is no file).
 std::vector<std::string> StockList(std::string_view dataFolder);
 // The codes of a text file to import: each whole line (its line end dropped) that passes
@@ -100,7 +102,8 @@ private:
 inline constexpr std::string_view kListsSame = "Lists cannot be same";
 inline constexpr std::string_view kBothListsShown = "Both lists must be displayed";
 inline constexpr std::string_view kUtilitiesTitle = "Chart List Utilities";
-std::string ListChangedQuestion(std::string_view displayName); // name + " has changed. SAVE Changes?"
+std::string
+ListChangedQuestion(std::string_view displayName); // name + " has changed. SAVE Changes?"
 
 // " There are no records in <name> for this folder." ... the message of an empty list.
 std::string EmptyListMessage(std::string_view displayName);

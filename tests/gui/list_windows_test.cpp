@@ -2,6 +2,7 @@
 // imported, classes edited and checked, each saved and read back from disk, with the questions
 // and refusals the user sees.
 #include "gui/windows/cht_sel.h"
+#include "gui/windows/cl_names.h"
 #include "gui/windows/gics_class.h"
 #include "gui/windows/ind_class.h"
 #include "gui/windows/main_window.h"
@@ -58,7 +59,8 @@ struct Lists : ::testing::Test {
     }
     std::vector<std::string> Shown(QListWidget* box) {
         std::vector<std::string> codes;
-        for (int r = 0; r < box->count(); ++r) codes.push_back(box->item(r)->text().toStdString());
+        for (int r = 0; r < box->count(); ++r)
+            codes.push_back(box->item(r)->text().toStdString());
         return codes;
     }
     const platform::ScriptedDialogs::Shown& LastMsg() {
@@ -70,7 +72,8 @@ struct Lists : ::testing::Test {
     }
     void Select(QListWidget* box, std::initializer_list<int> rows) {
         box->clearSelection();
-        for (int r : rows) box->item(r)->setSelected(true);
+        for (int r : rows)
+            box->item(r)->setSelected(true);
     }
     void Click(QWidget& w, const char* name) {
         auto* b = w.findChild<QPushButton*>(QString::fromLatin1(name));
@@ -149,7 +152,8 @@ TEST_F(Lists, EditorAddsOrdersDeletesAndAsksBeforeLeavingAChangedList) {
     panel.chooser()->setCurrentIndex(1);
     EXPECT_EQ(LastMsg().text, "List has changed. SAVE Changes?");
     EXPECT_EQ(panel.box().letter(), 'B');
-    EXPECT_EQ(OnDisk('A'), (std::vector<std::string>{"HBK:12", "IRB:13", "JNS:14", "KST:15", "LMT:16"}));
+    EXPECT_EQ(OnDisk('A'),
+              (std::vector<std::string>{"HBK:12", "IRB:13", "JNS:14", "KST:15", "LMT:16"}));
     EXPECT_EQ(s.session.ini().Read("SubLists", "Last"), "3");
 
     // Back to A, change and save, then empty it and close saying Yes.
@@ -159,7 +163,7 @@ TEST_F(Lists, EditorAddsOrdersDeletesAndAsksBeforeLeavingAChangedList) {
     Click(w, "cmdAdd");
     Click(w, "cmdSave");
     EXPECT_EQ(OnDisk('A'), (std::vector<std::string>{"HBK:12", "IRB:13", "JNS:14", "KST:15",
-                                                      "LMT:16", "ADVDEC:3"}));
+                                                     "LMT:16", "ADVDEC:3"}));
     s.dialogs.QueueAnswer(Answer::Yes);
     Click(w, "cmdDeleteAll");
     EXPECT_EQ(LastMsg().text, "Delete all items ?");
@@ -256,9 +260,10 @@ QString Cell(QTableWidget* grid, int row, int column) {
 TEST_F(Lists, IndustryClassesAreCheckedCellByCellAndWrittenBackOnClose) {
     auto* w = new gui::IndClass(s.session);
     QStringList captions;
-    for (QAction* a : w->menus()->actions()) captions << a->text();
-    EXPECT_EQ(captions, (QStringList{"&Add Row", "&Delete Row", "&Sort List", "&Close",
-                                     "&Display", "&Print"}));
+    for (QAction* a : w->menus()->actions())
+        captions << a->text();
+    EXPECT_EQ(captions, (QStringList{"&Add Row", "&Delete Row", "&Sort List", "&Close", "&Display",
+                                     "&Print"}));
     QTableWidget* grid = w->grid();
     ASSERT_EQ(grid->rowCount(), 25);
     EXPECT_EQ(grid->horizontalHeaderItem(1)->text(), "Industry Classification");
@@ -353,7 +358,9 @@ TEST_F(Lists, ChartSelectionPicksAClassFromTheClassWindow) {
         EXPECT_EQ(w->findChild<QAction*>("mnuAddRow")->isEnabled(), false);
         w->grid()->cellDoubleClicked(9, 1);
     });
-    sel.PickClassCode(false);
+    auto* field = sel.findChild<QLineEdit*>("txtClass");
+    ASSERT_TRUE(field->isEnabled());
+    QTest::mouseDClick(field, Qt::LeftButton);
     EXPECT_EQ(sel.findChild<QLineEdit*>("txtClass")->text(), "211");
     EXPECT_EQ(state.ClassCode, "211");
     ASSERT_TRUE(sel.selection().Current().has_value());
@@ -370,4 +377,30 @@ TEST_F(Lists, ChartSelectionPicksAClassFromTheClassWindow) {
     EXPECT_EQ(LastMsg().text, "GICS Classification invalid");
     EXPECT_EQ(LastMsg().title, "Chart Select");
     EXPECT_FALSE(state.GicsWalk);
+}
+
+TEST_F(Lists, RenamingListsAsksBeforeLeavingAndTheChoosersFollow) {
+    ASSERT_NE(main.findChild<QAction*>("mnuRenameCL"), nullptr);
+    gui::CLNames w(s.session, hub());
+    EXPECT_EQ(w.windowTitle(), "Rename Chart Lists");
+    EXPECT_EQ(w.field(1)->text(), "Resources");
+    EXPECT_EQ(w.field(9)->text(), "Chart List K");
+    w.reject();
+    EXPECT_TRUE(s.dialogs.messages().empty()) << "nothing changed, nothing asked";
+
+    gui::CLNames again(s.session, hub());
+    again.field(1)->setText(" Miners ");
+    again.field(2)->setText("");
+    s.dialogs.QueueAnswer(Answer::No);
+    again.reject();
+    EXPECT_EQ(LastMsg().text, "Save changes ?");
+    EXPECT_EQ(LastMsg().title, "Sub-List Names");
+    EXPECT_EQ(store::GetSubLists(s.settings)[1], "Resources");
+    s.dialogs.QueueAnswer(Answer::Yes);
+    again.reject();
+    EXPECT_EQ(store::GetSubLists(s.settings)[1], "Miners");
+    EXPECT_EQ(again.field(2)->text(), "Chart List C") << "a blank name reads as its default";
+
+    gui::SubList2 utilities(s.session, hub());
+    EXPECT_EQ(utilities.panel(0).chooser()->itemText(1), "Miners");
 }

@@ -11,7 +11,8 @@ using kori::test::Name;
 namespace {
 void Names(const kori::test::TempRoot& root, std::vector<const char*> codes) {
     std::vector<NameRecord> recs;
-    for (auto c : codes) recs.push_back(Name(c, c));
+    for (auto c : codes)
+        recs.push_back(Name(c, c));
     NameFile f(NameFile::PathIn(root.folder()));
     ASSERT_TRUE(f.WriteAll(recs).ok());
 }

@@ -95,7 +95,8 @@ std::vector<std::size_t> ChartListPanel::SelectedRows() const {
 void ChartListPanel::Refresh() {
     const int current = m_list->currentRow();
     m_list->clear();
-    for (const auto& code : m_box.codes()) m_list->addItem(Q(code));
+    for (const auto& code : m_box.codes())
+        m_list->addItem(Q(code));
     if (current >= 0 && current < m_list->count()) m_list->setCurrentRow(current);
     m_count->setText(displayed() ? QStringLiteral("%1 charts").arg(m_box.codes().size())
                                  : QString());

@@ -74,12 +74,14 @@ ChtSel::ChtSel(app::Session& session, app::ChartState& state, QWidget* parent)
     m_classCode->setObjectName(QStringLiteral("txtClass"));
     m_classCode->setMaxLength(3);
     m_classCode->setPlaceholderText(QStringLiteral("class, Enter"));
+    m_classCode->setToolTip(QStringLiteral("Double-click to pick from the industry classes"));
     m_gicsBox = new QCheckBox(QStringLiteral("GICS"), security);
     m_gicsBox->setObjectName(QStringLiteral("chkGics"));
     m_gicsCode = new QLineEdit(security);
     m_gicsCode->setObjectName(QStringLiteral("txtGics"));
     m_gicsCode->setMaxLength(4);
     m_gicsCode->setPlaceholderText(QStringLiteral("sector, Enter"));
+    m_gicsCode->setToolTip(QStringLiteral("Double-click to pick from the GICS sectors"));
     auto* classes = new QHBoxLayout;
     classes->addWidget(m_classBox);
     classes->addWidget(m_classCode);

@@ -44,7 +44,8 @@ ClassWindow::ClassWindow(app::Session& session, const Kind& kind, bool pick, QWi
     m_grid->setHorizontalHeaderLabels(kind.headers);
     m_grid->horizontalHeader()->setStretchLastSection(true);
     m_grid->setSelectionMode(QAbstractItemView::SingleSelection);
-    for (int c = 1; c < m_grid->columnCount(); ++c) m_grid->setColumnWidth(c, 200);
+    for (int c = 1; c < m_grid->columnCount(); ++c)
+        m_grid->setColumnWidth(c, 200);
     m_grid->setColumnWidth(0, 120);
     if (pick) {
         m_grid->setEditTriggers(QAbstractItemView::NoEditTriggers);
@@ -78,11 +79,11 @@ void ClassWindow::SetRow(int row, const store::ClassRow& values) {
 
 void ClassWindow::Display() {
     m_filling = true;
-    const auto rows =
-        store::ReadClassFile(m_session.folders.SystemFolder, m_kind.fileName,
-                             static_cast<std::size_t>(m_grid->columnCount()));
+    const auto rows = store::ReadClassFile(m_session.folders.SystemFolder, m_kind.fileName,
+                                           static_cast<std::size_t>(m_grid->columnCount()));
     m_grid->setRowCount(static_cast<int>(rows.size()));
-    for (std::size_t r = 0; r < rows.size(); ++r) SetRow(static_cast<int>(r), rows[r]);
+    for (std::size_t r = 0; r < rows.size(); ++r)
+        SetRow(static_cast<int>(r), rows[r]);
     m_filling = false;
     m_changed = false;
 }
@@ -165,13 +166,15 @@ void ClassWindow::SortList() {
         return a[0] < b[0];
     });
     m_filling = true;
-    for (std::size_t r = 0; r < sorted.size(); ++r) SetRow(static_cast<int>(r), sorted[r]);
+    for (std::size_t r = 0; r < sorted.size(); ++r)
+        SetRow(static_cast<int>(r), sorted[r]);
     m_filling = false;
     if (sorted != *rows) m_changed = true;
 }
 
 bool ClassWindow::SaveChanges() {
-    if (!m_changed) return true;
+    // A pick only reads the file; a sort made to find a row there is not kept.
+    if (!m_changed || m_pick) return true;
     const auto rows = Rows();
     if (!rows) return false;
     if (auto s = store::WriteClassFile(m_session.folders.SystemFolder, m_kind.fileName, *rows);
@@ -192,7 +195,8 @@ void ClassWindow::PrintTo(QPrinter& printer) const {
     QString html = QStringLiteral("<h3>%1</h3><table border=\"1\" cellspacing=\"0\" "
                                   "cellpadding=\"3\"><tr>")
                        .arg(windowTitle().toHtmlEscaped());
-    for (const auto& h : m_kind.headers) html += QStringLiteral("<th>%1</th>").arg(h.toHtmlEscaped());
+    for (const auto& h : m_kind.headers)
+        html += QStringLiteral("<th>%1</th>").arg(h.toHtmlEscaped());
     html += QStringLiteral("</tr>");
     for (int r = 0; r < m_grid->rowCount(); ++r) {
         html += QStringLiteral("<tr>");

@@ -22,11 +22,11 @@ class ClassWindow : public QDialog {
     Q_OBJECT
 public:
     struct Kind {
-        const char* name;      // window name, also its position key
-        const char* title;     // caption
-        const char* fileName;  // in the system folder
-        const char* msgTitle;  // title of its messages
-        int digits;            // of the code
+        const char* name;     // window name, also its position key
+        const char* title;    // caption
+        const char* fileName; // in the system folder
+        const char* msgTitle; // title of its messages
+        int digits;           // of the code
         QStringList headers;
         bool canPrint;
     };

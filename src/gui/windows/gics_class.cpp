@@ -4,7 +4,11 @@ namespace kori::gui {
 
 GicsClass::GicsClass(app::Session& session, bool pick, QWidget* parent)
     : ClassWindow(session,
-                  {"GicsClass", "Global Industry Classifications", "Gics.dat", "GICS Class", 4,
+                  {"GicsClass",
+                   "Global Industry Classifications",
+                   "Gics.dat",
+                   "GICS Class",
+                   4,
                    {QStringLiteral("GICS Sector Code"), QStringLiteral("Sector"),
                     QStringLiteral("Sub-Sector")},
                    false},

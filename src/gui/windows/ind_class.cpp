@@ -4,7 +4,11 @@ namespace kori::gui {
 
 IndClass::IndClass(app::Session& session, bool pick, QWidget* parent)
     : ClassWindow(session,
-                  {"IndClass", "Industry Classifications", "IndClass.dat", "Industry Class", 3,
+                  {"IndClass",
+                   "Industry Classifications",
+                   "IndClass.dat",
+                   "Industry Class",
+                   3,
                    {QStringLiteral("Class Id"), QStringLiteral("Industry Classification")},
                    true},
                   pick, parent) {}

@@ -4,8 +4,9 @@ namespace kori::gui {
 
 class MainWindow;
 
-// Adds the actions of "Edit Chart &Lists", "Chart List &Utilities", "&Import Text to Chart
-// Lists", "&Industry Classifications" and "&Global Industry Classifications".
+// Adds the actions of "Edit Chart &Lists", "Chart List &Utilities", "Rename Chart Lists",
+// "&Import Text to Chart Lists", "&Industry Classifications" and "&Global Industry
+// Classifications".
 void RegisterListWindows(MainWindow& main);
 
 } // namespace kori::gui

@@ -40,7 +40,8 @@ SubList::SubList(app::Session& session, SettingsHub& hub, QWidget* parent)
     const int columns = session.subLists.Columns > 0 ? session.subLists.Columns : 5;
     m_stocks->setMinimumWidth(columns * 64 + 24);
     m_stockCodes = store::StockList(session.folders.DataFolder);
-    for (const auto& code : m_stockCodes) m_stocks->addItem(Q(code));
+    for (const auto& code : m_stockCodes)
+        m_stocks->addItem(Q(code));
     connect(m_stocks, &QListWidget::itemDoubleClicked, this,
             [this](QListWidgetItem* item) { AddCode(item->text()); });
 
@@ -76,7 +77,8 @@ SubList::SubList(app::Session& session, SettingsHub& hub, QWidget* parent)
     left->addLayout(entry);
     left->addWidget(m_panel, 1);
     auto* tools = new QVBoxLayout;
-    for (auto* b : {del, delAll, up, down}) tools->addWidget(b);
+    for (auto* b : {del, delAll, up, down})
+        tools->addWidget(b);
     tools->addStretch();
     auto* right = new QVBoxLayout;
     right->addWidget(new QLabel(QStringLiteral("All codes (double-click to add)"), this));

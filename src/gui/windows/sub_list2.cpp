@@ -83,7 +83,8 @@ bool SubList2::CopyAcross(int fromSide) {
         return false;
     }
     const auto rows = from.SelectedRows();
-    for (std::size_t row : rows) to.box().Add(from.box().codes()[row]);
+    for (std::size_t row : rows)
+        to.box().Add(from.box().codes()[row]);
     to.Refresh();
     return !rows.empty();
 }

@@ -82,7 +82,8 @@ bool SubList3::LoadFile(const std::filesystem::path& file) {
         return false;
     }
     m_file->clear();
-    for (const auto& code : *codes) m_file->addItem(Q(code));
+    for (const auto& code : *codes)
+        m_file->addItem(Q(code));
     const std::string dir = platform::FolderWithSlash(file.parent_path().string());
     m_session.services().settings.Save(kFolderKey, dir);
     m_folder->setText(Q(dir));
@@ -94,8 +95,10 @@ int SubList3::MoveToList(bool all) {
     std::vector<int> rows;
     for (int r = 0; r < m_file->count(); ++r)
         if (all || m_file->item(r)->isSelected()) rows.push_back(r);
-    for (int r : rows) m_panel->box().Add(S(m_file->item(r)->text()));
-    for (auto it = rows.rbegin(); it != rows.rend(); ++it) delete m_file->takeItem(*it);
+    for (int r : rows)
+        m_panel->box().Add(S(m_file->item(r)->text()));
+    for (auto it = rows.rbegin(); it != rows.rend(); ++it)
+        delete m_file->takeItem(*it);
     m_panel->Refresh();
     return static_cast<int>(rows.size());
 }
