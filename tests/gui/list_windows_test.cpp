@@ -404,3 +404,16 @@ TEST_F(Lists, RenamingListsAsksBeforeLeavingAndTheChoosersFollow) {
     gui::SubList2 utilities(s.session, hub());
     EXPECT_EQ(utilities.panel(0).chooser()->itemText(1), "Miners");
 }
+
+TEST_F(Lists, AMissingClassFileStartsAnEmptyGridAndIsWrittenOnClose) {
+    std::filesystem::remove(platform::ResolveIn(sys(), "Gics.dat"));
+    gui::GicsClass w(s.session);
+    EXPECT_EQ(w.grid()->rowCount(), 0);
+    w.findChild<QAction*>("mnuAddRow")->trigger();
+    ASSERT_EQ(w.grid()->rowCount(), 1);
+    Edit(w.grid(), 0, 0, "4510");
+    Edit(w.grid(), 0, 1, "Information Technology");
+    w.findChild<QAction*>("mnuClose")->trigger();
+    EXPECT_EQ(ReadSys("Gics.dat"), "4510,Information Technology,\r\n");
+    EXPECT_EQ(store::SectorNameOf(sys(), "4510"), "Information Technology_");
+}
