@@ -403,6 +403,7 @@ TEST_F(Lists, RenamingListsAsksBeforeLeavingAndTheChoosersFollow) {
 
     gui::SubList2 utilities(s.session, hub());
     EXPECT_EQ(utilities.panel(0).chooser()->itemText(1), "Miners");
+    Shot(again, "CLNames");
 }
 
 TEST_F(Lists, AMissingClassFileStartsAnEmptyGridAndIsWrittenOnClose) {

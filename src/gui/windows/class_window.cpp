@@ -43,6 +43,7 @@ ClassWindow::ClassWindow(app::Session& session, const Kind& kind, bool pick, QWi
     m_grid->setObjectName(QStringLiteral("grdClass"));
     m_grid->setHorizontalHeaderLabels(kind.headers);
     m_grid->horizontalHeader()->setStretchLastSection(true);
+    m_grid->verticalHeader()->setDefaultSectionSize(22);
     m_grid->setSelectionMode(QAbstractItemView::SingleSelection);
     for (int c = 1; c < m_grid->columnCount(); ++c)
         m_grid->setColumnWidth(c, 200);

@@ -9,6 +9,7 @@
 #include <QLineEdit>
 #include <QListWidget>
 #include <QPushButton>
+#include <QShortcut>
 #include <QVBoxLayout>
 
 #include <algorithm>
@@ -58,6 +59,9 @@ SubList::SubList(app::Session& session, SettingsHub& hub, QWidget* parent)
     });
     auto* del = Button(QStringLiteral("&Delete"), "cmdDelete");
     connect(del, &QPushButton::clicked, this, &SubList::DeleteSelected);
+    auto* delKey = new QShortcut(QKeySequence::Delete, m_panel->list());
+    delKey->setContext(Qt::WidgetShortcut);
+    connect(delKey, &QShortcut::activated, this, &SubList::DeleteSelected);
     auto* delAll = Button(QStringLiteral("Delete A&ll"), "cmdDeleteAll");
     connect(delAll, &QPushButton::clicked, this, &SubList::DeleteAll);
     auto* up = Button(QStringLiteral("Move &Up"), "cmdUp");
