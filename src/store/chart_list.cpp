@@ -6,6 +6,7 @@
 #include "store/record_codec.h"
 #include "store/record_file.h"
 
+#include <algorithm>
 #include <cctype>
 
 namespace kori::store {
@@ -58,7 +59,8 @@ void SaveSLNames(platform::SettingsStore& store, const std::array<std::string, 1
         store.Save("SubList" + std::string(1, kListLetters[i]), platform::Trim(names[i]));
 }
 
-Status SaveListFromCodes(std::string_view dataFolder, char letter, const std::vector<std::string>& codes) {
+Status SaveListFromCodes(std::string_view dataFolder, char letter,
+                         const std::vector<std::string>& codes) {
     std::vector<NameRecord> names;
     NameFile nf(NameFile::PathIn(dataFolder));
     if (auto s = nf.Open(); !s) return s;
@@ -137,6 +139,109 @@ Status BuildTmpNames(std::string_view dataFolder, std::string_view listFileName)
         }
     }
     return platform::WriteFileAtomic(tmp, out);
+}
+
+Status ShowList(std::string_view dataFolder, char letter, std::vector<std::string>& codes) {
+    codes.clear();
+    const auto path = ListPath(dataFolder, letter);
+    if (!platform::FileExists(path))
+        if (auto s = WriteList(path, {}); !s) return s;
+    std::vector<ChartListEntry> entries;
+    if (auto s = ReadList(path, entries); !s) return s;
+    for (const auto& e : entries)
+        codes.push_back(platform::Trim(e.Code));
+    return Status::Ok();
+}
+
+std::vector<std::string> StockList(std::string_view dataFolder) {
+    std::vector<std::string> codes;
+    const auto path = NameFile::PathIn(dataFolder);
+    std::vector<NameRecord> names;
+    if (!platform::FileExists(path) || !NameFile(path).ReadAll(names)) return codes;
+    for (const auto& n : names)
+        codes.push_back(platform::Trim(n.Code));
+    return codes;
+}
+
+std::optional<std::vector<std::string>> ReadImportCodes(const std::filesystem::path& file) {
+    const auto content = platform::ReadWholeFile(file);
+    if (!content) return std::nullopt;
+    std::vector<std::string> codes;
+    std::size_t start = 0;
+    while (start < content->size()) {
+        std::size_t end = content->find_first_of("\r\n", start);
+        if (end == std::string::npos) end = content->size();
+        const std::string_view line(content->data() + start, end - start);
+        if (IsImportableCode(line)) codes.emplace_back(line);
+        // A line ends at CR, LF or CR LF.
+        start = end + 1;
+        if (end < content->size() && (*content)[end] == '\r' && start < content->size() &&
+            (*content)[start] == '\n')
+            ++start;
+    }
+    return codes;
+}
+
+std::vector<std::string> ListChoices(const platform::SettingsStore& store, bool withZ) {
+    const auto names = GetSubLists(store);
+    std::vector<std::string> choices(names.begin(), names.end());
+    if (withZ) choices.emplace_back("Chart List Z");
+    return choices;
+}
+
+int ModeOfChoice(int row) {
+    return row >= 0 && row < static_cast<int>(kListLetters.size()) ? row + 2 : 0;
+}
+
+int ChoiceOfMode(int listMode) {
+    return ListLetterOfMode(listMode) != 0 ? listMode - 2 : -1;
+}
+
+Status ChartListBox::Load(std::string_view dataFolder, char letter) {
+    m_letter = letter;
+    m_changed = false;
+    return ShowList(dataFolder, letter, m_codes);
+}
+
+Status ChartListBox::Save(std::string_view dataFolder) {
+    if (m_letter == 0) return Status::Error("No chart list is displayed");
+    if (auto s = SaveListFromCodes(dataFolder, m_letter, m_codes); !s) return s;
+    return Load(dataFolder, m_letter);
+}
+
+bool ChartListBox::Insert(std::size_t index, std::string_view code) {
+    std::string c = platform::Trim(code);
+    if (c.empty()) return false;
+    m_codes.insert(m_codes.begin() + static_cast<std::ptrdiff_t>(std::min(index, m_codes.size())),
+                   std::move(c));
+    m_changed = true;
+    return true;
+}
+
+bool ChartListBox::Remove(std::size_t index) {
+    if (index >= m_codes.size()) return false;
+    m_codes.erase(m_codes.begin() + static_cast<std::ptrdiff_t>(index));
+    m_changed = true;
+    return true;
+}
+
+void ChartListBox::Clear() {
+    if (!m_codes.empty()) m_changed = true;
+    m_codes.clear();
+}
+
+bool ChartListBox::Move(std::size_t from, std::size_t to) {
+    if (from >= m_codes.size() || to >= m_codes.size()) return false;
+    if (from == to) return true;
+    std::string c = std::move(m_codes[from]);
+    m_codes.erase(m_codes.begin() + static_cast<std::ptrdiff_t>(from));
+    m_codes.insert(m_codes.begin() + static_cast<std::ptrdiff_t>(to), std::move(c));
+    m_changed = true;
+    return true;
+}
+
+std::string ListChangedQuestion(std::string_view displayName) {
+    return std::string(displayName) + " has changed. SAVE Changes?";
 }
 
 std::string EmptyListMessage(std::string_view displayName) {

@@ -8,6 +8,7 @@
 #include <array>
 #include <cstdint>
 #include <filesystem>
+#include <optional>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -31,7 +32,8 @@ char ListLetterOfMode(int listMode);
 std::filesystem::path ListPath(std::string_view dataFolder, char letter);
 
 platform::Status ReadList(const std::filesystem::path& path, std::vector<ChartListEntry>& out);
-platform::Status WriteList(const std::filesystem::path& path, const std::vector<ChartListEntry>& entries);
+platform::Status WriteList(const std::filesystem::path& path,
+                           const std::vector<ChartListEntry>& entries);
 
 // Display names of the ten user lists ("Chart List A" ... by default).
 std::array<std::string, 10> GetSubLists(const platform::SettingsStore& store);
@@ -52,6 +54,56 @@ bool IsImportableCode(std::string_view line);
 // Builds TmpNames.tmp in the data folder: the name records of a list in its order, each with
 // Base holding its record number. Entries out of range are skipped.
 platform::Status BuildTmpNames(std::string_view dataFolder, std::string_view listFileName);
+
+// `ShowList`: the trimmed codes of a list in its order. An absent list file is created empty,
+// as opening it for the editors does.
+platform::Status ShowList(std::string_view dataFolder, char letter,
+                          std::vector<std::string>& codes);
+// `StockList`: every trimmed code of Names.dat in file order (empty when there is no file).
+std::vector<std::string> StockList(std::string_view dataFolder);
+// The codes of a text file to import: each whole line (its line end dropped) that passes
+// IsImportableCode, in file order. Nullopt when the file cannot be read.
+std::optional<std::vector<std::string>> ReadImportCodes(const std::filesystem::path& file);
+
+// Display names of the lists a chooser offers: the ten user lists, and "Chart List Z" after
+// them when `withZ` (the utilities may show the scan list).
+std::vector<std::string> ListChoices(const platform::SettingsStore& store, bool withZ);
+// List mode (2..12) of a chooser row, and back; 0 / -1 when out of range.
+int ModeOfChoice(int row);
+int ChoiceOfMode(int listMode);
+
+// The box of codes an editor holds for one list between loading and SAVE: the order is the
+// user's, duplicates stay, and every change marks it changed until it is saved or reloaded.
+class ChartListBox {
+public:
+    platform::Status Load(std::string_view dataFolder, char letter);
+    // SaveSubList: codes not in Names.dat are dropped; the box then shows the list as saved.
+    platform::Status Save(std::string_view dataFolder);
+
+    char letter() const { return m_letter; }
+    bool changed() const { return m_changed; }
+    const std::vector<std::string>& codes() const { return m_codes; }
+
+    // Inserts at `index` (appends when out of range); the code is trimmed, blanks are refused.
+    bool Insert(std::size_t index, std::string_view code);
+    bool Add(std::string_view code) { return Insert(m_codes.size(), code); }
+    bool Remove(std::size_t index);
+    void Clear();
+    // Moves one code to another place; false when either index is out of range.
+    bool Move(std::size_t from, std::size_t to);
+
+private:
+    char m_letter = 0;
+    bool m_changed = false;
+    std::vector<std::string> m_codes;
+};
+
+// The refusals of the list utilities and the question of a list left with changes.
+inline constexpr std::string_view kListsSame = "Lists cannot be same";
+inline constexpr std::string_view kBothListsShown = "Both lists must be displayed";
+inline constexpr std::string_view kUtilitiesTitle = "Chart List Utilities";
+std::string
+ListChangedQuestion(std::string_view displayName); // name + " has changed. SAVE Changes?"
 
 // " There are no records in <name> for this folder." ... the message of an empty list.
 std::string EmptyListMessage(std::string_view displayName);

@@ -2,6 +2,7 @@
 
 #include "gui/windows/cht_bands.h"
 #include "gui/windows/cht_options.h"
+#include "gui/windows/class_window.h"
 #include "gui/windows/fin_date.h"
 #include "gui/windows/search.h"
 #include "platform/palette.h"
@@ -73,12 +74,14 @@ ChtSel::ChtSel(app::Session& session, app::ChartState& state, QWidget* parent)
     m_classCode->setObjectName(QStringLiteral("txtClass"));
     m_classCode->setMaxLength(3);
     m_classCode->setPlaceholderText(QStringLiteral("class, Enter"));
+    m_classCode->setToolTip(QStringLiteral("Double-click to pick from the industry classes"));
     m_gicsBox = new QCheckBox(QStringLiteral("GICS"), security);
     m_gicsBox->setObjectName(QStringLiteral("chkGics"));
     m_gicsCode = new QLineEdit(security);
     m_gicsCode->setObjectName(QStringLiteral("txtGics"));
     m_gicsCode->setMaxLength(4);
     m_gicsCode->setPlaceholderText(QStringLiteral("sector, Enter"));
+    m_gicsCode->setToolTip(QStringLiteral("Double-click to pick from the GICS sectors"));
     auto* classes = new QHBoxLayout;
     classes->addWidget(m_classBox);
     classes->addWidget(m_classCode);
@@ -124,6 +127,8 @@ ChtSel::ChtSel(app::Session& session, app::ChartState& state, QWidget* parent)
     m_finish->setObjectName(QStringLiteral("txtFinish"));
     m_finish->setReadOnly(true);
     m_finish->installEventFilter(this);
+    m_classCode->installEventFilter(this);
+    m_gicsCode->installEventFilter(this);
     m_volume = new QPushButton(chart);
     m_volume->setObjectName(QStringLiteral("Text7"));
     m_av1 = new QCheckBox(chart);
@@ -312,8 +317,16 @@ void ChtSel::ClassBoxTicked(bool gics, bool on) {
     if (on) (gics ? m_gicsCode : m_classCode)->setFocus();
 }
 
+void ChtSel::PickClassCode(bool gics) {
+    // A row picked in the class window starts the walk; nothing picked ends it with the
+    // "invalid" message.
+    const auto code = PickClass(m_session, gics, this);
+    (gics ? m_gicsCode : m_classCode)->setText(Q(code.value_or(std::string())));
+    ClassCodeEntered(gics);
+}
+
 void ChtSel::ClassCodeEntered(bool gics) {
-    // The class windows' pick mode is not in this program yet: the code is typed here.
+    // A code may also be typed and entered.
     m_sel.SetClassCode(gics, (gics ? m_gicsCode : m_classCode)->text().toStdString());
     Refresh();
 }
@@ -340,6 +353,12 @@ bool ChtSel::eventFilter(QObject* watched, QEvent* event) {
             }
         }
         Refresh();
+        return true;
+    }
+    if ((watched == m_classCode || watched == m_gicsCode) &&
+        event->type() == QEvent::MouseButtonDblClick &&
+        static_cast<QWidget*>(watched)->isEnabled()) {
+        PickClassCode(watched == m_gicsCode);
         return true;
     }
     return QWidget::eventFilter(watched, event);

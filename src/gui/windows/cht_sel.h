@@ -34,6 +34,8 @@ public:
     void ShowChart();
     void CloseWindow();
     void ChangeList();
+    // Double click in a class field: the class window in its pick mode chooses the code.
+    void PickClassCode(bool gics);
 
 signals:
     void ShowChartRequested();

@@ -1,6 +1,7 @@
 #include "gui/windows/register_windows.h"
 
 #include "gui/windows/chart_windows.h"
+#include "gui/windows/list_windows.h"
 #include "gui/windows/main_window.h"
 #include "gui/windows/settings_windows.h"
 
@@ -10,6 +11,7 @@ void RegisterWindows(MainWindow& main) {
     // Each family of windows adds its actions here; the menus then show what is built.
     RegisterSettingsWindows(main);
     RegisterChartWindows(main);
+    RegisterListWindows(main);
     main.RebuildMenus();
 }
 
