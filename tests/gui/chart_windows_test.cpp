@@ -1,5 +1,7 @@
 // The road of one chart on the desktop: "&CHARTS", the selection, the chart window and its
 // toolbar, a trendline drawn with the mouse, printing to a PDF file, saving and showing again.
+#include "desktop_fixture.h"
+
 #include "app/chart_service.h"
 #include "app/chart_window_tools.h"
 #include "chart/trendline_file.h"
@@ -13,7 +15,6 @@
 #include "gui/windows/register_windows.h"
 #include "platform/files.h"
 #include "store/price_file.h"
-#include "support/sample_session.h"
 
 #include <QAction>
 #include <QApplication>
@@ -36,19 +37,8 @@ using namespace kori;
 
 namespace {
 
-struct Road : ::testing::Test {
-    test::SampleSession s;
-    gui::MainWindow main{s.session};
-
-    void SetUp() override {
-        gui::RegisterWindows(main);
-        main.resize(1280, 860);
-        main.show();
-        QApplication::processEvents();
-    }
-    gui::ChartWindows* charts() { return main.findChild<gui::ChartWindows*>(); }
+struct Road : test::DesktopTest {
     gui::ChtSel* sel() { return charts()->chtSel(); }
-    gui::Chts* chts() { return charts()->chts(); }
     void Key(const char* key) {
         QAction* a = chts()->ToolKey(key);
         ASSERT_NE(a, nullptr) << key;

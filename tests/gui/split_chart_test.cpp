@@ -1,6 +1,8 @@
 // A split chart in the chart window: Chart2's OK splits the chart on show, the stream carries
 // both halves to paper and to a saved chart, and the next chart or "Single Chart" ends it.
 // Window places kept in the settings store follow the screen they were written on.
+#include "desktop_fixture.h"
+
 #include "app/chart_service.h"
 #include "app/window_position.h"
 #include "gui/widgets/chart_view.h"
@@ -14,7 +16,6 @@
 #include "gui/windows/register_windows.h"
 #include "gui/windows/settings_windows.h"
 #include "platform/files.h"
-#include "support/sample_session.h"
 
 #include <QAction>
 #include <QApplication>
@@ -33,18 +34,7 @@ using namespace kori;
 
 namespace {
 
-struct SplitRoad : ::testing::Test {
-    test::SampleSession s;
-    gui::MainWindow main{s.session};
-
-    void SetUp() override {
-        gui::RegisterWindows(main);
-        main.resize(1280, 860);
-        main.show();
-        QApplication::processEvents();
-    }
-    gui::ChartWindows* charts() { return main.findChild<gui::ChartWindows*>(); }
-    gui::Chts* chts() { return charts()->chts(); }
+struct SplitRoad : test::DesktopTest {
     void ShowCode(const char* code) {
         ASSERT_TRUE(charts()->ShowCode(code));
         QApplication::processEvents();
