@@ -111,6 +111,20 @@ struct ChartSetup {
     }
 };
 
+// Builds the chart again and again on a recording surface, counting bars and drawing calls.
+inline void RunChartBuild(benchmark::State& state, ChartSetup& setup, chart::PriceSource& source,
+                          platform::RecordingSurface& surface) {
+    chart::Chart c;
+    const chart::ChartBuild build = setup.Build();
+    for (auto _ : state) {
+        surface.ClearCalls();
+        if (!chart::BuildChart(c, build, source, surface)) state.SkipWithError("build failed");
+        benchmark::DoNotOptimize(c.BarCloseY.data());
+    }
+    state.counters["bars"] = c.LastBar() + 1;
+    state.counters["calls"] = static_cast<double>(surface.calls().size());
+}
+
 // Takes the calls and draws nothing: what the drawing code itself costs. Text is measured as
 // a plain proportional font would be.
 class NullSurface : public platform::Surface {

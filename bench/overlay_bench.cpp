@@ -24,15 +24,7 @@ struct Setup : bench::ChartSetup {
 };
 
 void RunBuild(benchmark::State& state, Setup& s) {
-    chart::Chart c;
-    const chart::ChartBuild build = s.Build();
-    for (auto _ : state) {
-        s.surface.ClearCalls();
-        if (!chart::BuildChart(c, build, s.source, s.surface)) state.SkipWithError("build failed");
-        benchmark::DoNotOptimize(c.BarCloseY.data());
-    }
-    state.counters["bars"] = c.LastBar() + 1;
-    state.counters["calls"] = static_cast<double>(s.surface.calls().size());
+    bench::RunChartBuild(state, s, s.source, s.surface);
 }
 
 void BM_PointFigureBuild(benchmark::State& state) {

@@ -203,20 +203,10 @@ TEST_F(Road, CursorReadoutAndFibonacciInTheStatusBar) {
 
 TEST_F(Road, PrintToAPdfFileThenSaveAndShowTheChartAgain) {
     TypeCode("bwg");
-    const auto pdf = s.root.path() / "chart.pdf";
-    {
-        QPrinter printer(QPrinter::HighResolution);
-        printer.setOutputFormat(QPrinter::PdfFormat);
-        printer.setOutputFileName(QString::fromStdString(pdf.string()));
-        printer.setPageOrientation(QPageLayout::Landscape);
-        ASSERT_TRUE(chts()->PrintTo(printer));
-    }
-    const auto bytes = platform::ReadWholeFile(pdf);
+    const auto bytes = PrintToPdf("printed.pdf");
     ASSERT_TRUE(bytes);
     EXPECT_EQ(bytes->rfind("%PDF", 0), 0u);
     EXPECT_GT(bytes->size(), 2000u);
-    if (const char* dir = std::getenv("KORI_SHOTS"))
-        (void)platform::WriteFileAtomic(std::filesystem::path(dir) / "printed.pdf", *bytes);
 
     const std::string saved = s.session.folders.ChtSaveFolder + "BWG.cht";
     s.dialogs.clear();

@@ -5,10 +5,16 @@
 #include "gui/windows/chts.h"
 #include "gui/windows/main_window.h"
 #include "gui/windows/register_windows.h"
+#include "platform/files.h"
 #include "support/sample_session.h"
 
 #include <QApplication>
+#include <QPrinter>
 #include <gtest/gtest.h>
+
+#include <cstdlib>
+#include <optional>
+#include <string>
 
 namespace kori::test {
 
@@ -24,6 +30,23 @@ struct DesktopTest : ::testing::Test {
     }
     gui::ChartWindows* charts() { return main.findChild<gui::ChartWindows*>(); }
     gui::Chts* chts() { return charts()->chts(); }
+
+    // Prints the chart on show to a landscape PDF file in the root and gives its bytes (none
+    // when printing failed); a copy goes to KORI_SHOTS when that names a folder.
+    std::optional<std::string> PrintToPdf(const char* fileName) {
+        const auto pdf = s.root.path() / fileName;
+        {
+            QPrinter printer(QPrinter::HighResolution);
+            printer.setOutputFormat(QPrinter::PdfFormat);
+            printer.setOutputFileName(QString::fromStdString(pdf.string()));
+            printer.setPageOrientation(QPageLayout::Landscape);
+            if (!chts()->PrintTo(printer)) return std::nullopt;
+        }
+        auto bytes = platform::ReadWholeFile(pdf);
+        if (const char* dir = std::getenv("KORI_SHOTS"); dir && bytes)
+            (void)platform::WriteFileAtomic(std::filesystem::path(dir) / fileName, *bytes);
+        return bytes;
+    }
 };
 
 } // namespace kori::test

@@ -108,19 +108,9 @@ TEST_F(SplitRoad, SecondChartSplitsTheChartOnShowAndPrintAndSaveCarryIt) {
     chts()->Rebuild();
     EXPECT_EQ(StreamTitles().size(), 2u);
 
-    const auto pdf = s.root.path() / "split.pdf";
-    {
-        QPrinter printer(QPrinter::HighResolution);
-        printer.setOutputFormat(QPrinter::PdfFormat);
-        printer.setOutputFileName(QString::fromStdString(pdf.string()));
-        printer.setPageOrientation(QPageLayout::Landscape);
-        ASSERT_TRUE(chts()->PrintTo(printer));
-    }
-    const auto bytes = platform::ReadWholeFile(pdf);
+    const auto bytes = PrintToPdf("split.pdf");
     ASSERT_TRUE(bytes);
     EXPECT_EQ(bytes->rfind("%PDF", 0), 0u);
-    if (const char* dir = std::getenv("KORI_SHOTS"))
-        (void)platform::WriteFileAtomic(std::filesystem::path(dir) / "split.pdf", *bytes);
 
     const std::string saved = s.session.folders.ChtSaveFolder + "ALX.cht";
     ASSERT_TRUE(chts()->SaveChartAs(saved));

@@ -7,6 +7,13 @@
 
 namespace kori::gui {
 
+QHBoxLayout* ButtonRow(std::initializer_list<QWidget*> buttons) {
+    auto* row = new QHBoxLayout;
+    row->addStretch();
+    for (QWidget* b : buttons) row->addWidget(b);
+    return row;
+}
+
 SettingsDialog::SettingsDialog(app::Session& session, SettingsHub& hub, const char* name,
                                const QString& title, QWidget* parent)
     : QDialog(parent), m_session(session), m_hub(hub) {
@@ -30,11 +37,7 @@ QHBoxLayout* SettingsDialog::SaveRow(std::function<bool()> save, const QString& 
         if (save()) accept();
     });
     connect(leave, &QPushButton::clicked, this, &QDialog::reject);
-    auto* row = new QHBoxLayout;
-    row->addStretch();
-    row->addWidget(saveButton);
-    row->addWidget(leave);
-    return row;
+    return ButtonRow({saveButton, leave});
 }
 
 } // namespace kori::gui

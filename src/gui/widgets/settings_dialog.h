@@ -8,10 +8,12 @@
 #include <QString>
 
 #include <functional>
+#include <initializer_list>
 #include <string>
 
 class QHBoxLayout;
 class QPushButton;
+class QWidget;
 
 namespace kori::gui {
 
@@ -21,6 +23,9 @@ inline QString Q(const std::string& s) {
 inline std::string S(const QString& s) {
     return s.toStdString();
 }
+
+// Buttons in a row at the bottom right of a window, in the order given.
+QHBoxLayout* ButtonRow(std::initializer_list<QWidget*> buttons);
 
 class SettingsDialog : public QDialog {
     Q_OBJECT

@@ -37,11 +37,7 @@ void ChartDefaultWindow::AddButtons() {
         if (Ok()) accept();
     });
     connect(cancel, &QPushButton::clicked, this, &QDialog::reject);
-    auto* row = new QHBoxLayout;
-    row->addStretch();
-    row->addWidget(ok);
-    row->addWidget(cancel);
-    m_layout->addLayout(row);
+    m_layout->addLayout(ButtonRow({ok, cancel}));
 }
 
 void ChartDefaultWindow::Store() {

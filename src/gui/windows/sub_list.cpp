@@ -91,13 +91,9 @@ SubList::SubList(app::Session& session, SettingsHub& hub, QWidget* parent)
     body->addLayout(left, 2);
     body->addLayout(tools);
     body->addLayout(right, 3);
-    auto* row = new QHBoxLayout;
-    row->addStretch();
-    row->addWidget(save);
-    row->addWidget(close);
     auto* layout = new QVBoxLayout(this);
     layout->addLayout(body, 1);
-    layout->addLayout(row);
+    layout->addLayout(ButtonRow({save, close}));
     resize(560, 420);
 
     const int last = session.subLists.Last;

@@ -49,12 +49,9 @@ SubList2::SubList2(app::Session& session, SettingsHub& hub, QWidget* parent)
 
     auto* close = Button(QStringLiteral("Close"), "cmdClose");
     connect(close, &QPushButton::clicked, this, &SubList2::reject);
-    auto* row = new QHBoxLayout;
-    row->addStretch();
-    row->addWidget(close);
     auto* layout = new QVBoxLayout(this);
     layout->addLayout(body, 1);
-    layout->addLayout(row);
+    layout->addLayout(ButtonRow({close}));
     resize(520, 420);
 }
 

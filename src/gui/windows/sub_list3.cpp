@@ -52,13 +52,9 @@ SubList3::SubList3(app::Session& session, SettingsHub& hub, QWidget* parent)
     body->addLayout(left, 1);
     body->addLayout(middle);
     body->addWidget(m_panel, 1);
-    auto* row = new QHBoxLayout;
-    row->addStretch();
-    row->addWidget(save);
-    row->addWidget(close);
     auto* layout = new QVBoxLayout(this);
     layout->addLayout(body, 1);
-    layout->addLayout(row);
+    layout->addLayout(ButtonRow({save, close}));
     resize(520, 420);
     m_panel->Display(2);
 }
