@@ -27,8 +27,8 @@ inline store::PriceRecord SyntheticRecord(int i, float ripple = 0) {
     std::snprintf(date, sizeof date, "%04d%02d%02d", 1900 + i / 250, 1 + (i / 21) % 12, 1 + i % 21);
     r.Date = date;
     const float x = static_cast<float>(i);
-    const float mid = 20 + 8 * std::sin(x / 300) + ripple * std::sin(x / 13) +
-                      static_cast<float>(i % 7) * 0.1f;
+    const float mid =
+        20 + 8 * std::sin(x / 300) + ripple * std::sin(x / 13) + static_cast<float>(i % 7) * 0.1f;
     r.Open = mid - 0.2f;
     r.High = mid + 0.5f;
     r.Low = mid - 0.5f;

@@ -25,7 +25,8 @@ std::filesystem::path WriteHistory() {
     const auto path = dir / "BENCH.WDT";
     std::vector<store::PriceRecord> records;
     records.reserve(bench::kRecords);
-    for (int i = 0; i < bench::kRecords; ++i) records.push_back(bench::SyntheticRecord(i));
+    for (int i = 0; i < bench::kRecords; ++i)
+        records.push_back(bench::SyntheticRecord(i));
     std::filesystem::remove(path);
     store::PriceFile file(path);
     if (!file.Open() || !file.WriteAll(records)) return {};

@@ -19,9 +19,9 @@
 
 #include <algorithm>
 #include <cstdint>
+#include <cstring>
 #include <random>
 #include <string_view>
-#include <cstring>
 
 namespace {
 

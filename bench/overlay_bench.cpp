@@ -9,7 +9,6 @@
 
 #include <benchmark/benchmark.h>
 
-
 using namespace kori;
 
 namespace {

@@ -43,7 +43,13 @@ std::filesystem::path Folder() {
             recs.push_back(r);
             do { // next weekday, months of 28 days are enough for a benchmark calendar
                 ++wd;
-                if (++day > 28) { day = 1; if (++m > 12) { m = 1; ++y; } }
+                if (++day > 28) {
+                    day = 1;
+                    if (++m > 12) {
+                        m = 1;
+                        ++y;
+                    }
+                }
                 if (wd > 7) wd = 1;
             } while (wd == 1 || wd == 7);
         }

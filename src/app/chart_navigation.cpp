@@ -84,7 +84,8 @@ platform::Status ChartWalk::WriteRecordAt(int position, const store::NameRecord&
     return platform::Status::Ok();
 }
 
-std::optional<store::NameRecord> StepChart(ChartWalk& walk, chart::ChartRequest& request, int delta) {
+std::optional<store::NameRecord> StepChart(ChartWalk& walk, chart::ChartRequest& request,
+                                           int delta) {
     const int count = walk.Count();
     if (count <= 0) return std::nullopt;
     int pos = request.ListPosition + delta;
@@ -94,15 +95,16 @@ std::optional<store::NameRecord> StepChart(ChartWalk& walk, chart::ChartRequest&
     return walk.RecordAt(pos);
 }
 
-std::optional<store::NameRecord> StepClassChart(ChartWalk& walk, chart::ChartRequest& request, int delta,
-                                                std::string_view classCode, bool gics,
+std::optional<store::NameRecord> StepClassChart(ChartWalk& walk, chart::ChartRequest& request,
+                                                int delta, std::string_view classCode, bool gics,
                                                 platform::Dialogs& dialogs) {
     std::vector<int> matches;
     for (int p = 0; (p = store::FindNextClassRecord(walk.names(), p, classCode, gics)) != 0;)
         matches.push_back(p);
     if (matches.empty()) {
         if (gics)
-            dialogs.MsgBox("No records on file for that GICS classification", "GICS Classification");
+            dialogs.MsgBox("No records on file for that GICS classification",
+                           "GICS Classification");
         else
             dialogs.MsgBox("No records on file for that Industry classification or group",
                            "Industry Classification");
@@ -144,7 +146,9 @@ std::string ReadoutPrice(double price) {
 }
 
 namespace {
-std::string Volume(double v) { return platform::Trim(chart::FormatNumber(v, "###0")); }
+std::string Volume(double v) {
+    return platform::Trim(chart::FormatNumber(v, "###0"));
+}
 } // namespace
 
 std::vector<std::string> CursorReadout(const chart::Chart& chart, double x, bool closeOnly) {
@@ -203,13 +207,15 @@ std::vector<std::string> RiseFallReadout(const chart::Chart& chart, double xDown
 namespace kori::app {
 
 int PriceRecordCount(const Session& session, std::string_view code) {
-    store::PriceFile pf(store::PriceFile::PathFor(session.folders.DataFolder, platform::Trim(code)));
+    store::PriceFile pf(
+        store::PriceFile::PathFor(session.folders.DataFolder, platform::Trim(code)));
     if (!pf.Open()) return 0;
     return pf.Count();
 }
 
 std::string PriceRecordDate(const Session& session, std::string_view code, int recordNumber) {
-    store::PriceFile pf(store::PriceFile::PathFor(session.folders.DataFolder, platform::Trim(code)));
+    store::PriceFile pf(
+        store::PriceFile::PathFor(session.folders.DataFolder, platform::Trim(code)));
     store::PriceRecord r;
     if (!pf.Open() || !pf.Read(recordNumber, r)) return {};
     return r.Date;

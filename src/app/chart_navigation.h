@@ -46,18 +46,21 @@ private:
 };
 
 // Record types 1 to 3 are close-only: they chart as lines whatever the style asked.
-inline bool IsCloseOnly(int recordType) { return recordType >= 1 && recordType <= 3; }
+inline bool IsCloseOnly(int recordType) {
+    return recordType >= 1 && recordType <= 3;
+}
 
 // The next-chart command: steps `ListPosition` by `delta` (+1 "fwd", -1 "rev", 0 "ref") with a
 // wrap at both ends and reads the record; nullopt when the list is empty. Close-only types are
 // drawn as lines by the build itself, so the style asked for stands for the next security.
-std::optional<store::NameRecord> StepChart(ChartWalk& walk, chart::ChartRequest& request, int delta);
+std::optional<store::NameRecord> StepChart(ChartWalk& walk, chart::ChartRequest& request,
+                                           int delta);
 
 // `FindNextChtIC` / `FindNextChtGICS`: the next (delta 1) or previous (delta -1) record of a
 // class in the full list, wrapping round; with none on file, the message of the walk and
 // nullopt.
-std::optional<store::NameRecord> StepClassChart(ChartWalk& walk, chart::ChartRequest& request, int delta,
-                                                std::string_view classCode, bool gics,
+std::optional<store::NameRecord> StepClassChart(ChartWalk& walk, chart::ChartRequest& request,
+                                                int delta, std::string_view classCode, bool gics,
                                                 platform::Dialogs& dialogs);
 
 // Status-bar panes for the bar under x: "Open  ", "High  ", "Low  ", "Close  ", "Vol  " with

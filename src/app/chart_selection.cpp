@@ -1,9 +1,9 @@
 #include "app/chart_selection.h"
 
 #include "platform/date_text.h"
-#include "store/classifications.h"
 #include "platform/files.h"
 #include "platform/text.h"
+#include "store/classifications.h"
 #include "store/name_record.h"
 
 #include <algorithm>
@@ -42,7 +42,8 @@ int OscChoiceOf(const chart::ChartRequest& r) {
     if (!r.AutoOsc) return 0;
     const auto& rows = OscChoices();
     for (std::size_t i = 1; i < rows.size(); ++i)
-        if (r.AutoOscCode == rows[i].Code && (r.AutoOscCode != "STO" || rows[i].Slow == r.AutoOscSlow))
+        if (r.AutoOscCode == rows[i].Code &&
+            (r.AutoOscCode != "STO" || rows[i].Slow == r.AutoOscSlow))
             return static_cast<int>(i);
     return 0;
 }
@@ -73,7 +74,8 @@ std::optional<std::string> ParseFinishDate(std::string_view typed) {
         parts[field] = parts[field] * 10 + (ch - '0');
         if (++digits[field] > 4) return std::nullopt;
     }
-    if (field != 2 || digits[0] == 0 || digits[0] > 2 || digits[1] == 0 || digits[1] > 2) return std::nullopt;
+    if (field != 2 || digits[0] == 0 || digits[0] > 2 || digits[1] == 0 || digits[1] > 2)
+        return std::nullopt;
     int year = parts[2];
     if (digits[2] == 2)
         year += year < 30 ? 2000 : 1900;
@@ -141,8 +143,9 @@ bool ChartSelection::Load() {
     if (r.ByFinishDate) {
         // "d/m/yy": the short form without its leading zeros.
         const auto d = platform::ParseDateText(r.FinishDate);
-        if (d) m_form.FinishText = std::to_string(d->day) + "/" + std::to_string(d->month) + "/" +
-                                   r.FinishDate.substr(2, 2);
+        if (d)
+            m_form.FinishText = std::to_string(d->day) + "/" + std::to_string(d->month) + "/" +
+                                r.FinishDate.substr(2, 2);
     }
     return true;
 }
@@ -267,9 +270,11 @@ bool ChartSelection::SetClassCode(bool gics, std::string_view code) {
     // A code of the table, or a group ("..0") that some code of the table falls in.
     bool known = false;
     if (!c.empty())
-        for (const auto& row : store::ReadClassFile(sys, gics ? "Gics.dat" : "IndClass.dat", gics ? 3 : 2)) {
+        for (const auto& row :
+             store::ReadClassFile(sys, gics ? "Gics.dat" : "IndClass.dat", gics ? 3 : 2)) {
             const std::string id = row.empty() ? std::string() : platform::Trim(row[0]);
-            if (id == c || (c.back() == '0' && id.size() == c.size() && id.substr(0, 2) == c.substr(0, 2)))
+            if (id == c ||
+                (c.back() == '0' && id.size() == c.size() && id.substr(0, 2) == c.substr(0, 2)))
                 known = true;
         }
     if (!known) {
@@ -289,13 +294,16 @@ bool ChartSelection::SetClassCode(bool gics, std::string_view code) {
 bool ChartSelection::FindNextClass() {
     const bool gics = m_state.GicsWalk;
     const std::string& code = gics ? m_state.GicsCode : m_state.ClassCode;
-    const int pos = store::FindNextClassRecord(m_walk.names(), m_state.Request.ListPosition, code, gics);
+    const int pos =
+        store::FindNextClassRecord(m_walk.names(), m_state.Request.ListPosition, code, gics);
     if (pos == 0) {
         if (gics)
-            m_session.dialogs().MsgBox("No records on file for that GICS classification", "GICS Classification");
+            m_session.dialogs().MsgBox("No records on file for that GICS classification",
+                                       "GICS Classification");
         else
-            m_session.dialogs().MsgBox("No records on file for that Industry classification or group",
-                                       "Industry Classification");
+            m_session.dialogs().MsgBox(
+                "No records on file for that Industry classification or group",
+                "Industry Classification");
         return false;
     }
     auto& r = m_state.Request;
@@ -424,14 +432,17 @@ bool ChartSelection::SetFinishDate(std::optional<std::string> typed) {
     return true;
 }
 
-void ChartSelection::WriteSettings() { chart::SaveChartRequestSettings(m_session.ini(), m_state.Request); }
+void ChartSelection::WriteSettings() {
+    chart::SaveChartRequestSettings(m_session.ini(), m_state.Request);
+}
 
 void ChartSelection::ShowChart() {
     auto& r = m_state.Request;
     r.ScrollMode = false;
     r.ChartStyle = kStyleLetters[static_cast<std::size_t>(m_form.StyleIndex)];
     r.ChartPeriod = kPeriodLetters[static_cast<std::size_t>(m_form.PeriodIndex)];
-    r.BarSpacing = static_cast<std::int16_t>(r.ChartStyle == 'P' && m_form.Spacing < 2 ? 2 : m_form.Spacing);
+    r.BarSpacing =
+        static_cast<std::int16_t>(r.ChartStyle == 'P' && m_form.Spacing < 2 ? 2 : m_form.Spacing);
     if (r.ChartStyle != 'P') {
         r.ChartBands = static_cast<std::int16_t>(m_form.BandIndex);
         ChooseOscillator(m_form.OscIndex);
@@ -452,7 +463,8 @@ void ChartSelection::Close() {
     const char* s = "Charts";
     if (r.ChartStyle != ' ') ini.Write(s, "Type", std::string(1, r.ChartStyle));
     if (r.ChartPeriod != ' ') ini.Write(s, "Period", std::string(1, r.ChartPeriod));
-    if (m_form.Spacing >= 1 && m_form.Spacing <= 10) ini.Write(s, "Spacing", std::to_string(m_form.Spacing));
+    if (m_form.Spacing >= 1 && m_form.Spacing <= 10)
+        ini.Write(s, "Spacing", std::to_string(m_form.Spacing));
     if (r.ChartBands == 1 || r.ChartBands == 2) ini.Write(s, "Bands", std::to_string(r.ChartBands));
     ini.Write(s, "AutoOsc", r.AutoOsc ? "True" : "False");
     if (r.ListMode >= 1 && r.ListMode <= 3) ini.Write(s, "List", std::to_string(r.ListMode));
@@ -479,7 +491,8 @@ void ChartSelection::FolderChanged() {
 
 namespace kori::app {
 
-int FindNextMatch(const std::vector<store::NameRecord>& names, int afterPosition, std::string_view text) {
+int FindNextMatch(const std::vector<store::NameRecord>& names, int afterPosition,
+                  std::string_view text) {
     const std::string wanted = platform::Upper(platform::Trim(text));
     if (wanted.empty()) return 0;
     for (int pos = std::max(afterPosition, 0) + 1; pos <= static_cast<int>(names.size()); ++pos) {

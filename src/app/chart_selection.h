@@ -152,5 +152,6 @@ private:
 namespace kori::app {
 // The Search window's walk: the first position after `afterPosition` whose code or name holds
 // `text` (any case); 0 when the walk ends with no match.
-int FindNextMatch(const std::vector<store::NameRecord>& names, int afterPosition, std::string_view text);
+int FindNextMatch(const std::vector<store::NameRecord>& names, int afterPosition,
+                  std::string_view text);
 } // namespace kori::app

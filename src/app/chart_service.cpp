@@ -15,7 +15,9 @@ std::filesystem::path TempFolder(const Session& session) {
     return dir;
 }
 
-std::filesystem::path ChartStreamPath(const Session& session) { return TempFolder(session) / "TCht.Tmp"; }
+std::filesystem::path ChartStreamPath(const Session& session) {
+    return TempFolder(session) / "TCht.Tmp";
+}
 
 chart::ChartName ChartNameOf(const store::NameRecord& r) {
     chart::ChartName n;
@@ -44,7 +46,8 @@ std::optional<std::pair<int, store::NameRecord>> FindSecurity(const Session& ses
 
 platform::Status BuildSecurityChart(Session& session, ChartJob& job, chart::Chart& chart,
                                     platform::Surface& surface) {
-    chart::FilePriceSource source(store::PriceFile::PathFor(session.folders.DataFolder, job.Name.Code));
+    chart::FilePriceSource source(
+        store::PriceFile::PathFor(session.folders.DataFolder, job.Name.Code));
     if (auto s = source.Open(); !s) {
         session.dialogs().MsgBox(s.message(), "Chart Display");
         return s;

@@ -60,7 +60,9 @@ std::filesystem::path NotesPath(const Session& session, std::string_view code) {
     return std::filesystem::path(session.folders.ChtMiscFolder) / (platform::Trim(code) + ".Txt");
 }
 
-std::filesystem::path ChartLinesPath(const Session& session) { return TempFolder(session) / "ChtLns.Tmp"; }
+std::filesystem::path ChartLinesPath(const Session& session) {
+    return TempFolder(session) / "ChtLns.Tmp";
+}
 
 void ClearChartLines(const Session& session) {
     (void)platform::WriteFileAtomic(ChartLinesPath(session), "");
@@ -79,18 +81,21 @@ int ReplayChartLines(const Session& session, platform::Surface& surface) {
     int played = 0;
     while (reader.Next(in) == chart::StreamReader::Result::Instruction) {
         if (in.Letter != 'H' && in.Letter != 'L' && in.Letter != 'D' && in.Letter != 'M') continue;
-        DrawSegment(surface, {in.X1, in.Y1, in.X2, in.Y2, 0, in.Letter == 'D' ? 'D' : 'L'}, in.Colour);
+        DrawSegment(surface, {in.X1, in.Y1, in.X2, in.Y2, 0, in.Letter == 'D' ? 'D' : 'L'},
+                    in.Colour);
         ++played;
     }
     return played;
 }
 
 std::vector<chart::TrendEnds> TrendEndsOf(const Session& session, const chart::Chart& chart,
-                                          const chart::ChartRequest& request, std::string_view code) {
+                                          const chart::ChartRequest& request,
+                                          std::string_view code) {
     if (request.ChartSlot != 0 || request.SplitMode || chart.Style == 'P') return {};
     const auto path = TrendlinePath(session, code);
     if (!platform::FileHasData(path)) return {};
-    return chart::ReplayTrendlines(ToolFrameOf(chart, request), chart::TrendlineFile::ReadAll(path));
+    return chart::ReplayTrendlines(ToolFrameOf(chart, request),
+                                   chart::TrendlineFile::ReadAll(path));
 }
 
 std::vector<chart::TrendEnds> DrawChartLines(const Session& session, chart::Chart& chart,
@@ -136,7 +141,8 @@ bool MoveTrendline(const Session& session, const chart::Chart& chart,
                    double x1, double y1, double x2, double y2) {
     const auto record = chart::MakeTrendRecord(ToolFrameOf(chart, request), x1, y1, x2, y2);
     if (!record) return false;
-    return chart::TrendlineFile::WriteRecord(TrendlinePath(session, code), recordNumber, *record).ok();
+    return chart::TrendlineFile::WriteRecord(TrendlinePath(session, code), recordNumber, *record)
+        .ok();
 }
 
 platform::Status PackTrendlines(const Session& session, std::string_view code) {
@@ -147,7 +153,8 @@ platform::Status PackTrendlines(const Session& session, std::string_view code) {
 
 bool RemoveAllTrendlines(Session& session, std::string_view code) {
     const std::string c = platform::Trim(code);
-    if (session.dialogs().MsgBox("WARNING - All trendlines for " + c + " will be removed. Are you sure?",
+    if (session.dialogs().MsgBox("WARNING - All trendlines for " + c +
+                                     " will be removed. Are you sure?",
                                  "Remove all Trendlines", platform::Buttons::YesNo,
                                  platform::Icon::Exclamation) != platform::Answer::Yes)
         return false;

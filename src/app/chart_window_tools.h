@@ -41,7 +41,8 @@ std::vector<chart::TrendEnds> DrawChartLines(const Session& session, chart::Char
 
 // The .TND lines this chart would draw, by the replay rules, without drawing them.
 std::vector<chart::TrendEnds> TrendEndsOf(const Session& session, const chart::Chart& chart,
-                                          const chart::ChartRequest& request, std::string_view code);
+                                          const chart::ChartRequest& request,
+                                          std::string_view code);
 
 // A trendline drawn from (x1, y1) to (x2, y2): written to the next free record of .TND, drawn
 // and recorded. False when the ends do not make a line or the file cannot be written.

@@ -15,9 +15,9 @@ using platform::Status;
 namespace {
 
 // Palette numbers of the built-in role colours, entries 16 to 44 in turn.
-constexpr std::array<int, 29> kBuiltInRoles = {3,  0,  15, 14, 10, 12, 14, 2, 6,  13,
-                                                14, 7,  4,  12, 10, 11, 14, 2, 11, 8,
-                                                10, 11, 10, 11, 14, 14, 6,  12, 10};
+constexpr std::array<int, 29> kBuiltInRoles = {3,  0,  15, 14, 10, 12, 14, 2,  6,  13,
+                                               14, 7,  4,  12, 10, 11, 14, 2,  11, 8,
+                                               10, 11, 10, 11, 14, 14, 6,  12, 10};
 
 // A whole number that fits a colour value (negative values are kept as their 32-bit form).
 std::optional<platform::Colour> ColourNumber(const std::string& line) {
@@ -26,7 +26,8 @@ std::optional<platform::Colour> ColourNumber(const std::string& line) {
     const auto* end = t.data() + t.size();
     const auto [ptr, ec] = std::from_chars(t.data(), end, v);
     if (t.empty() || ec != std::errc() || ptr != end) return std::nullopt;
-    if (v < std::numeric_limits<std::int32_t>::min() || v > std::numeric_limits<std::uint32_t>::max())
+    if (v < std::numeric_limits<std::int32_t>::min() ||
+        v > std::numeric_limits<std::uint32_t>::max())
         return std::nullopt;
     return static_cast<platform::Colour>(v);
 }
@@ -45,15 +46,38 @@ std::int16_t ReadLe16(const std::string& bytes, std::size_t at) {
 } // namespace
 
 const std::array<std::string_view, kRoleCount>& ColourRoleNames() {
-    static constexpr std::array<std::string_view, kRoleCount> names = {
-        "Background",        "Chart title",       "Scales / text",     "Border",
-        "Chart lines",       "Candle / P&F down", "Average 1",         "Average 2",
-        "Average 3",         "Volume bars",       "Trendlines",        "Adjustments",
-        "Moving grid",       "Fixed grid lines",  "Reversal",          "Key reversal",
-        "Hook reversal",     "Open-close rev",    "Pivot point",       "Oscillator Line 1",
-        "Oscillator Line 2", "Oscillator Line 3", "Oscillator Line 4", "Osc/Indicator UP",
-        "Osc/Indicator DOWN", "Bands",            "MACD",              "Volatility 1",
-        "Volatility 2",      "MMA (Short)",       "MMA (Long)",        "End of year marker"};
+    static constexpr std::array<std::string_view, kRoleCount> names = {"Background",
+                                                                       "Chart title",
+                                                                       "Scales / text",
+                                                                       "Border",
+                                                                       "Chart lines",
+                                                                       "Candle / P&F down",
+                                                                       "Average 1",
+                                                                       "Average 2",
+                                                                       "Average 3",
+                                                                       "Volume bars",
+                                                                       "Trendlines",
+                                                                       "Adjustments",
+                                                                       "Moving grid",
+                                                                       "Fixed grid lines",
+                                                                       "Reversal",
+                                                                       "Key reversal",
+                                                                       "Hook reversal",
+                                                                       "Open-close rev",
+                                                                       "Pivot point",
+                                                                       "Oscillator Line 1",
+                                                                       "Oscillator Line 2",
+                                                                       "Oscillator Line 3",
+                                                                       "Oscillator Line 4",
+                                                                       "Osc/Indicator UP",
+                                                                       "Osc/Indicator DOWN",
+                                                                       "Bands",
+                                                                       "MACD",
+                                                                       "Volatility 1",
+                                                                       "Volatility 2",
+                                                                       "MMA (Short)",
+                                                                       "MMA (Long)",
+                                                                       "End of year marker"};
     return names;
 }
 
@@ -74,7 +98,8 @@ std::optional<int> ReadColourFile(const std::string& path, Palette& palette) {
 
 Status WriteColourFile(const std::string& path, const Palette& palette) {
     std::string out;
-    for (const auto c : palette) out += std::to_string(c) + "\r\n";
+    for (const auto c : palette)
+        out += std::to_string(c) + "\r\n";
     return platform::WriteFileAtomic(platform::ResolvePath(path), out);
 }
 

@@ -40,8 +40,8 @@ const std::array<std::string_view, kDataTypeCount>& DataTypeNames() {
 
 const std::array<std::string_view, kDataTypeCount>& DataFolderLabels() {
     static constexpr std::array<std::string_view, kDataTypeCount> labels = {
-        "Stocks ", "Indices", "Sydney Futures", "World Commodities", "Put/Call Options",
-        "Stocks ", "Indices", "Liffe Futures"};
+        "Stocks ",          "Indices", "Sydney Futures", "World Commodities",
+        "Put/Call Options", "Stocks ", "Indices",        "Liffe Futures"};
     return labels;
 }
 
@@ -61,7 +61,8 @@ std::optional<ChartDataPaths> ReadChartPathsFile(const std::string& path) {
 
 platform::Status WriteChartPathsFile(const std::string& path, const ChartDataPaths& paths) {
     std::string out = "KORI chart data folders\r\n";
-    for (const auto& p : paths) out += p + "\r\n";
+    for (const auto& p : paths)
+        out += p + "\r\n";
     return platform::WriteFileAtomic(platform::ResolvePath(path), out);
 }
 
@@ -93,9 +94,13 @@ MissingPathsChoice AskForMissingPaths(Session& session) {
                              "Select CANCEL to exit KORI ";
     switch (session.dialogs().MsgBox(text, "No Paths selected", Buttons::YesNoCancel,
                                      Icon::Exclamation)) {
-    case Answer::Yes: return MissingPathsChoice::EnterPaths;
-    case Answer::No: UseInstallRoot(session); return MissingPathsChoice::UseDefaults;
-    default: return MissingPathsChoice::Exit;
+    case Answer::Yes:
+        return MissingPathsChoice::EnterPaths;
+    case Answer::No:
+        UseInstallRoot(session);
+        return MissingPathsChoice::UseDefaults;
+    default:
+        return MissingPathsChoice::Exit;
     }
 }
 
@@ -108,8 +113,8 @@ bool SavePathDetails(Session& session, const PathDetails& edited) {
     for (const auto* p : {&edited.SystemFolder, &edited.DataFolder, &edited.ChartBackupFolder,
                           &edited.PFMData, &edited.PFMBackUp}) {
         if (Trim(*p).empty()) {
-            session.dialogs().MsgBox("Directory paths must be entered", "Path Details",
-                                     Buttons::Ok, Icon::Exclamation);
+            session.dialogs().MsgBox("Directory paths must be entered", "Path Details", Buttons::Ok,
+                                     Icon::Exclamation);
             return false;
         }
     }

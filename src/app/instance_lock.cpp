@@ -23,7 +23,7 @@ InstanceLock::~InstanceLock() {
 }
 
 std::unique_ptr<InstanceLock> InstanceLock::TryAcquire(const std::filesystem::path& root,
-                                                      Outcome* outcome) {
+                                                       Outcome* outcome) {
     Outcome ignored{};
     Outcome& result = outcome ? *outcome : ignored;
     const std::string path = (root / "kori.lock").string();

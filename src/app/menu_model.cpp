@@ -54,12 +54,12 @@ std::vector<MenuItem> BuildMenuTree() {
                           {Item("mnuBackupData", "&Backup Chart Data", "ChartBak"),
                            Item("mnuRestoreData", "&Restore Data from Backup", "ChartBak")});
     std::vector<MenuItem> tops;
-    tops.push_back(Top("mnuFile", "&File",
-                       {open, Item("mnuPaths", "&Folder Locations", "CPath", true),
-                        Item("mnFnts", "&Fonts", "ChtFonts"),
-                        Item("mnTPSU", "&Page Setup (Text)", "CHTPage"),
-                        Item("mnPrSU", "Printer &Setup", "PrinterDialog"), backup,
-                        Item("mnuExit", "E&XIT", "Exit", true)}));
+    tops.push_back(
+        Top("mnuFile", "&File",
+            {open, Item("mnuPaths", "&Folder Locations", "CPath", true),
+             Item("mnFnts", "&Fonts", "ChtFonts"), Item("mnTPSU", "&Page Setup (Text)", "CHTPage"),
+             Item("mnPrSU", "Printer &Setup", "PrinterDialog"), backup,
+             Item("mnuExit", "E&XIT", "Exit", true)}));
     tops.push_back(Top("mnuData", "&Edit",
                        {Item("mnuKBUpdate", "Data Entry via &Keyboard", "DataEntry"),
                         Item("mnuLists", "Edit Chart &Lists", "SubList"),

@@ -46,7 +46,6 @@ bool SetBool(bool& field, std::string_view value) {
 
 } // namespace
 
-
 platform::Status InstallOscDefaults(Session& session) {
     if (platform::Trim(session.ini().Read("OscDef", "RsiP")) != platform::kUnknown)
         return platform::Status::Ok();

@@ -118,8 +118,8 @@ float RoundPrice(double p, std::int16_t type) {
     return static_cast<float>(std::round(p * 100) / 100);
 }
 
-std::vector<store::PriceRecord> PriceHistory(const Security& s, const std::vector<std::string>& dates,
-                                             Random& rng) {
+std::vector<store::PriceRecord> PriceHistory(const Security& s,
+                                             const std::vector<std::string>& dates, Random& rng) {
     std::vector<store::PriceRecord> out;
     out.reserve(dates.size());
     const double dt = 1.0 / 252;
@@ -133,7 +133,8 @@ std::vector<store::PriceRecord> PriceHistory(const Security& s, const std::vecto
         const double close = std::max(price * std::exp(ret), 0.005);
         const double span = s.volatility * std::sqrt(dt) * std::fabs(price);
         const double high = std::max(open, close) + std::fabs(rng.Normal()) * span * 0.6;
-        const double low = std::max(std::min(open, close) - std::fabs(rng.Normal()) * span * 0.6, 0.001);
+        const double low =
+            std::max(std::min(open, close) - std::fabs(rng.Normal()) * span * 0.6, 0.001);
         store::PriceRecord r;
         r.Date = dates[i];
         r.Open = RoundPrice(open, s.type);
@@ -141,8 +142,9 @@ std::vector<store::PriceRecord> PriceHistory(const Security& s, const std::vecto
         r.Low = std::min({RoundPrice(low, s.type), r.Open, RoundPrice(close, s.type)});
         r.Close = RoundPrice(close, s.type);
         if (s.volume > 0) {
-            const double v = s.volume * std::exp(0.5 * rng.Normal()) *
-                             (1 + 3 * std::fabs(ret) / std::max(s.volatility * std::sqrt(dt), 1e-9) / 10);
+            const double v =
+                s.volume * std::exp(0.5 * rng.Normal()) *
+                (1 + 3 * std::fabs(ret) / std::max(s.volatility * std::sqrt(dt), 1e-9) / 10);
             r.Volume = static_cast<std::int32_t>(std::min(v, 2.0e9));
         }
         if (s.type == 2) r.Volume = 0;
@@ -198,13 +200,16 @@ platform::Status WriteClassFiles(const std::string& systemFolder) {
     const std::string gics =
         "1010,Energy,Energy\r\n1510,Materials,Materials\r\n2010,Industrials,Capital Goods\r\n"
         "2030,Industrials,Transportation\r\n2530,Consumer Discretionary,Consumer Services\r\n"
-        "2550,Consumer Discretionary,Retailing\r\n3020,Consumer Staples,Food Beverage and Tobacco\r\n"
+        "2550,Consumer Discretionary,Retailing\r\n3020,Consumer Staples,Food Beverage and "
+        "Tobacco\r\n"
         "3510,Health Care,Equipment and Services\r\n3520,Health Care,Pharmaceuticals\r\n"
         "4010,Financials,Banks\r\n4020,Financials,Diversified Financials\r\n"
         "4030,Financials,Insurance\r\n4510,Information Technology,Software and Services\r\n"
         "5010,Communication Services,Telecommunication\r\n5020,Communication Services,Media\r\n"
         "5510,Utilities,Utilities\r\n6010,Real Estate,Real Estate\r\n";
-    if (auto s = platform::WriteFileAtomic(platform::ResolveIn(systemFolder, "IndClass.dat"), indClass); !s)
+    if (auto s =
+            platform::WriteFileAtomic(platform::ResolveIn(systemFolder, "IndClass.dat"), indClass);
+        !s)
         return s;
     return platform::WriteFileAtomic(platform::ResolveIn(systemFolder, "Gics.dat"), gics);
 }
@@ -230,7 +235,8 @@ platform::Status MakeSampleLibrary(const std::string& systemFolder, const std::s
 
         std::vector<store::PriceRecord> recs =
             s.type == 3 ? AdvanceDecline(dates, rng) : PriceHistory(s, dates, rng);
-        if (std::string(s.code).size() == 6 || std::string(s.code) == "HLT") AddNoTradeDays(recs, rng);
+        if (std::string(s.code).size() == 6 || std::string(s.code) == "HLT")
+            AddNoTradeDays(recs, rng);
         if (std::string(s.code) == "ALX") AddSplit(recs);
         store::PriceFile pf(store::PriceFile::PathFor(dataFolder, s.code));
         if (auto st = pf.WriteAll(recs); !st) return st;
@@ -245,13 +251,15 @@ platform::Status MakeSampleLibrary(const std::string& systemFolder, const std::s
     summary.LastDate = kLastDate;
 
     if (auto st = WriteClassFiles(systemFolder); !st) return st;
-    if (auto st = store::SaveListFromCodes(dataFolder, 'A', {"HBK", "IRB", "JNS", "KST", "LMT"}); !st)
-        return st;
-    if (auto st = store::SaveListFromCodes(dataFolder, 'B',
-                                           {"KRM", "ALX", "BWG", "CPR", "DLT", "ZNC", "CSW", "ESK"});
+    if (auto st = store::SaveListFromCodes(dataFolder, 'A', {"HBK", "IRB", "JNS", "KST", "LMT"});
         !st)
         return st;
-    if (auto st = store::SaveListFromCodes(dataFolder, 'C', {"XAO", "PNS", "QRY", "DRN", "KRMWOA"}); !st)
+    if (auto st = store::SaveListFromCodes(
+            dataFolder, 'B', {"KRM", "ALX", "BWG", "CPR", "DLT", "ZNC", "CSW", "ESK"});
+        !st)
+        return st;
+    if (auto st = store::SaveListFromCodes(dataFolder, 'C', {"XAO", "PNS", "QRY", "DRN", "KRMWOA"});
+        !st)
         return st;
     auto listNames = store::GetSubLists(settings);
     listNames[0] = "Banks and Finance";

@@ -15,7 +15,7 @@
 namespace kori::app {
 
 struct Folders {
-    std::string SystemFolder;      // all folder texts end with '/'
+    std::string SystemFolder; // all folder texts end with '/'
     std::string DataFolder;
     std::string PFMData;
     std::string ChartBackupFolder;

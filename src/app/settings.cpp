@@ -11,7 +11,9 @@ using platform::Trim;
 
 namespace {
 
-bool IsUnknownOrEmpty(const std::string& text) { return text.empty() || text == kUnknown; }
+bool IsUnknownOrEmpty(const std::string& text) {
+    return text.empty() || text == kUnknown;
+}
 
 // An unset text key reads as its default.
 std::string TextOr(const IniFile& ini, std::string_view section, std::string_view key,
@@ -42,7 +44,9 @@ std::optional<bool> BoolWord(std::string_view text) {
     return std::nullopt;
 }
 
-const char* BoolText(bool value) { return value ? "True" : "False"; }
+const char* BoolText(bool value) {
+    return value ? "True" : "False";
+}
 
 std::int16_t ReadInt16(const IniFile& ini, std::string_view section, std::string_view key) {
     return platform::CInt(platform::Val(ini.Read(section, key))).value_or(0);
@@ -138,7 +142,9 @@ void WritePageSettings(IniFile& ini, const PageSettings& page) {
     WriteNumber(ini, "ChtPage", "Orient", page.Orient);
 }
 
-void WriteZoom(IniFile& ini, std::int16_t zoom) { WriteNumber(ini, "ChartForms", "Zoom", zoom); }
+void WriteZoom(IniFile& ini, std::int16_t zoom) {
+    WriteNumber(ini, "ChartForms", "Zoom", zoom);
+}
 
 void WriteAdjustmentSettings(IniFile& ini, const AdjustmentSettings& adjustments) {
     WriteNumber(ini, "Adjustments", "Divs", adjustments.Divs);

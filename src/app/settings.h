@@ -66,8 +66,10 @@ const char* BoolText(bool value); // "True" / "False"
 
 // A number key as the classic conversion reads it: Val of the text, half-even to 16 or 32
 // bits; "unknown", junk or a value that does not fit read as 0.
-std::int16_t ReadInt16(const platform::IniFile& ini, std::string_view section, std::string_view key);
-std::int32_t ReadInt32(const platform::IniFile& ini, std::string_view section, std::string_view key);
+std::int16_t ReadInt16(const platform::IniFile& ini, std::string_view section,
+                       std::string_view key);
+std::int32_t ReadInt32(const platform::IniFile& ini, std::string_view section,
+                       std::string_view key);
 
 DownloadSettings ReadDownloadSettings(const platform::IniFile& ini);
 FontSettings ReadFontSettings(const platform::IniFile& ini);

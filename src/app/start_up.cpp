@@ -16,11 +16,16 @@ namespace {
 const char* PendingFilesText(int dataService) {
     switch (dataService) {
     case 1:
-    case 3: return " There are some KORI/Zevot files to update into KORI";
-    case 2: return " There are some BOURSE files to update into KORI";
-    case 4: return " There are some Ex Internet data files to update into KORI";
-    case 5: return " There are some EIS downloaded files to update into KORI";
-    default: return nullptr;
+    case 3:
+        return " There are some KORI/Zevot files to update into KORI";
+    case 2:
+        return " There are some BOURSE files to update into KORI";
+    case 4:
+        return " There are some Ex Internet data files to update into KORI";
+    case 5:
+        return " There are some EIS downloaded files to update into KORI";
+    default:
+        return nullptr;
     }
 }
 

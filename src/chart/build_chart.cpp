@@ -109,9 +109,9 @@ platform::Status BuildLowerHalf(Chart& c, const ChartBuild& b, const SplitLowerH
     ChartRequest& r = b.Request;
     const char period = r.ChartPeriod;
     r.ChartPeriod = lower.ChartPeriod;
-    const ChartBuild half{r,         b.Defaults,  *lower.Name,     b.Palette,
-                          b.Fonts,   b.Dialogs,   b.StreamPath,    b.PrintBold,
-                          b.VolumeDivisor, b.Page, b.DrawOverlays, nullptr};
+    const ChartBuild half{
+        r,           b.Defaults,      *lower.Name, b.Palette,      b.Fonts, b.Dialogs, b.StreamPath,
+        b.PrintBold, b.VolumeDivisor, b.Page,      b.DrawOverlays, nullptr};
     const platform::Status s = BuildOneChart(c, half, *lower.Source, surface);
     r.ChartPeriod = period;
     return s;

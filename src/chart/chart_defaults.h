@@ -34,7 +34,7 @@ struct ChartDefaults {
     std::array<std::int16_t, 12> MMAPeriods = kDefaultMMAPeriods; // "MMASet"
     std::int16_t BollingerDaily = 21; // [OscDef] "BBA", 21 outside 1 to 100
     std::int16_t BollingerLong = 21;  // [OscDef] "BBW"
-    std::string CompFile; // "CompFile": RMO/RMX compare file
+    std::string CompFile;             // "CompFile": RMO/RMX compare file
     // Keys of the chart window's section.
     float PrintScale = 1.5f;               // "EFact"
     std::int16_t PrintLineWidth = 2;       // "Line Width", 1 to 10

@@ -43,11 +43,11 @@ struct ChartRequest {
     std::string AverageName1 = "unknown";
     std::string AverageName2 = "unknown";
     // Overlays the chart window turns on and off.
-    bool MMAOn = false;                 // twelve averages replace the two
-    bool PFAuto = false;                // point-and-figure box value follows the range on show
-    bool SwingOn = false;               // swing lines drawn with the bars
-    std::string SwingMethod = "NORM";   // "NORM", "XDay", "XPoint", "XPointAuto"
-    float SwingValue = 0;               // days (XDay) or points (XPoint); 0 takes 3 or 9
+    bool MMAOn = false;               // twelve averages replace the two
+    bool PFAuto = false;              // point-and-figure box value follows the range on show
+    bool SwingOn = false;             // swing lines drawn with the bars
+    std::string SwingMethod = "NORM"; // "NORM", "XDay", "XPoint", "XPointAuto"
+    float SwingValue = 0;             // days (XDay) or points (XPoint); 0 takes 3 or 9
 };
 
 } // namespace kori::chart

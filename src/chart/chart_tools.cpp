@@ -57,7 +57,8 @@ std::optional<TrendRecord> MakeTrendRecord(const ToolFrame& f, double x1, double
     return r;
 }
 
-std::vector<TrendEnds> ReplayTrendlines(const ToolFrame& f, const std::vector<TrendRecord>& records) {
+std::vector<TrendEnds> ReplayTrendlines(const ToolFrame& f,
+                                        const std::vector<TrendRecord>& records) {
     std::vector<TrendEnds> out;
     if (!f.Bars || f.LastBar < 0) return out;
     const std::string firstDate((*f.Bars)[0].DateText());
@@ -116,7 +117,8 @@ std::vector<FibLevel> FibonacciLevels(double startPrice, double endPrice) {
             {endPrice - 0.62 * rise, "62%    ", 20}};
 }
 
-std::vector<Segment> FibonacciLines(const ToolFrame& f, double x, const std::vector<FibLevel>& levels) {
+std::vector<Segment> FibonacciLines(const ToolFrame& f, double x,
+                                    const std::vector<FibLevel>& levels) {
     std::vector<Segment> out;
     const double x2 = std::min(x + 150, f.PlotRight);
     for (const auto& l : levels) {

@@ -46,7 +46,8 @@ struct TrendEnds {
     double xA, yA, xB, yB;
 };
 // Lines of the file to draw on this chart, by the replay rules.
-std::vector<TrendEnds> ReplayTrendlines(const ToolFrame& f, const std::vector<TrendRecord>& records);
+std::vector<TrendEnds> ReplayTrendlines(const ToolFrame& f,
+                                        const std::vector<TrendRecord>& records);
 // The line nearest to a click, or -1 when there are none.
 int NearestTrendline(const std::vector<TrendEnds>& ends, double x, double y);
 
@@ -58,7 +59,8 @@ struct FibLevel {
 // The three retracement levels from start to end; none when the rise is negative.
 std::vector<FibLevel> FibonacciLevels(double startPrice, double endPrice);
 // The dotted lines of the levels, from the x of the second click.
-std::vector<Segment> FibonacciLines(const ToolFrame& f, double x, const std::vector<FibLevel>& levels);
+std::vector<Segment> FibonacciLines(const ToolFrame& f, double x,
+                                    const std::vector<FibLevel>& levels);
 
 // Six lines of a Gann fan from a click; empty outside the plot.
 std::vector<Segment> GannFan(const ToolFrame& f, double x, double y, bool rising);

@@ -131,8 +131,7 @@ private:
         DrawNote(bar, x);
         DrawTrace(ys, x);
         m_axis.Bar(x, bar.DateText());
-        if (m_swing)
-            m_swing->Bar(i, x, {ys.High, ys.Low, ys.Close, bar.High, bar.Low, bar.Close});
+        if (m_swing) m_swing->Bar(i, x, {ys.High, ys.Low, ys.Close, bar.High, bar.Low, bar.Close});
     }
 
     int BarEntry(const store::ChartBar& bar, const BarYs& ys, double x) {

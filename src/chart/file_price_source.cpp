@@ -18,7 +18,9 @@ platform::Status FilePriceSource::Open() {
     return platform::Status::Ok();
 }
 
-std::string FilePriceSource::FileName() const { return m_path.filename().string(); }
+std::string FilePriceSource::FileName() const {
+    return m_path.filename().string();
+}
 
 const char* FilePriceSource::Record(std::int16_t record) const {
     if (record < 1 || record > m_count) return nullptr;

@@ -49,8 +49,7 @@ struct Polyline {
 };
 
 bool AverageFits(int period, int barCount, const std::vector<std::int16_t>& yArray) {
-    return period >= 1 && barCount >= period &&
-           static_cast<std::size_t>(barCount) <= yArray.size();
+    return period >= 1 && barCount >= period && static_cast<std::size_t>(barCount) <= yArray.size();
 }
 
 char LetterOf(int which) {
@@ -95,8 +94,7 @@ std::int16_t BandY(const Chart& c, float price) {
 
 // Both band kinds: a ring of closes, a centre and a spread per bar, two dotted or solid
 // lines streamed as "L".
-template <typename Ends>
-void DrawBands(ChartPainter& p, int period, bool dotted, Ends ends) {
+template <typename Ends> void DrawBands(ChartPainter& p, int period, bool dotted, Ends ends) {
     Chart& c = p.chart;
     FillZeroCloses(c);
     const auto& bars = c.ChartBars();
@@ -216,10 +214,8 @@ void DrawChartOverlays(ChartPainter& p) {
         const int period1 = daily ? d.MAPeriod1Daily : d.MAPeriod1Long;
         const int period2 = daily ? d.MAPeriod2Daily : d.MAPeriod2Long;
         const auto line = d.MAExponential ? ExponentialAverageLine : SimpleAverageLine;
-        if (r.AvOne)
-            line(p, period1, barCount, c.BarCloseY, pal::Average1, left, c.BarSpacing, 1);
-        if (r.AvTwo)
-            line(p, period2, barCount, c.BarCloseY, pal::Average2, left, c.BarSpacing, 2);
+        if (r.AvOne) line(p, period1, barCount, c.BarCloseY, pal::Average1, left, c.BarSpacing, 1);
+        if (r.AvTwo) line(p, period2, barCount, c.BarCloseY, pal::Average2, left, c.BarSpacing, 2);
     }
     if (r.ChartBands == 1)
         DrawPercentBands(p);

@@ -133,8 +133,7 @@ public:
         const int rows12 = m_rows / 12;
         const TextFont f1 = m_p.Font1();
         for (int n = 0; n <= 12; ++n) {
-            const float value =
-                static_cast<float>(n * rows12) * m_box + m_c.ChartBase;
+            const float value = static_cast<float>(n * rows12) * m_box + m_c.ChartBase;
             const double y = m_c.PlotBottom - rows12 * pf::CellSize * n;
             m_p.Line('L', m_c.PlotRight, y, m_c.PlotRight + 5, y, pal::Frame);
             if (m_p.in.Defaults.ShowPriceGrid && n > 0 && y > m_c.PlotTop) {
@@ -257,9 +256,8 @@ platform::Status DrawPointFigureChart(Chart& c, const DrawInputs& inputs, const 
     request.UpsideDown = false;
     ChartDefaults defaults = inputs.Defaults;
     defaults.LogBars = defaults.LogLine = false;
-    const DrawInputs pfIn{request,          defaults,      inputs.Name,
-                          inputs.Palette,   inputs.Fonts,  inputs.PrintBold,
-                          inputs.VolumeDivisor, inputs.Notes};
+    const DrawInputs pfIn{request,      defaults,         inputs.Name,          inputs.Palette,
+                          inputs.Fonts, inputs.PrintBold, inputs.VolumeDivisor, inputs.Notes};
     if (auto s = SettleLoadedChart(c, pfIn, g, dialogs); !s) return s;
     if (c.ChartBase == 0 || c.ChartCeiling == 0) return ScaleFailure(c, pfIn, dialogs);
     if (request.ChartSlot < 2) {

@@ -23,7 +23,9 @@ std::int32_t Round32(double v) {
     return static_cast<std::int32_t>(r);
 }
 
-std::int32_t IniInt32(const std::string& text) { return Round32(platform::Val(text)); }
+std::int32_t IniInt32(const std::string& text) {
+    return Round32(platform::Val(text));
+}
 
 // Paper coordinates are 32-bit: a product beyond them is a run-time failure.
 std::optional<double> Whole32(double v) {
@@ -47,12 +49,21 @@ public:
     bool Play(Instruction in) {
         in.Colour = PrintColourOf(in.Colour, m_settings, m_job.Palette);
         switch (in.Letter) {
-        case 'T': Text(in); return true;
-        case 'S': Title(in); return true;
-        case 'Z': Emphasised(in); return true;
-        case 'P': return Dot(in, m_settings.PrintLineWidth);
-        case 'K': return Dot(in, kLargeDotWidth);
-        default: return Shape(in);
+        case 'T':
+            Text(in);
+            return true;
+        case 'S':
+            Title(in);
+            return true;
+        case 'Z':
+            Emphasised(in);
+            return true;
+        case 'P':
+            return Dot(in, m_settings.PrintLineWidth);
+        case 'K':
+            return Dot(in, kLargeDotWidth);
+        default:
+            return Shape(in);
         }
     }
 
@@ -108,7 +119,9 @@ private:
             m_page.SetLineWidth(kNormalWidth);
             m_page.Box(a, b, c, d, in.Colour);
             break;
-        case 'F': m_page.FilledBox(a, b, c, d, in.Colour); break;
+        case 'F':
+            m_page.FilledBox(a, b, c, d, in.Colour);
+            break;
         case 'C':
             m_page.FilledBox(a, b, c, d, in.Colour);
             m_page.SetLineWidth(kNormalWidth);
@@ -124,9 +137,15 @@ private:
             m_page.SetLineWidth(kNormalWidth);
             break;
         case 'D':
-        case 'E': Thin(LineStyle::Dash, a, b, c, d, in.Colour); break;
-        case 'V': Thin(LineStyle::Dot, a, b, c, d, in.Colour); break;
-        default: Thin(LineStyle::Solid, a, b, c, d, in.Colour); break; // "L" "M"
+        case 'E':
+            Thin(LineStyle::Dash, a, b, c, d, in.Colour);
+            break;
+        case 'V':
+            Thin(LineStyle::Dot, a, b, c, d, in.Colour);
+            break;
+        default:
+            Thin(LineStyle::Solid, a, b, c, d, in.Colour);
+            break; // "L" "M"
         }
         return true;
     }
@@ -165,9 +184,12 @@ PlayOutcome PlayAll(StreamReader& reader, PaperPlay& play) {
         switch (reader.Next(in)) {
         case StreamReader::Result::End:
             return played ? PlayOutcome::Played : PlayOutcome::NothingPlayed;
-        case StreamReader::Result::Malformed: return PlayOutcome::Malformed;
-        case StreamReader::Result::Unreadable: return PlayOutcome::Unreadable;
-        case StreamReader::Result::Instruction: break;
+        case StreamReader::Result::Malformed:
+            return PlayOutcome::Malformed;
+        case StreamReader::Result::Unreadable:
+            return PlayOutcome::Unreadable;
+        case StreamReader::Result::Instruction:
+            break;
         }
         if (!play.Play(in)) return PlayOutcome::Malformed;
         played = true;

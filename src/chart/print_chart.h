@@ -38,7 +38,7 @@ struct PaperJob {
     const platform::ChartFonts& Fonts;
     double AreaWidth = 0, AreaHeight = 0; // the chart area's own size as the stream was built
     platform::Progress* StatusBar = nullptr;
-    std::string StatusToRestore; // the status text the print interrupts
+    std::string StatusToRestore;          // the status text the print interrupts
     platform::Dialogs* Pointer = nullptr; // busy pointer while printing
 };
 

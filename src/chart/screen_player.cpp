@@ -35,13 +35,23 @@ public:
     bool Play(const Instruction& in, bool& handled) {
         handled = true;
         switch (in.Letter) {
-        case 'T': Text(in); return true;
-        case 'S': Title(in); return true;
-        case 'Z': Emphasised(in); return true;
+        case 'T':
+            Text(in);
+            return true;
+        case 'S':
+            Title(in);
+            return true;
+        case 'Z':
+            Emphasised(in);
+            return true;
         case 'X':
-        case 'K': handled = false; return true; // paper only
-        case 'P': return Point(in);
-        default: return Shape(in);
+        case 'K':
+            handled = false;
+            return true; // paper only
+        case 'P':
+            return Point(in);
+        default:
+            return Shape(in);
         }
     }
 
@@ -88,16 +98,24 @@ private:
         const auto x1 = Whole(in.X1), y1 = Whole(in.Y1), x2 = Whole(in.X2), y2 = Whole(in.Y2);
         if (!x1 || !y1 || !x2 || !y2) return false;
         switch (in.Letter) {
-        case 'B': m_area.Box(*x1, *y1, *x2, *y2, in.Colour); break;
+        case 'B':
+            m_area.Box(*x1, *y1, *x2, *y2, in.Colour);
+            break;
         case 'F':
-        case 'C': m_area.FilledBox(*x1, *y1, *x2, *y2, in.Colour); break;
+        case 'C':
+            m_area.FilledBox(*x1, *y1, *x2, *y2, in.Colour);
+            break;
         case 'D':
-        case 'E': StyledLine(platform::LineStyle::Dash, *x1, *y1, *x2, *y2, in.Colour); break;
+        case 'E':
+            StyledLine(platform::LineStyle::Dash, *x1, *y1, *x2, *y2, in.Colour);
+            break;
         case 'V':
             m_area.SetLineWidth(1);
             StyledLine(platform::LineStyle::Dot, *x1, *y1, *x2, *y2, in.Colour);
             break;
-        default: m_area.Line(*x1, *y1, *x2, *y2, in.Colour); break; // "H" "L" "M"
+        default:
+            m_area.Line(*x1, *y1, *x2, *y2, in.Colour);
+            break; // "H" "L" "M"
         }
         return true;
     }
@@ -128,9 +146,12 @@ PlayOutcome PlayOnScreen(StreamReader& reader, platform::Surface& area,
         switch (reader.Next(in)) {
         case StreamReader::Result::End:
             return played ? PlayOutcome::Played : PlayOutcome::NothingPlayed;
-        case StreamReader::Result::Malformed: return PlayOutcome::Malformed;
-        case StreamReader::Result::Unreadable: return PlayOutcome::Unreadable;
-        case StreamReader::Result::Instruction: break;
+        case StreamReader::Result::Malformed:
+            return PlayOutcome::Malformed;
+        case StreamReader::Result::Unreadable:
+            return PlayOutcome::Unreadable;
+        case StreamReader::Result::Instruction:
+            break;
         }
         bool handled = false;
         if (!play.Play(in, handled)) return PlayOutcome::Malformed;

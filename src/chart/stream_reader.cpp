@@ -21,7 +21,8 @@ constexpr int kTextField = 4;
 } // namespace
 
 bool SplitStreamLine(std::string_view line, StreamFields& fields) {
-    for (auto& f : fields) f.clear();
+    for (auto& f : fields)
+        f.clear();
     const bool keepTextBlanks = !line.empty() && line.front() == 'T';
     int field = 0;
     for (char c : line) {
@@ -35,8 +36,12 @@ bool SplitStreamLine(std::string_view line, StreamFields& fields) {
     return true;
 }
 
-bool IsTextLetter(char letter) { return kTextLetters.find(letter) != std::string_view::npos; }
-bool IsDotLetter(char letter) { return kDotLetters.find(letter) != std::string_view::npos; }
+bool IsTextLetter(char letter) {
+    return kTextLetters.find(letter) != std::string_view::npos;
+}
+bool IsDotLetter(char letter) {
+    return kDotLetters.find(letter) != std::string_view::npos;
+}
 
 bool IsStreamLetter(char letter) {
     return letter != 0 && (IsTextLetter(letter) || IsDotLetter(letter) ||

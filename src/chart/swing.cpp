@@ -111,8 +111,8 @@ SwingChart::SwingChart(ChartPainter& p) : m_p(p) {
 
 void SwingChart::Title() {
     if (m_method == "XPointAuto")
-        m_value = std::floor(std::floor(AverageSwing(m_p.chart.ChartBars(), m_p.in.Name.RecordType)) *
-                             0.75f);
+        m_value = std::floor(
+            std::floor(AverageSwing(m_p.chart.ChartBars(), m_p.in.Name.RecordType)) * 0.75f);
     const std::string text = SwingTitleText(m_p.in.Request.ChartPeriod, m_method, m_value);
     const Chart& c = m_p.chart;
     m_p.ScreenText(m_swingX, c.PlotTop + 4, text, pal::SwingTitle, m_p.Font1());
@@ -167,8 +167,8 @@ void SwingChart::Start(const SwingBar& b) {
 }
 
 void SwingChart::Norm(const SwingBar& b) {
-    const bool higherHigh = b.HighY < m_highY, lowerHigh = b.HighY > m_highY;
-    const bool higherLow = b.LowY < m_lowY, lowerLow = b.LowY > m_lowY;
+    const bool higherHigh = b.HighY<m_highY, lowerHigh = b.HighY> m_highY;
+    const bool higherLow = b.LowY<m_lowY, lowerLow = b.LowY> m_lowY;
     switch (m_dir) {
     case 1:
         if (higherHigh && !lowerLow) {

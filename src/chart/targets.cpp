@@ -22,9 +22,8 @@ std::vector<float> ReadTargetPrices(const std::filesystem::path& targetsFile,
         if (comma == std::string::npos) continue;
         if (platform::Trim(line.substr(0, comma)) != wanted) continue;
         const auto next = line.find(',', comma + 1);
-        prices.push_back(static_cast<float>(
-            platform::Val(line.substr(comma + 1, next == std::string::npos ? next
-                                                                           : next - comma - 1))));
+        prices.push_back(static_cast<float>(platform::Val(
+            line.substr(comma + 1, next == std::string::npos ? next : next - comma - 1))));
     }
     return prices;
 }

@@ -13,7 +13,9 @@ void PutText(char* dst, std::string_view s, std::size_t width) {
     const std::string padded = platform::PadRight(s, width);
     std::memcpy(dst, padded.data(), width);
 }
-template <typename T> void PutNumber(char* dst, T v) { std::memcpy(dst, &v, sizeof v); }
+template <typename T> void PutNumber(char* dst, T v) {
+    std::memcpy(dst, &v, sizeof v);
+}
 template <typename T> T GetNumber(const char* src) {
     T v;
     std::memcpy(&v, src, sizeof v);
@@ -60,7 +62,8 @@ std::vector<TrendRecord> TrendlineFile::ReadAll(const std::filesystem::path& pat
     if (!bytes) return r;
     const std::size_t n = bytes->size() / TrendRecord::kSize;
     r.reserve(n);
-    for (std::size_t i = 0; i < n; ++i) r.push_back(TrendRecord::Decode(bytes->data() + i * TrendRecord::kSize));
+    for (std::size_t i = 0; i < n; ++i)
+        r.push_back(TrendRecord::Decode(bytes->data() + i * TrendRecord::kSize));
     return r;
 }
 
@@ -76,7 +79,8 @@ platform::Status TrendlineFile::WriteRecord(const std::filesystem::path& path, i
     }
     if (!f) return platform::Status::Error("Cannot write " + target.string());
     const auto bytes = r.Encode();
-    f.seekp(static_cast<std::streamoff>(recordNumber - 1) * static_cast<std::streamoff>(TrendRecord::kSize));
+    f.seekp(static_cast<std::streamoff>(recordNumber - 1) *
+            static_cast<std::streamoff>(TrendRecord::kSize));
     f.write(bytes.data(), static_cast<std::streamsize>(bytes.size()));
     return f ? platform::Status::Ok() : platform::Status::Error("Cannot write " + target.string());
 }
@@ -109,7 +113,8 @@ platform::Status TrendlineFile::Pack(const std::filesystem::path& path) {
     if (auto s = platform::WriteFileAtomic(work, live); !s) return s;
     std::error_code ec;
     std::filesystem::rename(work, target, ec);
-    if (ec) return platform::Status::Error("Cannot replace " + target.string() + ": " + ec.message());
+    if (ec)
+        return platform::Status::Error("Cannot replace " + target.string() + ": " + ec.message());
     return platform::Status::Ok();
 }
 

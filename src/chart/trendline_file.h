@@ -14,10 +14,10 @@ namespace kori::chart {
 
 struct TrendRecord {
     std::int16_t LineKind = 0;
-    char Period = ' ';       // 'A', 'W' or 'M'; blank marks a deleted record
-    std::string DateA;       // 8 characters "yyyymmdd"
+    char Period = ' '; // 'A', 'W' or 'M'; blank marks a deleted record
+    std::string DateA; // 8 characters "yyyymmdd"
     float PriceA = 0;
-    std::string DateB;       // "yyyymmdd", or "X" then an x position beyond the last bar
+    std::string DateB; // "yyyymmdd", or "X" then an x position beyond the last bar
     float PriceB = 0;
 
     bool deleted() const { return Period == ' '; }

@@ -51,7 +51,8 @@ void ApplySwing(const std::string& text, app::ChartJob& job) {
     if (method != "NORM" && method != "XDay" && method != "XPoint" && method != "XPointAuto")
         throw CliError{"--swing wants NORM, XDay:N, XPoint:N or XPointAuto"};
     float value = 0;
-    if (colon != std::string::npos) value = static_cast<float>(platform::Val(text.substr(colon + 1)));
+    if (colon != std::string::npos)
+        value = static_cast<float>(platform::Val(text.substr(colon + 1)));
     if ((method == "XDay" || method == "XPoint") && colon != std::string::npos &&
         !chart::SwingValueValid(method, value))
         throw CliError{std::string(chart::kSwingRefusal)};
@@ -102,8 +103,7 @@ void ApplySplit(const app::Session& session, const std::string& text, const Char
     if (!found) throw CliError{"No record on file for that code: " + code};
     if (!o.osc.osc.empty()) throw CliError{"--split draws no oscillator panel: leave out --osc"};
     split.Choose({found->second, period[0]}, true);
-    if (!split.Applies(job.Request))
-        throw CliError{"A point-and-figure chart is never split"};
+    if (!split.Applies(job.Request)) throw CliError{"A point-and-figure chart is never split"};
     job.Lower = split.Lower();
 }
 
@@ -115,11 +115,14 @@ std::pair<int, int> ParseArea(const std::string& text) {
         h = static_cast<int>(platform::Val(text.substr(x + 1)));
     }
     if (w < 100 || h < 100 || w > 16000 || h > 16000)
-        throw CliError{"--size wants WIDTHxHEIGHT in chart units from 100 to 16000, such as 1000x700"};
+        throw CliError{
+            "--size wants WIDTHxHEIGHT in chart units from 100 to 16000, such as 1000x700"};
     return {w, h};
 }
 
-json FloatJson(float v) { return json::parse(platform::FloatText(v)); }
+json FloatJson(float v) {
+    return json::parse(platform::FloatText(v));
+}
 
 void ApplyOptions(const ChartOptions& o, app::ChartJob& job) {
     auto& r = job.Request;
@@ -130,7 +133,8 @@ void ApplyOptions(const ChartOptions& o, app::ChartJob& job) {
     r.UpsideDown = o.upsideDown;
     if (o.log) job.Defaults.LogBars = job.Defaults.LogLine = true;
     if (!o.finish.empty()) {
-        if (!platform::IsValidDateText(o.finish)) throw CliError{"--finish wants a date as yyyymmdd"};
+        if (!platform::IsValidDateText(o.finish))
+            throw CliError{"--finish wants a date as yyyymmdd"};
         r.ByFinishDate = true;
         r.FinishDate = o.finish;
     }
@@ -139,12 +143,18 @@ void ApplyOptions(const ChartOptions& o, app::ChartJob& job) {
 }
 
 void PrintNumbers(const chart::Chart& c) {
-    json out = {{"first_record", c.FirstRecord}, {"last_record", c.LastRecord},
-                {"last_bar", c.LastBar()},       {"plot_left", c.PlotLeft},
-                {"plot_right", c.PlotRight},     {"plot_top", c.PlotTop},
-                {"plot_bottom", c.PlotBottom},   {"chart_base", FloatJson(c.ChartBase)},
-                {"chart_ceiling", FloatJson(c.ChartCeiling)}, {"grid_step", FloatJson(c.GridStep)},
-                {"grid_count", c.GridCount},     {"max_high", FloatJson(c.MaxHigh)},
+    json out = {{"first_record", c.FirstRecord},
+                {"last_record", c.LastRecord},
+                {"last_bar", c.LastBar()},
+                {"plot_left", c.PlotLeft},
+                {"plot_right", c.PlotRight},
+                {"plot_top", c.PlotTop},
+                {"plot_bottom", c.PlotBottom},
+                {"chart_base", FloatJson(c.ChartBase)},
+                {"chart_ceiling", FloatJson(c.ChartCeiling)},
+                {"grid_step", FloatJson(c.GridStep)},
+                {"grid_count", c.GridCount},
+                {"max_high", FloatJson(c.MaxHigh)},
                 {"min_low", FloatJson(c.MinLow)}};
     std::cout << out.dump() << "\n";
 }
@@ -225,20 +235,26 @@ void AddChartCommand(CLI::App& app, CliContext& ctx) {
     cmd->add_option("CODE", o->code, "Security code")->required();
     cmd->add_option("--style", o->style, "B bar, C candlestick, L line, P point and figure")
         ->check(CLI::IsMember({"B", "C", "L", "P"}));
-    cmd->add_option("--period", o->period, "A daily, W weekly, M monthly")->check(CLI::IsMember({"A", "W", "M"}));
-    cmd->add_option("--spacing", o->spacing, "Chart units between bars (reversal on P)")->check(CLI::Range(1, 20));
+    cmd->add_option("--period", o->period, "A daily, W weekly, M monthly")
+        ->check(CLI::IsMember({"A", "W", "M"}));
+    cmd->add_option("--spacing", o->spacing, "Chart units between bars (reversal on P)")
+        ->check(CLI::Range(1, 20));
     cmd->add_flag("--log", o->log, "Logarithmic price scale");
     cmd->add_flag("--upside-down", o->upsideDown, "High prices at the bottom");
     cmd->add_flag("--no-volume", o->noVolume, "No volume panel");
     cmd->add_option("--finish", o->finish, "Last date shown (yyyymmdd)");
-    cmd->add_option("--size", o->size, "Chart area in chart units (default 1000x700)")->option_text("WxH");
-    cmd->add_option("--stream", o->stream, "Copy of the chart instruction stream")->option_text("FILE");
+    cmd->add_option("--size", o->size, "Chart area in chart units (default 1000x700)")
+        ->option_text("WxH");
+    cmd->add_option("--stream", o->stream, "Copy of the chart instruction stream")
+        ->option_text("FILE");
     cmd->add_option("--png", o->png, "Picture as the screen shows it")->option_text("FILE");
     cmd->add_option("--svg", o->svg, "SVG drawing as the screen shows it")->option_text("FILE");
     cmd->add_option("--pdf", o->pdf, "A4 page as the printer prints it")->option_text("FILE");
     cmd->add_flag("--json", o->json, "Print the chart numbers as JSON");
-    cmd->add_option("--ma1", o->ma1, "Moving average 1 on, with this period")->check(CLI::Range(1, 500));
-    cmd->add_option("--ma2", o->ma2, "Moving average 2 on, with this period")->check(CLI::Range(1, 500));
+    cmd->add_option("--ma1", o->ma1, "Moving average 1 on, with this period")
+        ->check(CLI::Range(1, 500));
+    cmd->add_option("--ma2", o->ma2, "Moving average 2 on, with this period")
+        ->check(CLI::Range(1, 500));
     cmd->add_flag("--exponential", o->exponential, "Exponential moving averages");
     cmd->add_flag("--mma", o->mma, "Multiple moving averages in place of the two averages");
     cmd->add_option("--bands", o->bands, "percent, bollinger or none")
@@ -268,7 +284,8 @@ void AddScaleCommand(CLI::App& app, CliContext&) {
         bool json = false;
     };
     auto o = std::make_shared<ScaleOptions>();
-    auto* cmd = app.add_subcommand("scale", "The automatic price scale for a highest and lowest price");
+    auto* cmd =
+        app.add_subcommand("scale", "The automatic price scale for a highest and lowest price");
     cmd->add_option("--high", o->high, "Highest price")->required();
     cmd->add_option("--low", o->low, "Lowest price")->required();
     cmd->add_flag("--json", o->json, "JSON output");

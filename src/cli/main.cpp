@@ -13,7 +13,8 @@ int main(int argc, char** argv) {
     app.fallthrough(); // global options may follow the subcommand: kori names --root DIR
     app.set_version_flag("--version", "kori 8.0");
     kori::cli::CliContext ctx;
-    app.add_option("--root", ctx.root, "Install root (holds Kori.ini); default $KORI_ROOT or ~/.local/share/kori")
+    app.add_option("--root", ctx.root,
+                   "Install root (holds Kori.ini); default $KORI_ROOT or ~/.local/share/kori")
         ->option_text("DIR");
     app.add_option("--data", ctx.data, "Data folder to use instead of the one in Kori.ini")
         ->option_text("DIR");

@@ -28,15 +28,16 @@ struct PlayOptions {
 };
 
 // Chart roles 16 to 44 of the built-in colour scheme, as standard palette numbers.
-constexpr int kBuiltInRoles[] = {3,  0,  15, 14, 10, 12, 14, 2,  6,  13, 14, 7,  4,  12, 10,
-                                 11, 14, 2,  11, 8,  10, 11, 10, 11, 14, 14, 6,  12, 10};
+constexpr int kBuiltInRoles[] = {3,  0,  15, 14, 10, 12, 14, 2,  6,  13, 14, 7, 4,  12, 10,
+                                 11, 14, 2,  11, 8,  10, 11, 10, 11, 14, 14, 6, 12, 10};
 
 platform::Palette BuiltInPalette() {
     platform::Palette p{};
     for (std::size_t i = 0; i < platform::kStandardColours.size(); ++i)
         p[i] = platform::kStandardColours[i];
     std::size_t entry = 16;
-    for (int n : kBuiltInRoles) p[entry++] = platform::kStandardColours[static_cast<std::size_t>(n)];
+    for (int n : kBuiltInRoles)
+        p[entry++] = platform::kStandardColours[static_cast<std::size_t>(n)];
     return p;
 }
 

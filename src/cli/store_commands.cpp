@@ -32,7 +32,9 @@ std::vector<store::NameRecord> ReadNames(app::Session& session) {
 }
 
 // A float as a JSON number that reads back to the same 32-bit value.
-json FloatJson(float v) { return json::parse(platform::FloatText(v)); }
+json FloatJson(float v) {
+    return json::parse(platform::FloatText(v));
+}
 
 } // namespace
 
@@ -46,7 +48,8 @@ void AddNamesCommand(CLI::App& app, CliContext& ctx) {
         auto& session = ctx.OpenSession();
         const auto names = ReadNames(session);
         if (*codes) {
-            for (const auto& n : names) std::cout << n.TrimmedCode() << "\n";
+            for (const auto& n : names)
+                std::cout << n.TrimmedCode() << "\n";
             return;
         }
         if (*asJson) {
@@ -75,11 +78,13 @@ void AddNamesCommand(CLI::App& app, CliContext& ctx) {
             std::cout << out.dump(2) << "\n";
             return;
         }
-        std::printf("%5s  %-6s %4s  %-35s %-4s %-5s\n", "Rec", "Code", "Type", "Name", "Cat.", "Class");
+        std::printf("%5s  %-6s %4s  %-35s %-4s %-5s\n", "Rec", "Code", "Type", "Name", "Cat.",
+                    "Class");
         int rec = 0;
         for (const auto& n : names)
-            std::printf("%5d  %-6s %4d  %-35s %4d %-5s\n", ++rec, n.TrimmedCode().c_str(), n.RecordType,
-                        Trim(n.Name).c_str(), n.Category, Trim(n.IndustryClass).c_str());
+            std::printf("%5d  %-6s %4d  %-35s %4d %-5s\n", ++rec, n.TrimmedCode().c_str(),
+                        n.RecordType, Trim(n.Name).c_str(), n.Category,
+                        Trim(n.IndustryClass).c_str());
         std::printf("%d securities in %s\n", rec, session.folders.DataFolder.c_str());
     });
 }
@@ -96,7 +101,8 @@ void AddBarsCommand(CLI::App& app, CliContext& ctx) {
     };
     auto o = std::make_shared<Options>();
     cmd->add_option("CODE", o->code, "Security code")->required();
-    cmd->add_option("--period", o->period, "A daily, W weekly, M monthly")->check(CLI::IsMember({"A", "W", "M"}));
+    cmd->add_option("--period", o->period, "A daily, W weekly, M monthly")
+        ->check(CLI::IsMember({"A", "W", "M"}));
     cmd->add_option("--first", o->first, "First record (1-based)");
     cmd->add_option("--last", o->last, "Last record (default: the record count)");
     cmd->add_flag("--no-volume", o->noVolume, "Load without volumes");
@@ -121,14 +127,15 @@ void AddBarsCommand(CLI::App& app, CliContext& ctx) {
         q.FirstRecord = static_cast<std::int16_t>(o->first);
         q.LastRecord = static_cast<std::int16_t>(o->last > 0 ? o->last : pf.Count());
         if (o->first < 1 || q.LastRecord > pf.Count() || q.LastRecord < q.FirstRecord)
-            throw CliError{"Records " + std::to_string(o->first) + " to " + std::to_string(q.LastRecord) +
-                           " are not in " + path.filename().string() + " (1 to " +
-                           std::to_string(pf.Count()) + ")"};
+            throw CliError{"Records " + std::to_string(o->first) + " to " +
+                           std::to_string(q.LastRecord) + " are not in " +
+                           path.filename().string() + " (1 to " + std::to_string(pf.Count()) + ")"};
         q.Period = o->period[0];
         q.WantVolume = !o->noVolume;
         q.RecordType = rec->RecordType;
         store::ChartSeries s;
-        if (auto st = store::LoadChartSeries(path.string(), q, s); !st) throw CliError{st.message()};
+        if (auto st = store::LoadChartSeries(path.string(), q, s); !st)
+            throw CliError{st.message()};
         const auto& r = s.Results;
         if (o->json) {
             json bars = json::array();
@@ -157,16 +164,18 @@ void AddBarsCommand(CLI::App& app, CliContext& ctx) {
             std::cout << out.dump() << "\n";
             return;
         }
-        std::printf("%s  %s  records %d to %d, %d bars\n", Trim(rec->Code).c_str(), Trim(rec->Name).c_str(),
-                    q.FirstRecord, q.LastRecord, s.LastBar + 1);
-        std::printf("%-8s %10s %10s %10s %10s %12s %5s\n", "Date", "Open", "High", "Low", "Close", "Volume", "Note");
+        std::printf("%s  %s  records %d to %d, %d bars\n", Trim(rec->Code).c_str(),
+                    Trim(rec->Name).c_str(), q.FirstRecord, q.LastRecord, s.LastBar + 1);
+        std::printf("%-8s %10s %10s %10s %10s %12s %5s\n", "Date", "Open", "High", "Low", "Close",
+                    "Volume", "Note");
         for (int i = 0; i <= s.LastBar; ++i) {
             const auto& b = s.ChartBars[static_cast<std::size_t>(i)];
-            std::printf("%-8s %10g %10g %10g %10g %12d %5d\n", std::string(b.DateText()).c_str(), b.Open,
-                        b.High, b.Low, b.Close, b.Volume, b.Note);
+            std::printf("%-8s %10g %10g %10g %10g %12d %5d\n", std::string(b.DateText()).c_str(),
+                        b.Open, b.High, b.Low, b.Close, b.Volume, b.Note);
         }
-        std::printf("Highest %g  lowest %g  volume %d..%d average %d%s\n", r.HighestPrice, r.LowestPrice,
-                    r.LowestVolume, r.HighestVolume, r.AverageVolume, r.VolumesPresent ? "" : " (no volumes)");
+        std::printf("Highest %g  lowest %g  volume %d..%d average %d%s\n", r.HighestPrice,
+                    r.LowestPrice, r.LowestVolume, r.HighestVolume, r.AverageVolume,
+                    r.VolumesPresent ? "" : " (no volumes)");
     });
 }
 
@@ -184,12 +193,14 @@ void AddListsCommand(CLI::App& app, CliContext& ctx) {
             std::vector<store::ChartListEntry> entries;
             if (platform::FileExists(path)) (void)store::ReadList(path, entries);
             json codes = json::array();
-            for (const auto& e : entries) codes.push_back(Trim(e.Code));
+            for (const auto& e : entries)
+                codes.push_back(Trim(e.Code));
             const std::string name = i < display.size() ? display[i] : "Chart List Z";
             out.push_back({{"list", std::string(1, letter)}, {"name", name}, {"codes", codes}});
             if (!*asJson && !entries.empty()) {
                 std::cout << letter << "  " << name << ":";
-                for (const auto& c : codes) std::cout << " " << c.get<std::string>();
+                for (const auto& c : codes)
+                    std::cout << " " << c.get<std::string>();
                 std::cout << "\n";
             }
         }

@@ -3,12 +3,12 @@
 #include "app/instance_lock.h"
 #include "app/session.h"
 #include "app/start_up.h"
-#include "gui/windows/register_windows.h"
 #include "gui/services/qt_dialogs.h"
 #include "gui/services/qt_progress.h"
 #include "gui/windows/chart_windows.h"
 #include "gui/windows/logo.h"
 #include "gui/windows/main_window.h"
+#include "gui/windows/register_windows.h"
 #include "platform/clock.h"
 #include "platform/files.h"
 #include "platform/heap.h"
@@ -26,16 +26,19 @@ int main(int argc, char** argv) {
     QApplication::setApplicationName(QStringLiteral("kori-charting"));
     QCommandLineParser parser;
     parser.addHelpOption();
-    QCommandLineOption rootOpt(QStringLiteral("root"), QStringLiteral("Install root (holds Kori.ini)."),
+    QCommandLineOption rootOpt(QStringLiteral("root"),
+                               QStringLiteral("Install root (holds Kori.ini)."),
                                QStringLiteral("DIR"));
     parser.addOption(rootOpt);
-    QCommandLineOption shotOpt(QStringLiteral("screenshot"),
-                               QStringLiteral("Save a picture of the main window to FILE and quit."),
-                               QStringLiteral("FILE"));
+    QCommandLineOption shotOpt(
+        QStringLiteral("screenshot"),
+        QStringLiteral("Save a picture of the main window to FILE and quit."),
+        QStringLiteral("FILE"));
     parser.addOption(shotOpt);
-    QCommandLineOption chartOpt(QStringLiteral("chart"),
-                                QStringLiteral("Open the chart of CODE once the main window stands."),
-                                QStringLiteral("CODE"));
+    QCommandLineOption chartOpt(
+        QStringLiteral("chart"),
+        QStringLiteral("Open the chart of CODE once the main window stands."),
+        QStringLiteral("CODE"));
     parser.addOption(chartOpt);
     parser.addPositionalArgument(QStringLiteral("word"), QStringLiteral("RM, A, N or GD"));
     parser.process(qapp);
@@ -49,7 +52,8 @@ int main(int argc, char** argv) {
     kori::platform::NullProgress startupProgress;
     kori::platform::SettingsStore settings(root / "settings.ini");
     kori::platform::SystemClock clock;
-    kori::app::Session session(root, kori::platform::Services{dialogs, startupProgress, settings, clock});
+    kori::app::Session session(root,
+                               kori::platform::Services{dialogs, startupProgress, settings, clock});
 
     std::unique_ptr<kori::app::InstanceLock> instance;
     if (!kori::app::CheckSingleInstance(root, dialogs, instance)) return 0;
@@ -59,7 +63,8 @@ int main(int argc, char** argv) {
     QApplication::processEvents();
     QApplication::setOverrideCursor(Qt::WaitCursor);
     const QStringList words = parser.positionalArguments();
-    kori::app::InitialiseSession(session, words.isEmpty() ? std::string() : words.first().toStdString());
+    kori::app::InitialiseSession(session,
+                                 words.isEmpty() ? std::string() : words.first().toStdString());
     QApplication::restoreOverrideCursor();
     QApplication::processEvents();
 

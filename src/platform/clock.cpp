@@ -15,7 +15,11 @@ std::string FormatNow(const char* fmt) {
 }
 } // namespace
 
-std::string SystemClock::Today() const { return FormatNow("%Y%m%d"); }
-std::string SystemClock::Now() const { return FormatNow("%H:%M:%S"); }
+std::string SystemClock::Today() const {
+    return FormatNow("%Y%m%d");
+}
+std::string SystemClock::Now() const {
+    return FormatNow("%H:%M:%S");
+}
 
 } // namespace kori::platform

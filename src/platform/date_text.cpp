@@ -76,7 +76,9 @@ std::optional<CivilDate> ParseDateText(std::string_view text) {
     return d;
 }
 
-bool IsValidDateText(std::string_view text) { return ParseDateText(text).has_value(); }
+bool IsValidDateText(std::string_view text) {
+    return ParseDateText(text).has_value();
+}
 
 std::string DateText(CivilDate d) {
     char buf[16];

@@ -10,10 +10,13 @@ namespace {
 Answer DefaultAnswer(Buttons b) {
     switch (b) {
     case Buttons::Ok:
-    case Buttons::OkCancel: return Answer::Ok;
+    case Buttons::OkCancel:
+        return Answer::Ok;
     case Buttons::YesNo:
-    case Buttons::YesNoCancel: return Answer::Yes;
-    case Buttons::RetryCancel: return Answer::Retry;
+    case Buttons::YesNoCancel:
+        return Answer::Yes;
+    case Buttons::RetryCancel:
+        return Answer::Retry;
     }
     return Answer::Ok;
 }
@@ -62,8 +65,7 @@ Answer ConsoleDialogs::MsgBox(std::string_view text, std::string_view title, But
     return a.starts_with("C") ? Answer::Cancel : DefaultAnswer(buttons);
 }
 
-std::optional<std::string> ConsoleDialogs::InputBox(std::string_view prompt,
-                                                    std::string_view title,
+std::optional<std::string> ConsoleDialogs::InputBox(std::string_view prompt, std::string_view title,
                                                     std::string_view defaultText) {
     std::cerr << title << ": " << Trim(prompt);
     if (!m_interactive) {
@@ -77,6 +79,8 @@ std::optional<std::string> ConsoleDialogs::InputBox(std::string_view prompt,
     return line;
 }
 
-void ConsoleDialogs::Beep() { std::cerr << '\a' << std::flush; }
+void ConsoleDialogs::Beep() {
+    std::cerr << '\a' << std::flush;
+}
 
 } // namespace kori::platform

@@ -64,7 +64,8 @@ fs::path ResolveIn(std::string_view folder, std::string_view name) {
 
 bool FileExists(const fs::path& path) {
     std::string s = NormalisePath(path.string());
-    while (s.size() > 1 && s.back() == '/') s.pop_back();
+    while (s.size() > 1 && s.back() == '/')
+        s.pop_back();
     if (s.empty()) return false;
     std::error_code ec;
     return fs::exists(ResolvePath(s), ec);
@@ -78,7 +79,9 @@ std::uintmax_t FileSizeOr0(const fs::path& path) {
     return ec ? 0 : size;
 }
 
-bool FileHasData(const fs::path& path) { return FileSizeOr0(path) > 0; }
+bool FileHasData(const fs::path& path) {
+    return FileSizeOr0(path) > 0;
+}
 
 std::optional<std::string> ReadWholeFile(const fs::path& path) {
     std::ifstream in(ResolvePath(path), std::ios::binary);
@@ -88,7 +91,9 @@ std::optional<std::string> ReadWholeFile(const fs::path& path) {
     return ss.str();
 }
 
-void SetWriteFailureAfterBytesForTesting(long long bytes) { g_failAfterBytes = bytes; }
+void SetWriteFailureAfterBytesForTesting(long long bytes) {
+    g_failAfterBytes = bytes;
+}
 
 Status WriteFileAtomic(const fs::path& path, std::string_view content) {
     const fs::path target = ResolvePath(path);
@@ -128,7 +133,8 @@ Status AppendToFile(const fs::path& path, std::string_view bytes) {
     const bool ok = WriteAll(fd, bytes.data(), bytes.size());
     const int savedErrno = errno;
     ::close(fd);
-    if (!ok) return Status::Error("Cannot write " + target.string() + ": " + std::strerror(savedErrno));
+    if (!ok)
+        return Status::Error("Cannot write " + target.string() + ": " + std::strerror(savedErrno));
     return Status::Ok();
 }
 

@@ -9,7 +9,9 @@ namespace kori::platform {
 
 IniFile::IniFile(std::filesystem::path path) : m_path(std::move(path)) {}
 
-bool IniFile::exists() const { return FileExists(m_path); }
+bool IniFile::exists() const {
+    return FileExists(m_path);
+}
 
 void IniFile::Load() const {
     // Re-read on every access: another window (or program) may have written the file.

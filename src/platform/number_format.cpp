@@ -50,17 +50,26 @@ std::vector<Token> Tokenise(std::string_view section) {
     for (std::size_t i = 0; i < section.size(); ++i) {
         const char c = section[i];
         switch (c) {
-        case '0': tokens.push_back({Kind::Zero, {}}); break;
-        case '#': tokens.push_back({Kind::Hash, {}}); break;
-        case ',': tokens.push_back({Kind::Comma, {}}); break;
-        case '%': tokens.push_back({Kind::Percent, {}}); break;
+        case '0':
+            tokens.push_back({Kind::Zero, {}});
+            break;
+        case '#':
+            tokens.push_back({Kind::Hash, {}});
+            break;
+        case ',':
+            tokens.push_back({Kind::Comma, {}});
+            break;
+        case '%':
+            tokens.push_back({Kind::Percent, {}});
+            break;
         case '.':
             // Only the first point is the decimal point; later ones are plain text.
             tokens.push_back({seenPoint ? Kind::Literal : Kind::Point, seenPoint ? "." : ""});
             seenPoint = true;
             break;
         case '\\':
-            if (i + 1 < section.size()) tokens.push_back({Kind::Literal, std::string(1, section[++i])});
+            if (i + 1 < section.size())
+                tokens.push_back({Kind::Literal, std::string(1, section[++i])});
             break;
         case '"': {
             const auto end = section.find('"', i + 1);
@@ -69,21 +78,24 @@ std::vector<Token> Tokenise(std::string_view section) {
             i = stop;
             break;
         }
-        default: tokens.push_back({Kind::Literal, std::string(1, c)});
+        default:
+            tokens.push_back({Kind::Literal, std::string(1, c)});
         }
     }
     return tokens;
 }
 
-bool IsDigitPlace(const Token& t) { return t.kind == Kind::Zero || t.kind == Kind::Hash; }
+bool IsDigitPlace(const Token& t) {
+    return t.kind == Kind::Zero || t.kind == Kind::Hash;
+}
 
 struct Layout {
     std::vector<Token> tokens;
-    std::size_t pointAt;          // index of the point token, or tokens.size()
-    std::string intPlaces;        // '0'/'#' of the integer places, in order
-    std::string fracPlaces;       // '0'/'#' of the fraction places, in order
+    std::size_t pointAt;    // index of the point token, or tokens.size()
+    std::string intPlaces;  // '0'/'#' of the integer places, in order
+    std::string fracPlaces; // '0'/'#' of the fraction places, in order
     bool grouping = false;
-    int scaleThousands = 0;       // commas just before the point or the end
+    int scaleThousands = 0; // commas just before the point or the end
     bool percent = false;
 };
 
@@ -205,7 +217,8 @@ std::vector<Piece> IntegerPieces(const Layout& l, const std::string& digits) {
         const Token& t = l.tokens[i];
         if (IsDigitPlace(t)) {
             if (!extraPlaced) {
-                for (char c : extra) out.push_back({std::string(1, c), true});
+                for (char c : extra)
+                    out.push_back({std::string(1, c), true});
                 extraPlaced = true;
             }
             if (place >= firstShown) out.push_back({std::string(1, padded[place]), true});
@@ -217,13 +230,15 @@ std::vector<Piece> IntegerPieces(const Layout& l, const std::string& digits) {
         }
     }
     if (!extraPlaced)
-        for (char c : extra) out.push_back({std::string(1, c), true});
+        for (char c : extra)
+            out.push_back({std::string(1, c), true});
     return out;
 }
 
 std::string JoinIntegerPieces(const std::vector<Piece>& pieces, bool grouping) {
     int digitCount = 0;
-    for (const auto& p : pieces) digitCount += p.digit ? 1 : 0;
+    for (const auto& p : pieces)
+        digitCount += p.digit ? 1 : 0;
     std::string out;
     int seen = 0;
     for (const auto& p : pieces) {
@@ -247,9 +262,12 @@ std::string FractionText(const Layout& l, const std::string& fraction) {
     std::size_t place = 0;
     for (std::size_t i = l.pointAt; i < l.tokens.size(); ++i) {
         const Token& t = l.tokens[i];
-        if (t.kind == Kind::Point) out += '.';
-        else if (t.kind == Kind::Percent) out += '%';
-        else if (t.kind == Kind::Literal) out += t.text;
+        if (t.kind == Kind::Point)
+            out += '.';
+        else if (t.kind == Kind::Percent)
+            out += '%';
+        else if (t.kind == Kind::Literal)
+            out += t.text;
         else if (IsDigitPlace(t)) {
             if (place < shownCount) out += fraction[place];
             ++place;
@@ -261,14 +279,14 @@ std::string FractionText(const Layout& l, const std::string& fraction) {
 std::string FormatSection(double magnitude, std::string_view section, int significant) {
     const Layout l = Analyse(section);
     if (l.percent) magnitude *= 100.0;
-    for (int i = 0; i < l.scaleThousands; ++i) magnitude /= 1000.0;
+    for (int i = 0; i < l.scaleThousands; ++i)
+        magnitude /= 1000.0;
     const Digits d = DecimalDigits(magnitude, significant, l.fracPlaces.size());
     return JoinIntegerPieces(IntegerPieces(l, d.integer), l.grouping) + FractionText(l, d.fraction);
 }
 
 std::string GeneralNumber(double value, int significant) {
-    const std::string s =
-        Trim(significant > 7 ? Str(value) : StrSingle(static_cast<float>(value)));
+    const std::string s = Trim(significant > 7 ? Str(value) : StrSingle(static_cast<float>(value)));
     // The classic general form keeps the zero before the point that Str drops.
     const bool negative = s.starts_with('-');
     const std::string_view body = std::string_view(s).substr(negative ? 1 : 0);
@@ -309,7 +327,8 @@ std::string TwoDigits(int v) {
 std::size_t RunLength(std::string_view s, std::size_t i) {
     std::size_t n = 1;
     const char c = static_cast<char>(std::tolower(static_cast<unsigned char>(s[i])));
-    while (i + n < s.size() && std::tolower(static_cast<unsigned char>(s[i + n])) == c) ++n;
+    while (i + n < s.size() && std::tolower(static_cast<unsigned char>(s[i + n])) == c)
+        ++n;
     return n;
 }
 
@@ -339,7 +358,9 @@ std::string YearField(CivilDate d, std::size_t run) {
 
 } // namespace
 
-std::string Format(double value, std::string_view pattern) { return FormatWith(value, pattern, 15); }
+std::string Format(double value, std::string_view pattern) {
+    return FormatWith(value, pattern, 15);
+}
 
 std::string FormatSingle(float value, std::string_view pattern) {
     return FormatWith(static_cast<double>(value), pattern, 7);
@@ -354,10 +375,14 @@ std::string FormatDate(std::string_view yyyymmdd, std::string_view pattern) {
     for (std::size_t i = 0; i < pattern.size();) {
         const char c = static_cast<char>(std::tolower(static_cast<unsigned char>(pattern[i])));
         const std::size_t run = (c == 'd' || c == 'm' || c == 'y') ? RunLength(pattern, i) : 1;
-        if (c == 'd') out += DayField(d, std::min<std::size_t>(run, 4));
-        else if (c == 'm') out += MonthField(d, std::min<std::size_t>(run, 4));
-        else if (c == 'y') out += YearField(d, run);
-        else out += pattern[i];
+        if (c == 'd')
+            out += DayField(d, std::min<std::size_t>(run, 4));
+        else if (c == 'm')
+            out += MonthField(d, std::min<std::size_t>(run, 4));
+        else if (c == 'y')
+            out += YearField(d, run);
+        else
+            out += pattern[i];
         i += run;
     }
     return out;

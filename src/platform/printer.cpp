@@ -13,7 +13,8 @@ std::string Num(double v) {
 } // namespace
 
 void RecordingPrinter::Take() {
-    for (const auto& c : m_page.calls()) m_calls.push_back(c);
+    for (const auto& c : m_page.calls())
+        m_calls.push_back(c);
     m_page.ClearCalls();
 }
 
@@ -24,7 +25,9 @@ void RecordingPrinter::SetOrientation(int orientation) {
 void RecordingPrinter::SetScaleOrigin(double left, double top) {
     m_calls.push_back("Origin " + Num(left) + "," + Num(top));
 }
-void RecordingPrinter::NewPage() { m_calls.push_back("NewPage"); }
+void RecordingPrinter::NewPage() {
+    m_calls.push_back("NewPage");
+}
 Status RecordingPrinter::EndDoc() {
     m_calls.push_back("EndDoc");
     return Status::Ok();
@@ -34,7 +37,9 @@ void RecordingPrinter::Clear() {
     m_page.Clear();
     Take();
 }
-void RecordingPrinter::SetBackColour(Colour c) { m_page.SetBackColour(c); }
+void RecordingPrinter::SetBackColour(Colour c) {
+    m_page.SetBackColour(c);
+}
 void RecordingPrinter::SetLineWidth(int width) {
     m_page.SetLineWidth(width);
     Take();
@@ -43,7 +48,9 @@ void RecordingPrinter::SetLineStyle(LineStyle style) {
     m_page.SetLineStyle(style);
     Take();
 }
-void RecordingPrinter::SetForeColour(Colour c) { m_page.SetForeColour(c); }
+void RecordingPrinter::SetForeColour(Colour c) {
+    m_page.SetForeColour(c);
+}
 void RecordingPrinter::Line(double x1, double y1, double x2, double y2, Colour c) {
     m_page.Line(x1, y1, x2, y2, c);
     Take();
@@ -60,11 +67,21 @@ void RecordingPrinter::Point(double x, double y, Colour c) {
     m_page.Point(x, y, c);
     Take();
 }
-void RecordingPrinter::SetFontName(std::string_view name) { m_page.SetFontName(name); }
-void RecordingPrinter::SetFontSize(double points) { m_page.SetFontSize(points); }
-void RecordingPrinter::SetFontBold(bool bold) { m_page.SetFontBold(bold); }
-void RecordingPrinter::SetFontItalic(bool italic) { m_page.SetFontItalic(italic); }
-void RecordingPrinter::SetTextPosition(double x, double y) { m_page.SetTextPosition(x, y); }
+void RecordingPrinter::SetFontName(std::string_view name) {
+    m_page.SetFontName(name);
+}
+void RecordingPrinter::SetFontSize(double points) {
+    m_page.SetFontSize(points);
+}
+void RecordingPrinter::SetFontBold(bool bold) {
+    m_page.SetFontBold(bold);
+}
+void RecordingPrinter::SetFontItalic(bool italic) {
+    m_page.SetFontItalic(italic);
+}
+void RecordingPrinter::SetTextPosition(double x, double y) {
+    m_page.SetTextPosition(x, y);
+}
 void RecordingPrinter::PrintText(std::string_view text) {
     m_page.PrintText(text);
     Take();

@@ -3,8 +3,8 @@
 #include <cmath>
 #include <cstdio>
 #include <cstdlib>
-#include <string>
 #include <limits>
+#include <string>
 
 namespace kori::platform {
 
@@ -47,14 +47,26 @@ double RoundHalfEven(double x, int decimals) {
     return RoundHalfEven(x * scale) / scale;
 }
 
-std::optional<std::int16_t> CInt(double x) { return Fit<std::int16_t>(RoundHalfEven(x)); }
-std::optional<std::int32_t> CLng(double x) { return Fit<std::int32_t>(RoundHalfEven(x)); }
+std::optional<std::int16_t> CInt(double x) {
+    return Fit<std::int16_t>(RoundHalfEven(x));
+}
+std::optional<std::int32_t> CLng(double x) {
+    return Fit<std::int32_t>(RoundHalfEven(x));
+}
 
-double Fix(double x) { return std::trunc(x); }
-double Int(double x) { return std::floor(x); }
+double Fix(double x) {
+    return std::trunc(x);
+}
+double Int(double x) {
+    return std::floor(x);
+}
 
-std::optional<std::int16_t> FixToInt16(double x) { return Fit<std::int16_t>(Fix(x)); }
-std::optional<std::int32_t> FixToInt32(double x) { return Fit<std::int32_t>(Fix(x)); }
+std::optional<std::int16_t> FixToInt16(double x) {
+    return Fit<std::int16_t>(Fix(x));
+}
+std::optional<std::int32_t> FixToInt32(double x) {
+    return Fit<std::int32_t>(Fix(x));
+}
 
 std::optional<Money> Money::FromDouble(double value) {
     if (!std::isfinite(value)) return std::nullopt;

@@ -26,7 +26,9 @@ public:
     std::string Get(std::string_view key, std::string_view fallback) const {
         return Get(kAppName, kAppSection, key, fallback);
     }
-    void Save(std::string_view key, std::string_view value) { Save(kAppName, kAppSection, key, value); }
+    void Save(std::string_view key, std::string_view value) {
+        Save(kAppName, kAppSection, key, value);
+    }
 
 private:
     static std::string SectionName(std::string_view app, std::string_view section);

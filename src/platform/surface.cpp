@@ -44,16 +44,23 @@ std::string Four(const char* name, double a, double b, double c, double d, Colou
 }
 const char* StyleName(LineStyle s) {
     switch (s) {
-    case LineStyle::Solid: return "solid";
-    case LineStyle::Dash: return "dash";
-    case LineStyle::Dot: return "dot";
+    case LineStyle::Solid:
+        return "solid";
+    case LineStyle::Dash:
+        return "dash";
+    case LineStyle::Dot:
+        return "dot";
     }
     return "?";
 }
 } // namespace
 
-void RecordingSurface::Clear() { Add("Clear #" + std::to_string(m_back)); }
-void RecordingSurface::SetBackColour(Colour c) { m_back = c; }
+void RecordingSurface::Clear() {
+    Add("Clear #" + std::to_string(m_back));
+}
+void RecordingSurface::SetBackColour(Colour c) {
+    m_back = c;
+}
 void RecordingSurface::SetLineWidth(int width) {
     m_lineWidth = width;
     Add("Width " + std::to_string(width));
@@ -62,7 +69,9 @@ void RecordingSurface::SetLineStyle(LineStyle style) {
     m_style = style;
     Add(std::string("Style ") + StyleName(style));
 }
-void RecordingSurface::SetForeColour(Colour c) { m_fore = c; }
+void RecordingSurface::SetForeColour(Colour c) {
+    m_fore = c;
+}
 void RecordingSurface::Line(double x1, double y1, double x2, double y2, Colour c) {
     Add(Four("Line", x1, y1, x2, y2, c));
 }
@@ -75,10 +84,18 @@ void RecordingSurface::FilledBox(double x1, double y1, double x2, double y2, Col
 void RecordingSurface::Point(double x, double y, Colour c) {
     Add("Point " + Num(x) + "," + Num(y) + " #" + std::to_string(c));
 }
-void RecordingSurface::SetFontName(std::string_view name) { m_fontName = name; }
-void RecordingSurface::SetFontSize(double points) { m_fontSize = points; }
-void RecordingSurface::SetFontBold(bool bold) { m_bold = bold; }
-void RecordingSurface::SetFontItalic(bool italic) { m_italic = italic; }
+void RecordingSurface::SetFontName(std::string_view name) {
+    m_fontName = name;
+}
+void RecordingSurface::SetFontSize(double points) {
+    m_fontSize = points;
+}
+void RecordingSurface::SetFontBold(bool bold) {
+    m_bold = bold;
+}
+void RecordingSurface::SetFontItalic(bool italic) {
+    m_italic = italic;
+}
 void RecordingSurface::SetTextPosition(double x, double y) {
     m_textX = x;
     m_textY = y;
@@ -92,6 +109,8 @@ void RecordingSurface::PrintText(std::string_view text) {
 double RecordingSurface::TextWidth(std::string_view text) {
     return 0.6 * m_fontSize * static_cast<double>(text.size());
 }
-double RecordingSurface::TextHeight(std::string_view) { return 1.5 * m_fontSize; }
+double RecordingSurface::TextHeight(std::string_view) {
+    return 1.5 * m_fontSize;
+}
 
 } // namespace kori::platform

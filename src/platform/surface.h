@@ -13,9 +13,15 @@ using Colour = std::uint32_t;
 constexpr Colour Rgb(int r, int g, int b) {
     return static_cast<Colour>((r & 0xFF) | ((g & 0xFF) << 8) | ((b & 0xFF) << 16));
 }
-constexpr int Red(Colour c) { return static_cast<int>(c & 0xFF); }
-constexpr int Green(Colour c) { return static_cast<int>((c >> 8) & 0xFF); }
-constexpr int Blue(Colour c) { return static_cast<int>((c >> 16) & 0xFF); }
+constexpr int Red(Colour c) {
+    return static_cast<int>(c & 0xFF);
+}
+constexpr int Green(Colour c) {
+    return static_cast<int>((c >> 8) & 0xFF);
+}
+constexpr int Blue(Colour c) {
+    return static_cast<int>((c >> 16) & 0xFF);
+}
 
 enum class LineStyle { Solid, Dash, Dot };
 

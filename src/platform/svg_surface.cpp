@@ -17,12 +17,11 @@ constexpr double kLineHeight = 1.149; // ascent + descent + line gap
 // Advance widths in thousandths of an em of the printable ASCII characters, from the blank
 // to the tilde; other characters count as an "n".
 constexpr short kAdvance[95] = {
-    278, 278, 355, 556, 556, 889, 667, 191, 333, 333, 389, 584, 278, 333, 278, 278,
-    556, 556, 556, 556, 556, 556, 556, 556, 556, 556, 278, 278, 584, 584, 584, 556,
-    1015, 667, 667, 722, 722, 667, 611, 778, 722, 278, 500, 667, 556, 833, 722, 778,
-    667, 778, 722, 667, 611, 722, 667, 944, 667, 667, 611, 278, 278, 278, 469, 556,
-    333, 556, 556, 500, 556, 556, 278, 556, 556, 222, 222, 500, 222, 833, 556, 556,
-    556, 556, 333, 500, 278, 556, 500, 722, 500, 500, 500, 334, 260, 334, 584};
+    278, 278, 355, 556, 556, 889, 667, 191, 333, 333, 389, 584, 278, 333,  278, 278, 556, 556, 556,
+    556, 556, 556, 556, 556, 556, 556, 278, 278, 584, 584, 584, 556, 1015, 667, 667, 722, 722, 667,
+    611, 778, 722, 278, 500, 667, 556, 833, 722, 778, 667, 778, 722, 667,  611, 722, 667, 944, 667,
+    667, 611, 278, 278, 278, 469, 556, 333, 556, 556, 500, 556, 556, 278,  556, 556, 222, 222, 500,
+    222, 833, 556, 556, 556, 556, 333, 500, 278, 556, 500, 722, 500, 500,  500, 334, 260, 334, 584};
 constexpr double kBoldWidening = 1.07;
 
 std::string Num(double v) {
@@ -44,11 +43,20 @@ std::string XmlText(std::string_view text) {
     for (char ch : text) {
         const auto u = static_cast<unsigned char>(ch);
         switch (ch) {
-        case '&': r += "&amp;"; continue;
-        case '<': r += "&lt;"; continue;
-        case '>': r += "&gt;"; continue;
-        case '"': r += "&quot;"; continue;
-        default: break;
+        case '&':
+            r += "&amp;";
+            continue;
+        case '<':
+            r += "&lt;";
+            continue;
+        case '>':
+            r += "&gt;";
+            continue;
+        case '"':
+            r += "&quot;";
+            continue;
+        default:
+            break;
         }
         if (u < 0x20) continue;
         if (u < 0x80) {
@@ -68,7 +76,9 @@ std::string Rect(double x, double y, double w, double h) {
 
 } // namespace
 
-double SvgSurface::FontUnits() const { return std::max(m_fontSize, 1.0) * kUnitsPerPoint; }
+double SvgSurface::FontUnits() const {
+    return std::max(m_fontSize, 1.0) * kUnitsPerPoint;
+}
 
 std::string SvgSurface::Stroke(Colour c) const {
     std::string s = " stroke=\"" + Hex(c) + "\" stroke-width=\"" + Num(m_lineWidth) + "\"";
@@ -100,9 +110,9 @@ void SvgSurface::Box(double x1, double y1, double x2, double y2, Colour c) {
 
 // Both corners are inside the filled area.
 void SvgSurface::FilledBox(double x1, double y1, double x2, double y2, Colour c) {
-    m_body += Rect(std::min(x1, x2), std::min(y1, y2), std::fabs(x2 - x1) + 1,
-                   std::fabs(y2 - y1) + 1) +
-              " fill=\"" + Hex(c) + "\"/>\n";
+    m_body +=
+        Rect(std::min(x1, x2), std::min(y1, y2), std::fabs(x2 - x1) + 1, std::fabs(y2 - y1) + 1) +
+        " fill=\"" + Hex(c) + "\"/>\n";
 }
 
 void SvgSurface::Point(double x, double y, Colour c) {
@@ -114,8 +124,7 @@ void SvgSurface::PrintText(std::string_view text) {
     m_body += "<text x=\"" + Num(m_textX) + "\" y=\"" + Num(m_textY + kAscent * size) +
               "\" font-family=\"" + XmlText(m_fontName) + "\" font-size=\"" + Num(size) + "\"" +
               (m_bold ? " font-weight=\"bold\"" : "") + (m_italic ? " font-style=\"italic\"" : "") +
-              " fill=\"" + Hex(m_fore) + "\" xml:space=\"preserve\">" + XmlText(text) +
-              "</text>\n";
+              " fill=\"" + Hex(m_fore) + "\" xml:space=\"preserve\">" + XmlText(text) + "</text>\n";
     m_textY += TextHeight(text);
 }
 
@@ -128,7 +137,9 @@ double SvgSurface::TextWidth(std::string_view text) {
     return thousandths / 1000 * FontUnits() * (m_bold ? kBoldWidening : 1.0);
 }
 
-double SvgSurface::TextHeight(std::string_view) { return kLineHeight * FontUnits(); }
+double SvgSurface::TextHeight(std::string_view) {
+    return kLineHeight * FontUnits();
+}
 
 std::string SvgSurface::Document() const {
     return "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n"

@@ -10,7 +10,9 @@
 namespace kori::platform {
 
 namespace {
-bool IsBlank(char c) { return c == ' ' || c == '\t' || c == '\r' || c == '\n' || c == '\0'; }
+bool IsBlank(char c) {
+    return c == ' ' || c == '\t' || c == '\r' || c == '\n' || c == '\0';
+}
 
 // Formats with `digits` significant digits in the classic style.
 std::string ClassicStr(double value, int digits) {
@@ -26,20 +28,23 @@ std::string ClassicStr(double value, int digits) {
         std::string mant = s.substr(0, e);
         std::string ex = s.substr(e + 1);
         if (mant.find('.') != std::string::npos) {
-            while (!mant.empty() && mant.back() == '0') mant.pop_back();
+            while (!mant.empty() && mant.back() == '0')
+                mant.pop_back();
             if (!mant.empty() && mant.back() == '.') mant.pop_back();
         }
         // Exponent as "E+20" / "E-05": sign always, at least two digits.
         const char sign = ex[0];
         std::string digitsPart = ex.substr(1);
-        while (digitsPart.size() > 2 && digitsPart[0] == '0') digitsPart.erase(0, 1);
+        while (digitsPart.size() > 2 && digitsPart[0] == '0')
+            digitsPart.erase(0, 1);
         body = mant + "E" + sign + digitsPart;
     } else {
         const int decimals = std::max(0, digits - 1 - exp10);
         std::snprintf(buf, sizeof buf, "%.*f", decimals, mag);
         body = buf;
         if (body.find('.') != std::string::npos) {
-            while (!body.empty() && body.back() == '0') body.pop_back();
+            while (!body.empty() && body.back() == '0')
+                body.pop_back();
             if (!body.empty() && body.back() == '.') body.pop_back();
         }
         if (body.size() > 1 && body[0] == '0' && body[1] == '.') body.erase(0, 1);
@@ -51,27 +56,33 @@ std::string ClassicStr(double value, int digits) {
 
 std::string TrimLeft(std::string_view s) {
     std::size_t b = 0;
-    while (b < s.size() && IsBlank(s[b])) ++b;
+    while (b < s.size() && IsBlank(s[b]))
+        ++b;
     return std::string(s.substr(b));
 }
 
 std::string TrimRight(std::string_view s) {
     std::size_t e = s.size();
-    while (e > 0 && IsBlank(s[e - 1])) --e;
+    while (e > 0 && IsBlank(s[e - 1]))
+        --e;
     return std::string(s.substr(0, e));
 }
 
-std::string Trim(std::string_view s) { return TrimLeft(TrimRight(s)); }
+std::string Trim(std::string_view s) {
+    return TrimLeft(TrimRight(s));
+}
 
 std::string Upper(std::string_view s) {
     std::string r(s);
-    for (auto& c : r) c = static_cast<char>(std::toupper(static_cast<unsigned char>(c)));
+    for (auto& c : r)
+        c = static_cast<char>(std::toupper(static_cast<unsigned char>(c)));
     return r;
 }
 
 std::string Lower(std::string_view s) {
     std::string r(s);
-    for (auto& c : r) c = static_cast<char>(std::tolower(static_cast<unsigned char>(c)));
+    for (auto& c : r)
+        c = static_cast<char>(std::tolower(static_cast<unsigned char>(c)));
     return r;
 }
 
@@ -90,13 +101,18 @@ std::string PadRight(std::string_view s, std::size_t width) {
     return r;
 }
 
-std::string Str(double value) { return ClassicStr(value, 15); }
+std::string Str(double value) {
+    return ClassicStr(value, 15);
+}
 
-std::string StrSingle(float value) { return ClassicStr(static_cast<double>(value), 7); }
+std::string StrSingle(float value) {
+    return ClassicStr(static_cast<double>(value), 7);
+}
 
 double Val(std::string_view text) {
     std::size_t i = 0;
-    while (i < text.size() && IsBlank(text[i])) ++i;
+    while (i < text.size() && IsBlank(text[i]))
+        ++i;
     if (i + 1 < text.size() && text[i] == '&' && (text[i + 1] == 'H' || text[i + 1] == 'h')) {
         long long v = 0;
         std::size_t j = i + 2;

@@ -10,7 +10,8 @@
 namespace kori::store {
 
 struct ChartBar {
-    std::array<char, 8> Date{' ', ' ', ' ', ' ', ' ', ' ', ' ', ' '}; // "yyyymmdd"; blank on a no-trade bar
+    std::array<char, 8> Date{' ', ' ', ' ', ' ',
+                             ' ', ' ', ' ', ' '}; // "yyyymmdd"; blank on a no-trade bar
     float Open = 0;
     float High = 0;
     float Low = 0;
@@ -21,7 +22,8 @@ struct ChartBar {
     std::string_view DateText() const { return {Date.data(), Date.size()}; }
     void SetDate(std::string_view yyyymmdd) {
         Date.fill(' ');
-        for (std::size_t i = 0; i < Date.size() && i < yyyymmdd.size(); ++i) Date[i] = yyyymmdd[i];
+        for (std::size_t i = 0; i < Date.size() && i < yyyymmdd.size(); ++i)
+            Date[i] = yyyymmdd[i];
     }
 };
 

@@ -31,7 +31,8 @@ std::vector<std::vector<std::string>> ReadLines(std::string_view folder, std::st
     if (!content) return lines;
     std::istringstream in(*content);
     std::string line;
-    while (std::getline(in, line)) lines.push_back(SplitCommas(line));
+    while (std::getline(in, line))
+        lines.push_back(SplitCommas(line));
     return lines;
 }
 
@@ -93,7 +94,8 @@ std::vector<ClassRow> ReadClassFile(std::string_view systemFolder, std::string_v
     std::vector<ClassRow> rows;
     for (const auto& f : ReadLines(systemFolder, fileName)) {
         ClassRow row;
-        for (std::size_t i = 0; i < fields; ++i) row.push_back(Field(f, i));
+        for (std::size_t i = 0; i < fields; ++i)
+            row.push_back(Field(f, i));
         if (row[0].empty() && (fields < 2 || row[1].empty())) continue;
         rows.push_back(row);
     }

@@ -33,7 +33,9 @@ inline Raw Decode(const char* p) {
     return r;
 }
 
-inline int Digit(char c) { return c >= '0' && c <= '9' ? c - '0' : -1; }
+inline int Digit(char c) {
+    return c >= '0' && c <= '9' ? c - '0' : -1;
+}
 
 // Sunday 1 .. Saturday 7, or 0 for text that is not a date.
 int WeekdayOf(const char* d) {
@@ -96,7 +98,8 @@ struct Loader {
         previousClose = bar.Close;
         if (r.high == 0 && req.RecordType > 3) bar.Open = bar.High = bar.Low = bar.Close;
         const bool closeOnly = req.RecordType == 3;
-        res.HighestPrice = std::max(res.HighestPrice, (r.high == 0 || closeOnly) ? r.close : r.high);
+        res.HighestPrice =
+            std::max(res.HighestPrice, (r.high == 0 || closeOnly) ? r.close : r.high);
         if (r.low == 0 || closeOnly) {
             if (r.close != 0) res.LowestPrice = std::min(res.LowestPrice, r.close);
         } else {

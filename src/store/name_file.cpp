@@ -4,7 +4,6 @@
 #include "platform/number_format.h"
 #include "platform/text.h"
 
-
 namespace kori::store {
 
 using platform::Status;
@@ -40,7 +39,8 @@ std::optional<FoundCode> FindCodeInNameFile(std::string_view dataFolder, std::st
     }
     FoundCode r;
     r.RecordNumber = found;
-    r.Record = NameRecord::Decode(bytes->data() + static_cast<std::size_t>(found - 1) * NameRecord::kSize);
+    r.Record =
+        NameRecord::Decode(bytes->data() + static_cast<std::size_t>(found - 1) * NameRecord::kSize);
     r.CurrentFile = platform::FolderWithSlash(dataFolder) + platform::Trim(wanted) + ".WDT";
     return r;
 }
@@ -51,16 +51,16 @@ void LookupNameAndClass(std::string_view dataFolder, std::string_view code, std:
     if (!platform::FileExists(path)) return;
     const auto bytes = platform::ReadWholeFile(path);
     const std::string wanted = platform::Upper(platform::Trim(code));
-    const int found = bytes ? WalkCodes(*bytes, [&](std::string_view c) {
-        return platform::Trim(c) == wanted;
-    })
-                            : 0;
+    const int found =
+        bytes ? WalkCodes(*bytes, [&](std::string_view c) { return platform::Trim(c) == wanted; })
+              : 0;
     if (found == 0) {
         name.clear();
         industryClass.clear();
         return;
     }
-    const auto r = NameRecord::Decode(bytes->data() + static_cast<std::size_t>(found - 1) * NameRecord::kSize);
+    const auto r =
+        NameRecord::Decode(bytes->data() + static_cast<std::size_t>(found - 1) * NameRecord::kSize);
     name = platform::Trim(r.Name);
     industryClass = r.IndustryClass;
 }
@@ -70,11 +70,14 @@ std::string LookupGicsSector(std::string_view dataFolder, std::string_view code)
     if (wanted.empty()) return "0000";
     const auto bytes = platform::ReadWholeFile(NameFile::PathIn(dataFolder));
     if (!bytes) return "0000";
-    const int found = WalkCodes(*bytes, [&](std::string_view c) { return platform::Trim(c) == wanted; });
+    const int found =
+        WalkCodes(*bytes, [&](std::string_view c) { return platform::Trim(c) == wanted; });
     if (found == 0) return "0000";
-    const auto r = NameRecord::Decode(bytes->data() + static_cast<std::size_t>(found - 1) * NameRecord::kSize);
+    const auto r =
+        NameRecord::Decode(bytes->data() + static_cast<std::size_t>(found - 1) * NameRecord::kSize);
     std::string sector = platform::Trim(r.GicsSector);
-    if (!sector.empty() && platform::Val(sector) != 0) sector = platform::Format(platform::Val(sector), "0000");
+    if (!sector.empty() && platform::Val(sector) != 0)
+        sector = platform::Format(platform::Val(sector), "0000");
     return sector;
 }
 

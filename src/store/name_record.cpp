@@ -52,7 +52,9 @@ NameRecord NameRecord::Decode(const char* p) {
     return r;
 }
 
-std::string NameRecord::TrimmedCode() const { return platform::Trim(Code); }
+std::string NameRecord::TrimmedCode() const {
+    return platform::Trim(Code);
+}
 
 std::string PadCode(std::string_view code) {
     std::string c = platform::Upper(platform::Trim(code));

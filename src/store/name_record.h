@@ -9,12 +9,12 @@ namespace kori::store {
 struct NameRecord {
     static constexpr std::size_t kSize = 96;
 
-    std::int16_t Status = 0;        // 0 ordinary, 1 deleted, 9 dealt with by the adjustment run
-    std::string Code;               // 6, upper case; also the price file's base name
-    std::int16_t RecordType = 4;    // 1..5
-    std::string Name;               // 35
-    std::string OtherDetails;       // 15
-    float Base = 0;                 // manual scale bottom (record number in TmpNames.tmp)
+    std::int16_t Status = 0;     // 0 ordinary, 1 deleted, 9 dealt with by the adjustment run
+    std::string Code;            // 6, upper case; also the price file's base name
+    std::int16_t RecordType = 4; // 1..5
+    std::string Name;            // 35
+    std::string OtherDetails;    // 15
+    float Base = 0;              // manual scale bottom (record number in TmpNames.tmp)
     float Top = 0;
     float PFIncrement = 0;
     float ScaleStep = 0.05f;
@@ -23,17 +23,19 @@ struct NameRecord {
     std::int16_t BollingerPeriod = 0;
     std::int16_t BollingerWidth = 0;
     std::int16_t Category = 0;
-    std::string Id;                 // 1
-    std::string IndustryClass;      // 3
-    std::string GicsSector;         // 4
-    std::string Reserved;           // 2
+    std::string Id;            // 1
+    std::string IndustryClass; // 3
+    std::string GicsSector;    // 4
+    std::string Reserved;      // 2
 
     std::array<char, kSize> Encode() const;
     static NameRecord Decode(const char* bytes);
 
     std::string TrimmedCode() const;
     // Band values as the chart reads them: outside 1 to 100 means 5.
-    std::int16_t BandUp() const { return PercentBandUp >= 1 && PercentBandUp <= 100 ? PercentBandUp : 5; }
+    std::int16_t BandUp() const {
+        return PercentBandUp >= 1 && PercentBandUp <= 100 ? PercentBandUp : 5;
+    }
     std::int16_t BandDown() const {
         return PercentBandDown >= 1 && PercentBandDown <= 100 ? PercentBandDown : 5;
     }

@@ -49,9 +49,10 @@ std::filesystem::path PriceFile::PathFor(std::string_view dataFolder, std::strin
 Status PriceFile::SortByDate() {
     std::vector<PriceRecord> records;
     if (auto s = ReadAll(records); !s) return s;
-    std::stable_sort(records.begin(), records.end(), [](const PriceRecord& a, const PriceRecord& b) {
-        return platform::Val(a.Date) < platform::Val(b.Date);
-    });
+    std::stable_sort(records.begin(), records.end(),
+                     [](const PriceRecord& a, const PriceRecord& b) {
+                         return platform::Val(a.Date) < platform::Val(b.Date);
+                     });
     // The sorted copy goes to Temp.Wk2 first, then takes the file's place.
     PriceFile work(m_path.parent_path() / "Temp.Wk2");
     if (auto s = work.WriteAll(records); !s) return s;

@@ -15,13 +15,13 @@ namespace kori::store {
 struct PriceRecord {
     static constexpr std::size_t kSize = 50;
 
-    std::string Date = "        "; // "yyyymmdd"
+    std::string Date = "        ";                // "yyyymmdd"
     float Open = 0, High = 0, Low = 0, Close = 0; // close 0 marks a no-trade record
     std::int32_t Volume = 0;
     float AdjFactor = 0;
-    std::string AdjDesc;  // 14
+    std::string AdjDesc;    // 14
     std::string Flag = " "; // "I" from an intraday update
-    std::string Reserved; // 3, written blank
+    std::string Reserved;   // 3, written blank
 
     std::array<char, kSize> Encode() const;
     static PriceRecord Decode(const char* bytes);

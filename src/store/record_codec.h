@@ -14,9 +14,13 @@ template <typename T> inline T Get(const char* p) {
     std::memcpy(&v, p, sizeof v);
     return v;
 }
-template <typename T> inline void Put(char* p, T v) { std::memcpy(p, &v, sizeof v); }
+template <typename T> inline void Put(char* p, T v) {
+    std::memcpy(p, &v, sizeof v);
+}
 
-inline std::string GetText(const char* p, std::size_t n) { return std::string(p, n); }
+inline std::string GetText(const char* p, std::size_t n) {
+    return std::string(p, n);
+}
 inline void PutText(char* p, std::string_view s, std::size_t n) {
     const std::string padded = platform::PadRight(s, n);
     std::memcpy(p, padded.data(), n);

@@ -4,7 +4,8 @@ namespace kori::store {
 
 using platform::Status;
 
-Status CountRecords(const std::filesystem::path& file, std::size_t recordSize, std::int16_t& count) {
+Status CountRecords(const std::filesystem::path& file, std::size_t recordSize,
+                    std::int16_t& count) {
     const auto records = platform::FileSizeOr0(file) / recordSize;
     if (records > static_cast<std::uintmax_t>(kMaxRecords)) {
         count = 0;
@@ -28,7 +29,8 @@ Status RecordFileBase::ReadRange(int first, int last, std::string& bytes) const 
     bytes.clear();
     if (first < 1 || last < first) return Status::Ok();
     if (last > m_count)
-        return Status::Error("Record " + std::to_string(last) + " is not in " + m_path.filename().string());
+        return Status::Error("Record " + std::to_string(last) + " is not in " +
+                             m_path.filename().string());
     std::ifstream in(m_path, std::ios::binary);
     const auto size = static_cast<std::size_t>(last - first + 1) * m_size;
     bytes.resize(size);

@@ -44,13 +44,14 @@ protected:
 
 template <typename Record> class RecordFile : public RecordFileBase {
 public:
-    explicit RecordFile(std::filesystem::path path) : RecordFileBase(std::move(path), Record::kSize) {}
+    explicit RecordFile(std::filesystem::path path)
+        : RecordFileBase(std::move(path), Record::kSize) {}
 
     platform::Status Read(int recordNumber, Record& out) const {
         std::string bytes;
         if (recordNumber < 1 || recordNumber > m_count)
-            return platform::Status::Error("Record " + std::to_string(recordNumber) + " is not in " +
-                                           m_path.filename().string());
+            return platform::Status::Error("Record " + std::to_string(recordNumber) +
+                                           " is not in " + m_path.filename().string());
         if (auto s = ReadRange(recordNumber, recordNumber, bytes); !s) return s;
         out = Record::Decode(bytes.data());
         return platform::Status::Ok();
@@ -74,7 +75,8 @@ public:
         }
         out.reserve(static_cast<std::size_t>(count));
         for (int i = 0; i < count; ++i)
-            out.push_back(Record::Decode(bytes.data() + static_cast<std::size_t>(i) * Record::kSize));
+            out.push_back(
+                Record::Decode(bytes.data() + static_cast<std::size_t>(i) * Record::kSize));
         return platform::Status::Ok();
     }
     platform::Status WriteAll(const std::vector<Record>& records) {

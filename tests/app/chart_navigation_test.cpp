@@ -66,7 +66,8 @@ TEST(CursorReadout, NamesTheBarUnderTheCursor) {
     EXPECT_EQ(app::CursorReadout(c, 59, false),
               (std::vector<std::string>{"Open  1.25", "High  1.255", "Low  .80", "Close  1.25",
                                         "Vol  12345"}));
-    EXPECT_EQ(app::CursorReadout(c, 51, true), (std::vector<std::string>{"Close  1.00", "Vol  1000"}));
+    EXPECT_EQ(app::CursorReadout(c, 51, true),
+              (std::vector<std::string>{"Close  1.00", "Vol  1000"}));
     EXPECT_TRUE(app::CursorReadout(c, 30, false).empty());
     EXPECT_TRUE(app::CursorReadout(c, 70, false).empty());
     EXPECT_EQ(app::ReadoutPrice(0), "");

@@ -14,11 +14,14 @@ struct Selection : ::testing::Test {
     app::ChartState state;
     app::ChartSelection sel{s.session, state};
 
-    void Set(const char* key, const std::string& value) { s.session.ini().Write("Charts", key, value); }
+    void Set(const char* key, const std::string& value) {
+        s.session.ini().Write("Charts", key, value);
+    }
     std::string Ini(const char* key) { return s.session.ini().Read("Charts", key); }
     int Beeps() const {
         int n = 0;
-        for (const auto& d : s.dialogs.shown()) n += d.kind == "beep";
+        for (const auto& d : s.dialogs.shown())
+            n += d.kind == "beep";
         return n;
     }
 };
@@ -255,7 +258,8 @@ TEST_F(Selection, ClassWalksStepThroughOneClassOrGroupOfTheFullList) {
     // "120" is the group 12x.
     ASSERT_TRUE(sel.SetClassCode(false, "120"));
     std::vector<std::string> group = {sel.form().Code};
-    for (int i = 0; i < 4 && sel.FindNextClass(); ++i) group.push_back(sel.form().Code);
+    for (int i = 0; i < 4 && sel.FindNextClass(); ++i)
+        group.push_back(sel.form().Code);
     EXPECT_EQ(group, (std::vector<std::string>{"KRM", "ALX", "BWG", "CPR", "DLT"}));
 
     s.dialogs.clear();
@@ -290,5 +294,6 @@ TEST_F(Selection, TheChartWindowsClassStepWrapsBothWays) {
     ASSERT_TRUE(again);
     EXPECT_EQ(again->TrimmedCode(), "KRM");
     EXPECT_FALSE(app::StepClassChart(sel.walk(), r, 1, "998", false, s.dialogs));
-    EXPECT_EQ(s.dialogs.messages().back(), "No records on file for that Industry classification or group");
+    EXPECT_EQ(s.dialogs.messages().back(),
+              "No records on file for that Industry classification or group");
 }

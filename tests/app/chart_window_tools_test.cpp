@@ -35,14 +35,19 @@ struct Tools : ::testing::Test {
         ASSERT_TRUE(app::BuildSecurityChart(s.session, job, chart, area));
         app::ClearChartLines(s.session);
     }
-    std::string Stream() { return platform::ReadWholeFile(app::ChartStreamPath(s.session)).value_or(""); }
+    std::string Stream() {
+        return platform::ReadWholeFile(app::ChartStreamPath(s.session)).value_or("");
+    }
     int HLines() {
         const std::string t = "\n" + Stream();
         int n = 0;
-        for (std::size_t p = t.find("\nH,"); p != std::string::npos; p = t.find("\nH,", p + 1)) ++n;
+        for (std::size_t p = t.find("\nH,"); p != std::string::npos; p = t.find("\nH,", p + 1))
+            ++n;
         return n;
     }
-    std::string Lines() { return platform::ReadWholeFile(app::ChartLinesPath(s.session)).value_or(""); }
+    std::string Lines() {
+        return platform::ReadWholeFile(app::ChartLinesPath(s.session)).value_or("");
+    }
     double XOf(int bar) const { return chart.PlotLeft + bar * chart.BarSpacing; }
     double YOfClose(int bar) const {
         return chart.PriceToY(chart.ChartBars()[static_cast<std::size_t>(bar)].Close);
@@ -69,8 +74,10 @@ TEST_F(Tools, ATrendlineLandsInTheFileAndStreamsAndComesBackOnItsPeriodOnly) {
     const auto records = chart::TrendlineFile::ReadAll(app::TrendlinePath(s.session, "KRM"));
     ASSERT_EQ(records.size(), 1u);
     EXPECT_EQ(records[0].Period, 'A');
-    EXPECT_EQ(records[0].DateA, std::string(chart.ChartBars()[static_cast<std::size_t>(last - 40)].DateText()));
-    EXPECT_EQ(records[0].DateB, std::string(chart.ChartBars()[static_cast<std::size_t>(last - 5)].DateText()));
+    EXPECT_EQ(records[0].DateA,
+              std::string(chart.ChartBars()[static_cast<std::size_t>(last - 40)].DateText()));
+    EXPECT_EQ(records[0].DateB,
+              std::string(chart.ChartBars()[static_cast<std::size_t>(last - 5)].DateText()));
     // One "H" line each in ChtLns.Tmp and at the end of TCht.Tmp.
     EXPECT_EQ(Lines().rfind("H,", 0), 0u);
     const std::string stream = Stream();
@@ -98,7 +105,8 @@ TEST_F(Tools, AClickWithoutDragKeepsNoLineAndAnEndPastTheChartIsHeldNearTheEdge)
     const double x = XOf(last - 10), y = YOfClose(last - 10);
     EXPECT_FALSE(app::AddTrendline(s.session, chart, job.Request, "KRM", area, x, y, x, y));
     EXPECT_FALSE(platform::FileHasData(app::TrendlinePath(s.session, "KRM")));
-    ASSERT_TRUE(app::AddTrendline(s.session, chart, job.Request, "KRM", area, x, y, chart.PlotRight + 200, y));
+    ASSERT_TRUE(app::AddTrendline(s.session, chart, job.Request, "KRM", area, x, y,
+                                  chart.PlotRight + 200, y));
     const auto records = chart::TrendlineFile::ReadAll(app::TrendlinePath(s.session, "KRM"));
     ASSERT_EQ(records.size(), 1u);
     EXPECT_EQ(records[0].DateB[0], 'X');
@@ -122,7 +130,8 @@ TEST_F(Tools, ErasedLinesStayAsBlankRecordsUntilPackedAndRemoveAllAsksFirst) {
     s.dialogs.QueueAnswer(platform::Answer::No);
     EXPECT_FALSE(app::RemoveAllTrendlines(s.session, "KRM"));
     EXPECT_TRUE(platform::FileExists(path));
-    EXPECT_EQ(s.dialogs.messages().back(), "WARNING - All trendlines for KRM will be removed. Are you sure?");
+    EXPECT_EQ(s.dialogs.messages().back(),
+              "WARNING - All trendlines for KRM will be removed. Are you sure?");
     EXPECT_EQ(s.dialogs.shown().back().title, "Remove all Trendlines");
     s.dialogs.QueueAnswer(platform::Answer::Yes);
     EXPECT_TRUE(app::RemoveAllTrendlines(s.session, "KRM"));
@@ -133,9 +142,11 @@ TEST_F(Tools, TextNotesKeepDateAndPriceAndReplayAtTheirBar) {
     Build("KRM", 'A');
     const int last = chart.LastBar();
     const double y = YOfClose(last - 3);
-    ASSERT_TRUE(app::AddTextNote(s.session, chart, job.Request, "KRM", XOf(last - 3), y, "top, maybe"));
+    ASSERT_TRUE(
+        app::AddTextNote(s.session, chart, job.Request, "KRM", XOf(last - 3), y, "top, maybe"));
     // Right of the last bar the note takes the last bar's date.
-    ASSERT_TRUE(app::AddTextNote(s.session, chart, job.Request, "KRM", chart.PlotRight + 50, y, "later"));
+    ASSERT_TRUE(
+        app::AddTextNote(s.session, chart, job.Request, "KRM", chart.PlotRight + 50, y, "later"));
     const std::string text = platform::ReadWholeFile(app::NotesPath(s.session, "KRM")).value_or("");
     const std::string d3(chart.ChartBars()[static_cast<std::size_t>(last - 3)].DateText());
     const std::string dl(chart.ChartBars()[static_cast<std::size_t>(last)].DateText());

@@ -40,8 +40,9 @@ TEST(ColourTable, BuiltInSchemeFillsTheRolesAndWritesTheFile) {
     TempRoot root;
     Palette p = Filled(0x123456);
     ASSERT_TRUE(ApplyColourScheme("Black", root.folder(), p).ok());
-    for (std::size_t i = 0; i < 16; ++i) EXPECT_EQ(p[i], kStandardColours[i]);
-    EXPECT_EQ(p[16], kStandardColours[3]);  // first built-in number
+    for (std::size_t i = 0; i < 16; ++i)
+        EXPECT_EQ(p[i], kStandardColours[i]);
+    EXPECT_EQ(p[16], kStandardColours[3]); // first built-in number
     EXPECT_EQ(p[17], kStandardColours[0]);
     EXPECT_EQ(p[18], kStandardColours[15]);
     EXPECT_EQ(p[44], kStandardColours[10]); // last built-in number

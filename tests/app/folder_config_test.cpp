@@ -48,8 +48,9 @@ TEST_F(FolderSetup, MissingPathsQuestion) {
     EXPECT_EQ(AskForMissingPaths(session), MissingPathsChoice::EnterPaths);
     EXPECT_EQ(session.folders.DataFolder, "/elsewhere/");
     EXPECT_EQ(dialogs.shown()[0].title, "No Paths selected");
-    EXPECT_EQ(dialogs.shown()[0].text.rfind("Directory Paths are missing and must be re-entered. ", 0),
-              0u);
+    EXPECT_EQ(
+        dialogs.shown()[0].text.rfind("Directory Paths are missing and must be re-entered. ", 0),
+        0u);
 
     dialogs.QueueAnswer(Answer::Cancel);
     EXPECT_EQ(AskForMissingPaths(session), MissingPathsChoice::Exit);

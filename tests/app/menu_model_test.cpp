@@ -58,7 +58,8 @@ TEST(MenuModel, ModalToolsHideTheTopsAndEndingKeepsThemHidden) {
 
 TEST(MenuModel, UnbuiltItemsAndEmptyMenusAreLeftOut) {
     auto tops = BuildMenuTree();
-    KeepAvailable(tops, [](const std::string& n) { return n == "mnuChartDisplay" || n == "mnuExit"; });
+    KeepAvailable(tops,
+                  [](const std::string& n) { return n == "mnuChartDisplay" || n == "mnuExit"; });
     ASSERT_EQ(tops.size(), 1u);
     EXPECT_EQ(tops[0].name, "mnuFile");
     ASSERT_NE(FindItem(tops, "mnuChartDisplay"), nullptr);

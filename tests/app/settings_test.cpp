@@ -21,8 +21,12 @@ struct IniCase : ::testing::Test {
 
 TEST_F(IniCase, ZoomOutsideFiftyToTwoHundredReadsAsOneHundred) {
     EXPECT_EQ(ReadZoom(ini), 100); // unset
-    for (auto [text, expected] : {std::pair{"49", 100}, {"50", 50}, {"200", 200}, {"201", 100},
-                                  {"150.5", 150}, {"junk", 100}}) {
+    for (auto [text, expected] : {std::pair{"49", 100},
+                                  {"50", 50},
+                                  {"200", 200},
+                                  {"201", 100},
+                                  {"150.5", 150},
+                                  {"junk", 100}}) {
         Set("ChartForms", "Zoom", text);
         EXPECT_EQ(ReadZoom(ini), expected) << text;
     }
@@ -37,8 +41,12 @@ TEST_F(IniCase, DownloadNumbersKeepTheirLimits) {
         Set("Download", "RefreshFreq", text);
         EXPECT_EQ(ReadDownloadSettings(ini).RefreshFreq, expected) << text;
     }
-    for (auto [text, expected] :
-         {std::pair{"1000", 1000}, {"10000", 10000}, {"10", 10}, {"5", 1}, {"100000", 1}, {"0", 1}}) {
+    for (auto [text, expected] : {std::pair{"1000", 1000},
+                                  {"10000", 10000},
+                                  {"10", 10},
+                                  {"5", 1},
+                                  {"100000", 1},
+                                  {"0", 1}}) {
         Set("Download", "Volume divisor", text);
         EXPECT_EQ(ReadDownloadSettings(ini).VolumeDivisor, expected) << text;
     }

@@ -23,7 +23,9 @@ struct StartUp : ::testing::Test {
     kori::platform::FixedClock clock{"20240305"};
     Session session{root.path(), {dialogs, progress, settings, clock}};
 
-    std::string Ini(const char* section, const char* key) { return session.ini().Read(section, key); }
+    std::string Ini(const char* section, const char* key) {
+        return session.ini().Read(section, key);
+    }
     void Set(const char* section, const char* key, const std::string& value) {
         ASSERT_TRUE(session.ini().Write(section, key, value));
     }
@@ -168,7 +170,8 @@ TEST_F(StartUp, PendingFilesMessageByDataService) {
     EXPECT_EQ(dialogs.shown().back().text, " There are some KORI/Zevot files to update into KORI");
     session.download.DataService = 5;
     EXPECT_TRUE(OfferPendingUpdate(session));
-    EXPECT_EQ(dialogs.shown().back().text, " There are some EIS downloaded files to update into KORI");
+    EXPECT_EQ(dialogs.shown().back().text,
+              " There are some EIS downloaded files to update into KORI");
 }
 
 TEST_F(StartUp, OnlyDotDFilesArePending) {

@@ -201,8 +201,8 @@ TEST(BuildChart, SplitLowerHalfShowsItsOwnSecurityAndPeriod) {
     ChartName lowerName = r.name;
     lowerName.Code = "RIO";
     const SplitLowerHalf lower{&lowerName, &lowerSource, 'W'};
-    ChartBuild b{r.request, r.defaults,   r.name,    r.palette, r.fonts, r.dialogs,
-                 r.streamPath, false, 1, nullptr, {}};
+    ChartBuild b{r.request,    r.defaults, r.name, r.palette, r.fonts, r.dialogs,
+                 r.streamPath, false,      1,      nullptr,   {}};
     b.Lower = &lower;
     ASSERT_TRUE(BuildChart(r.chart, b, r.source, r.surface).ok());
     EXPECT_EQ(r.source.LastLoad.ChartPeriod, 'A');

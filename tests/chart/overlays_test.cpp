@@ -135,7 +135,7 @@ TEST(Bands, BollingerPopulationDeviation) {
 }
 
 TEST(Parabolic, RisesTowardsTheBarsHighThenFlips) {
-    const std::vector<ParabolicBar> bars = {{10, 9},     {11, 10},  {12, 11},  {13, 12},
+    const std::vector<ParabolicBar> bars = {{10, 9},      {11, 10},   {12, 11},  {13, 12},
                                             {12.5, 11.5}, {9.2, 8.0}, {8.5, 7.5}};
     const auto pts = ComputeParabolic(bars);
     // Four new highs settle "U" at bar 3; the walk starts at the low bar 0 with stop 9.
@@ -170,8 +170,8 @@ TEST(Parabolic, DotsAndLastStopOnTheChart) {
     ChartRig r;
     r.request.AutoOsc = true;
     r.request.AutoOscCode = "PARA";
-    const std::vector<std::pair<float, float>> hl = {{50, 40}, {52, 42}, {54, 44}, {56, 46},
-                                                     {58, 48}};
+    const std::vector<std::pair<float, float>> hl = {
+        {50, 40}, {52, 42}, {54, 44}, {56, 46}, {58, 48}};
     int d = 1;
     for (auto [h, l] : hl)
         r.Add("2024030" + std::to_string(d++), l, h, l, h - 1);

@@ -11,7 +11,8 @@ namespace kori::test {
 
 inline platform::Palette PlayerPalette() {
     platform::Palette p{};
-    for (std::size_t i = 0; i < p.size(); ++i) p[i] = static_cast<platform::Colour>(1000 + i);
+    for (std::size_t i = 0; i < p.size(); ++i)
+        p[i] = static_cast<platform::Colour>(1000 + i);
     return p;
 }
 

@@ -31,17 +31,29 @@ TEST(ScreenPlayer, PlaysEveryLetterByTheScreenRules) {
                          "H,1,2,3,4,15\r\nL,1,2,3,4,16\r\nM,1,2,3,4,17\r\n"
                          "D,1,2,3,4,18\r\nE,1,2,3,4,19\r\nV,1,2,3,4,20\r\n"
                          "P,5,6,21\r\nK,5,6,22\r\n"));
-    EXPECT_EQ(rig.area.calls(),
-              (Strings{"Width 1", "Clear #1017",
-                       "Text 10.5,20.25 size 8.25 bold #255 [A  B]",
-                       "Text 5,6 size 12 #65280 [Title]", "Style solid",
-                       "Text 7,8 size 10 bold italic #16711680 [Em]",
-                       "Box 1,2,3,4 #11", "FilledBox 1,2,3,4 #12", "FilledBox 1,2,3,4 #13",
-                       "Line 1,2,3,4 #15", "Line 1,2,3,4 #16", "Line 1,2,3,4 #17",
-                       "Style dash", "Line 1,2,3,4 #18", "Style solid",
-                       "Style dash", "Line 1,2,3,4 #19", "Style solid",
-                       "Width 1", "Style dot", "Line 1,2,3,4 #20", "Style solid",
-                       "Point 5,6 #21"}));
+    EXPECT_EQ(rig.area.calls(), (Strings{"Width 1",
+                                         "Clear #1017",
+                                         "Text 10.5,20.25 size 8.25 bold #255 [A  B]",
+                                         "Text 5,6 size 12 #65280 [Title]",
+                                         "Style solid",
+                                         "Text 7,8 size 10 bold italic #16711680 [Em]",
+                                         "Box 1,2,3,4 #11",
+                                         "FilledBox 1,2,3,4 #12",
+                                         "FilledBox 1,2,3,4 #13",
+                                         "Line 1,2,3,4 #15",
+                                         "Line 1,2,3,4 #16",
+                                         "Line 1,2,3,4 #17",
+                                         "Style dash",
+                                         "Line 1,2,3,4 #18",
+                                         "Style solid",
+                                         "Style dash",
+                                         "Line 1,2,3,4 #19",
+                                         "Style solid",
+                                         "Width 1",
+                                         "Style dot",
+                                         "Line 1,2,3,4 #20",
+                                         "Style solid",
+                                         "Point 5,6 #21"}));
     EXPECT_EQ(rig.area.fonts, (Strings{"Font One", "Font Two", "Font One"}));
     // "Z" leaves bold off even though font 1 is bold; "S" put font 1 back.
     EXPECT_FALSE(rig.area.bold());

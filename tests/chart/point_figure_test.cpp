@@ -113,13 +113,14 @@ TEST(PointFigureChart, BoxDialogAnswers) {
         r.dialogs.QueueInput(std::string("0"));
         r.Add("20240301", 50, 51, 49, 50);
         ASSERT_TRUE(r.Build().ok());
-        EXPECT_EQ(r.dialogs.messages(), (std::vector<std::string>{"The box value must be a number."}));
+        EXPECT_EQ(r.dialogs.messages(),
+                  (std::vector<std::string>{"The box value must be a number."}));
         EXPECT_FLOAT_EQ(r.chart.ChartCeiling, 0.003f);
     }
     {
         // Blank ticks automatic; cancel keeps it too.
-        for (std::optional<std::string> answer : {std::optional<std::string>(""),
-                                                  std::optional<std::string>()}) {
+        for (std::optional<std::string> answer :
+             {std::optional<std::string>(""), std::optional<std::string>()}) {
             ChartRig r;
             PointFigureRig(r);
             r.dialogs.QueueInput(answer);

@@ -48,23 +48,52 @@ TEST(PaperPlayer, PlaysEveryLetterByThePaperRules) {
                         "D,1,2,3,4,18\r\nE,1,2,3,4,19\r\nV,1,2,3,4,20\r\n"
                         "P,5,6,21\r\nK,5,6,22\r\n"),
               PlayOutcome::Played);
-    EXPECT_EQ(rig.printer.calls(),
-              (Strings{"Orientation 2", "Origin -100,-200", "Style solid", "Width 1",
-                       "Text 42,81 size 8.25 bold #255 [A  B]",
-                       "Text 20,24 size 12 #65280 [Title]", "Style solid", "Width 1",
-                       "Text 28,32 size 10 bold italic #16711680 [Em]",
-                       "Width 1", "Box 4,8,12,16 #11",
-                       "FilledBox 4,8,12,16 #12",
-                       "FilledBox 4,8,12,16 #13", "Width 1",
-                       "Width 1", "FilledBox 4,8,12,16 #14", "Width 1",
-                       "Width 5", "Style solid", "Line 4,8,12,16 #15", "Width 1",
-                       "Width 1", "Style solid", "Line 4,8,12,16 #16",
-                       "Width 1", "Style solid", "Line 4,8,12,16 #17",
-                       "Width 1", "Style dash", "Line 4,8,12,16 #18", "Style solid",
-                       "Width 1", "Style dash", "Line 4,8,12,16 #19", "Style solid",
-                       "Width 1", "Style dot", "Line 4,8,12,16 #20", "Style solid",
-                       "Width 5", "Line 20,24,20,24 #21", "Width 1",
-                       "Width 3", "Line 20,24,20,24 #22", "Width 1", "EndDoc"}));
+    EXPECT_EQ(rig.printer.calls(), (Strings{"Orientation 2",
+                                            "Origin -100,-200",
+                                            "Style solid",
+                                            "Width 1",
+                                            "Text 42,81 size 8.25 bold #255 [A  B]",
+                                            "Text 20,24 size 12 #65280 [Title]",
+                                            "Style solid",
+                                            "Width 1",
+                                            "Text 28,32 size 10 bold italic #16711680 [Em]",
+                                            "Width 1",
+                                            "Box 4,8,12,16 #11",
+                                            "FilledBox 4,8,12,16 #12",
+                                            "FilledBox 4,8,12,16 #13",
+                                            "Width 1",
+                                            "Width 1",
+                                            "FilledBox 4,8,12,16 #14",
+                                            "Width 1",
+                                            "Width 5",
+                                            "Style solid",
+                                            "Line 4,8,12,16 #15",
+                                            "Width 1",
+                                            "Width 1",
+                                            "Style solid",
+                                            "Line 4,8,12,16 #16",
+                                            "Width 1",
+                                            "Style solid",
+                                            "Line 4,8,12,16 #17",
+                                            "Width 1",
+                                            "Style dash",
+                                            "Line 4,8,12,16 #18",
+                                            "Style solid",
+                                            "Width 1",
+                                            "Style dash",
+                                            "Line 4,8,12,16 #19",
+                                            "Style solid",
+                                            "Width 1",
+                                            "Style dot",
+                                            "Line 4,8,12,16 #20",
+                                            "Style solid",
+                                            "Width 5",
+                                            "Line 20,24,20,24 #21",
+                                            "Width 1",
+                                            "Width 3",
+                                            "Line 20,24,20,24 #22",
+                                            "Width 1",
+                                            "EndDoc"}));
     EXPECT_EQ(rig.status.texts, (Strings{"PRINTING - WAIT", "Ready"}));
 }
 
@@ -120,10 +149,10 @@ TEST(PaperPlayer, BoldOptionAndEmptyTexts) {
     rig.fonts.Bold1 = false;
     rig.settings.PrintBold = true;
     rig.Print("T,8,1,1,   ,5\r\nT,8,1,1,a,5\r\nZ,8,1,1,b,5\r\nT,8,1,1,c,5\r\n");
-    EXPECT_EQ(rig.printer.calls(),
-              (Strings{"Origin -100,-200", "Style solid", "Width 1",
-                       "Text 4,4 size 8 bold #5 [a]", "Text 4,4 size 8 bold italic #5 [b]",
-                       "Text 4,4 size 8 bold #5 [c]", "EndDoc"}));
+    EXPECT_EQ(
+        rig.printer.calls(),
+        (Strings{"Origin -100,-200", "Style solid", "Width 1", "Text 4,4 size 8 bold #5 [a]",
+                 "Text 4,4 size 8 bold italic #5 [b]", "Text 4,4 size 8 bold #5 [c]", "EndDoc"}));
     // Without the option, text after a "Z" prints plain even when font 1 is bold.
     PaperRig plain;
     plain.Print("Z,8,1,1,b,5\r\nT,8,1,1,c,5\r\n");
@@ -132,11 +161,9 @@ TEST(PaperPlayer, BoldOptionAndEmptyTexts) {
 
 TEST(PaperPlayer, FailurePrintsWhatIsThereAndAnEmptyStreamABlankPage) {
     PaperRig rig;
-    EXPECT_EQ(rig.Print("L,1,1,2,2,5\r\nL,1,2,3,4,5,6\r\nL,3,3,4,4,5\r\n"),
-              PlayOutcome::Malformed);
-    EXPECT_EQ(rig.printer.calls(), (Strings{"Origin -100,-200", "Style solid", "Width 1",
-                                            "Width 1", "Style solid", "Line 4,4,8,8 #5",
-                                            "EndDoc"}));
+    EXPECT_EQ(rig.Print("L,1,1,2,2,5\r\nL,1,2,3,4,5,6\r\nL,3,3,4,4,5\r\n"), PlayOutcome::Malformed);
+    EXPECT_EQ(rig.printer.calls(), (Strings{"Origin -100,-200", "Style solid", "Width 1", "Width 1",
+                                            "Style solid", "Line 4,4,8,8 #5", "EndDoc"}));
     PaperRig blank;
     EXPECT_EQ(blank.Print(""), PlayOutcome::NothingPlayed);
     EXPECT_EQ(blank.printer.calls().back(), "EndDoc");

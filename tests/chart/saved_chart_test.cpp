@@ -40,8 +40,7 @@ TEST(SavedChart, NameChecks) {
 
 TEST(SavedChart, SavingIsAByteCopyOfTheStream) {
     SaveRig rig;
-    EXPECT_EQ(SaveChartAs(rig.Target("BHP.Cht"), rig.stream, rig.dialogs),
-              SaveChartResult::Saved);
+    EXPECT_EQ(SaveChartAs(rig.Target("BHP.Cht"), rig.stream, rig.dialogs), SaveChartResult::Saved);
     EXPECT_EQ(rig.root.Read("BHP.Cht"), kStream);
     ASSERT_EQ(rig.dialogs.shown().size(), 1u);
     EXPECT_EQ(rig.dialogs.shown()[0].text, " CHART SAVED ");
@@ -61,8 +60,7 @@ TEST(SavedChart, AnExistingFileIsOnlyReplacedWhenTheUserSaysSo) {
     EXPECT_EQ(rig.dialogs.shown()[0].buttons, platform::Buttons::OkCancel);
 
     rig.dialogs.QueueAnswer(platform::Answer::Ok);
-    EXPECT_EQ(SaveChartAs(rig.Target("bhp.CHT"), rig.stream, rig.dialogs),
-              SaveChartResult::Saved);
+    EXPECT_EQ(SaveChartAs(rig.Target("bhp.CHT"), rig.stream, rig.dialogs), SaveChartResult::Saved);
     EXPECT_EQ(rig.root.Read("BHP.cht"), kStream);
 }
 

@@ -39,7 +39,8 @@ std::vector<Instruction> ReadAll(std::string text, StreamReader::Result& last) {
     auto reader = StreamReader::FromText(std::move(text));
     std::vector<Instruction> r;
     Instruction in;
-    while ((last = reader.Next(in)) == StreamReader::Result::Instruction) r.push_back(in);
+    while ((last = reader.Next(in)) == StreamReader::Result::Instruction)
+        r.push_back(in);
     return r;
 }
 

@@ -47,14 +47,14 @@ TEST(Swing, NormTurnsOnALowerHighAndLowAndWaitsOutAnOutsideBar) {
     bars.insert(bars.end(), {{53, 43}, {55, 41}, {54, 42}, {57, 45}});
     AddBars(r, bars);
     ASSERT_TRUE(r.Build().ok());
-    EXPECT_EQ(Legs(r), (std::vector<std::string>{
-                           "H, 5, 650, 5, 490, 20",
-                           // bar 4: lower high and lower low, down at once
-                           "H, 5, 490, 45, 490, 21", "H, 45, 490, 45, 620, 21",
-                           // bar 5 outside (state 5), bar 6 inside; bar 7 leaves it upwards:
-                           // the leg goes down to the outside bar's low first
-                           "H, 45, 620, 45, 640, 21", "H, 45, 640, 75, 640, 20",
-                           "H, 75, 640, 75, 480, 20"}));
+    EXPECT_EQ(Legs(r),
+              (std::vector<std::string>{"H, 5, 650, 5, 490, 20",
+                                        // bar 4: lower high and lower low, down at once
+                                        "H, 5, 490, 45, 490, 21", "H, 45, 490, 45, 620, 21",
+                                        // bar 5 outside (state 5), bar 6 inside; bar 7 leaves it
+                                        // upwards: the leg goes down to the outside bar's low first
+                                        "H, 45, 620, 45, 640, 21", "H, 45, 640, 75, 640, 20",
+                                        "H, 75, 640, 75, 480, 20"}));
     EXPECT_TRUE(HasRun(r.Lines(), {"T, 8, 5, 142,Daily Swing  -  Standard, 27"}));
 }
 
@@ -147,11 +147,18 @@ TEST(TargetLines, FirstTwoLinesOfTheCodeWithinThePlot) {
     ChartRig r;
     AddBars(r, {{50, 40}});
     const auto prices = ReadTargetPrices(file, "BHP");
-    const ChartBuild b{r.request, r.defaults,   r.name,      r.palette,       r.fonts,
-                       r.dialogs, r.streamPath, r.printBold, r.volumeDivisor, nullptr,
-                       [&](Chart& c, kori::platform::Surface& s) {
-                           DrawTargetLines(c, s, r.palette, prices);
-                       }};
+    const ChartBuild b{
+        r.request,
+        r.defaults,
+        r.name,
+        r.palette,
+        r.fonts,
+        r.dialogs,
+        r.streamPath,
+        r.printBold,
+        r.volumeDivisor,
+        nullptr,
+        [&](Chart& c, kori::platform::Surface& s) { DrawTargetLines(c, s, r.palette, prices); }};
     ASSERT_TRUE(BuildChart(r.chart, b, r.source, r.surface).ok());
     // 55.5 is y 495; 95 lies above the plot (y 100) and is left out.
     const auto lines = Starting(r.Lines(), "L, 5, ");

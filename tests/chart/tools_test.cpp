@@ -80,13 +80,13 @@ TEST(ChartTools, ATrendlineKeepsDatesAndPricesAndHoldsAFarEndJustPastThePlot) {
 TEST(ChartTools, ReplayShowsOnlyThisPeriodAndLinesStillInView) {
     Frame t;
     const std::vector<TrendRecord> recs = {
-        {0, 'A', "20261103", 10, "20261110", 20},  // drawn
-        {0, 'W', "20261103", 10, "20261110", 20},  // weekly: not on a daily chart
-        {0, 'A', "20261030", 10, "20261110", 20},  // left end scrolled off: not drawn at all
-        {0, 'A', "20261103", 10, "X309", 20},      // within 10 of the right edge: drawn
-        {0, 'A', "20261103", 10, "X311", 20},      // beyond: skipped
-        {0, 'A', "20261103", 0, "20261110", 20},   // no price: skipped
-        {0, 'A', "20261103", 10, "20261110", 50},  // far above the plot: skipped
+        {0, 'A', "20261103", 10, "20261110", 20}, // drawn
+        {0, 'W', "20261103", 10, "20261110", 20}, // weekly: not on a daily chart
+        {0, 'A', "20261030", 10, "20261110", 20}, // left end scrolled off: not drawn at all
+        {0, 'A', "20261103", 10, "X309", 20},     // within 10 of the right edge: drawn
+        {0, 'A', "20261103", 10, "X311", 20},     // beyond: skipped
+        {0, 'A', "20261103", 0, "20261110", 20},  // no price: skipped
+        {0, 'A', "20261103", 10, "20261110", 50}, // far above the plot: skipped
     };
     const auto ends = ReplayTrendlines(t.f, recs);
     ASSERT_EQ(ends.size(), 2u);

@@ -10,9 +10,9 @@
 #include "gui/windows/cht_sel.h"
 #include "gui/windows/chts.h"
 #include "gui/windows/main_window.h"
+#include "gui/windows/register_windows.h"
 #include "gui/windows/search.h"
 #include "gui/windows/settings_hub.h"
-#include "gui/windows/register_windows.h"
 #include "platform/files.h"
 #include "store/price_file.h"
 
@@ -136,7 +136,8 @@ TEST_F(Road, ATrendlineDrawnWithTheMouseComesBackOnItsPeriodOnly) {
     EXPECT_EQ(chts()->toolMode(), gui::kToolTrendline);
     const auto& c = chts()->chart();
     const int last = c.LastBar();
-    const int x1 = c.PlotLeft + (last - 60) * c.BarSpacing, x2 = c.PlotLeft + (last - 10) * c.BarSpacing;
+    const int x1 = c.PlotLeft + (last - 60) * c.BarSpacing,
+              x2 = c.PlotLeft + (last - 10) * c.BarSpacing;
     const int y1 = c.PriceToY(c.ChartBars()[static_cast<std::size_t>(last - 60)].Low);
     const int y2 = c.PriceToY(c.ChartBars()[static_cast<std::size_t>(last - 10)].Low);
     gui::ChartView* view = chts()->picture1();
@@ -213,7 +214,8 @@ TEST_F(Road, PrintToAPdfFileThenSaveAndShowTheChartAgain) {
     EXPECT_FALSE(chts()->SaveChartAs(s.session.folders.ChtSaveFolder + "BWG.txt"));
     EXPECT_EQ(s.dialogs.messages().back(), "File extension must be .cht");
     ASSERT_TRUE(chts()->SaveChartAs(saved));
-    EXPECT_EQ(platform::ReadWholeFile(saved), platform::ReadWholeFile(app::ChartStreamPath(s.session)));
+    EXPECT_EQ(platform::ReadWholeFile(saved),
+              platform::ReadWholeFile(app::ChartStreamPath(s.session)));
 
     const QImage live = chts()->picture1()->picture().copy();
     Key("fwd"); // another chart on show, then the saved one comes back without market data
@@ -365,7 +367,8 @@ TEST_F(Road, TextNotesAndAutomaticScroll) {
     const auto& c = chts()->chart();
     const std::string date(c.ChartBars()[40].DateText());
     s.dialogs.QueueInput(std::string("breakout"));
-    chts()->MousePress(c.PlotLeft + 40 * c.BarSpacing, c.PriceToY(c.ChartBars()[40].Close), Qt::LeftButton);
+    chts()->MousePress(c.PlotLeft + 40 * c.BarSpacing, c.PriceToY(c.ChartBars()[40].Close),
+                       Qt::LeftButton);
     const auto notes = platform::ReadWholeFile(app::NotesPath(s.session, "KRM")).value_or("");
     EXPECT_EQ(notes.rfind("T,8.25," + date + ",", 0), 0u) << notes;
     EXPECT_NE(notes.find(",breakout,"), std::string::npos);
@@ -410,19 +413,22 @@ TEST_F(Road, ARightDragInTheTrendlineToolMovesTheNearerEnd) {
     Key("tline");
     const auto& c = chts()->chart();
     const int last = c.LastBar();
-    const double xA = c.PlotLeft + (last - 80) * c.BarSpacing, xB = c.PlotLeft + (last - 20) * c.BarSpacing;
+    const double xA = c.PlotLeft + (last - 80) * c.BarSpacing,
+                 xB = c.PlotLeft + (last - 20) * c.BarSpacing;
     const double y = c.PriceToY(c.ChartBars()[static_cast<std::size_t>(last - 80)].Close);
     chts()->MousePress(xA, y, Qt::LeftButton);
     chts()->MouseRelease(xB, y, Qt::LeftButton);
     ASSERT_EQ(chts()->trendEnds().size(), 1u);
-    const std::string dateB = chart::TrendlineFile::ReadAll(app::TrendlinePath(s.session, "KRM"))[0].DateB;
+    const std::string dateB =
+        chart::TrendlineFile::ReadAll(app::TrendlinePath(s.session, "KRM"))[0].DateB;
     // Grab near the right end and drop it ten bars further right.
     chts()->MousePress(xB - 1, y, Qt::RightButton);
     chts()->MouseRelease(xB + 10 * chts()->chart().BarSpacing, y, Qt::RightButton);
     const auto records = chart::TrendlineFile::ReadAll(app::TrendlinePath(s.session, "KRM"));
     ASSERT_EQ(records.size(), 1u);
-    EXPECT_EQ(records[0].DateA,
-              std::string(chts()->chart().ChartBars()[static_cast<std::size_t>(last - 80)].DateText()));
+    EXPECT_EQ(
+        records[0].DateA,
+        std::string(chts()->chart().ChartBars()[static_cast<std::size_t>(last - 80)].DateText()));
     EXPECT_GT(records[0].DateB, dateB);
     ASSERT_EQ(chts()->trendEnds().size(), 1u);
     EXPECT_DOUBLE_EQ(chts()->trendEnds()[0].xB, xB + 10 * chts()->chart().BarSpacing);
@@ -431,7 +437,8 @@ TEST_F(Road, ARightDragInTheTrendlineToolMovesTheNearerEnd) {
 TEST_F(Road, SearchByNameStepsThroughTheMatchesUntilNoMoreMatches) {
     ASSERT_TRUE(main.Trigger("mnuChartDisplay"));
     std::vector<int> found;
-    gui::Search search(sel()->selection().walk().names(), 0, s.dialogs, [&](int pos) { found.push_back(pos); });
+    gui::Search search(sel()->selection().walk().names(), 0, s.dialogs,
+                       [&](int pos) { found.push_back(pos); });
     search.field()->setText(QStringLiteral("bank"));
     search.FindNext();
     search.FindNext();
@@ -439,7 +446,8 @@ TEST_F(Road, SearchByNameStepsThroughTheMatchesUntilNoMoreMatches) {
     EXPECT_EQ(sel()->selection().walk().RecordAt(found[0])->TrimmedCode(), "HBK");
     EXPECT_EQ(sel()->selection().walk().RecordAt(found[1])->TrimmedCode(), "IRB");
     s.dialogs.clear();
-    for (int i = 0; i < 10 && s.dialogs.messages().empty(); ++i) search.FindNext();
+    for (int i = 0; i < 10 && s.dialogs.messages().empty(); ++i)
+        search.FindNext();
     ASSERT_FALSE(s.dialogs.messages().empty());
     EXPECT_EQ(s.dialogs.messages().back(), "No more matches");
 }

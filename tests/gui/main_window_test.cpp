@@ -24,7 +24,8 @@ struct Fixture {
 
 QStringList MenuTitles(QMainWindow& w) {
     QStringList r;
-    for (QAction* a : w.menuBar()->actions()) r << a->text();
+    for (QAction* a : w.menuBar()->actions())
+        r << a->text();
     return r;
 }
 } // namespace

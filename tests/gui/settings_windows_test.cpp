@@ -420,7 +420,8 @@ TEST_F(SampleRoot, ScalesWriteTheNameRecordAndChart2NamesTheLowerChart) {
 
 TEST_F(SampleRoot, OscillatorSettingsFillDefaultsValidateAndStore) {
     // Periods never set read 0; the window offers the defaults for them.
-    for (const char* key : {"Md1W", "Md2W", "Md3W", "Md3"}) (void)session.ini().Write("OscDef", key, "0");
+    for (const char* key : {"Md1W", "Md2W", "Md3W", "Md3"})
+        (void)session.ini().Write("OscDef", key, "0");
     gui::OscFrm w(session, hub, "MACD", 'B', "W");
     EXPECT_EQ(w.windowTitle(), "MACD");
     ASSERT_EQ(w.fieldCount(), 3);

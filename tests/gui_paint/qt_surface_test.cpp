@@ -14,7 +14,9 @@ namespace {
 
 using platform::Rgb;
 
-QRgb At(const QImage& image, int x, int y) { return image.pixel(x, y) & 0xFFFFFF; }
+QRgb At(const QImage& image, int x, int y) {
+    return image.pixel(x, y) & 0xFFFFFF;
+}
 constexpr QRgb kRed = 0xFF0000, kGreen = 0x00FF00, kBlue = 0x0000FF, kBlack = 0;
 
 TEST(QtSurface, ShapesLandOnThePixelsTheyName) {
@@ -39,7 +41,8 @@ TEST(QtSurface, ShapesLandOnThePixelsTheyName) {
     EXPECT_EQ(At(img, 80, 30), kBlack); // an outline only
     EXPECT_EQ(At(img, 5, 50), kGreen);
     int on = 0;
-    for (int x = 0; x < 100; ++x) on += At(img, x, 57) == kRed;
+    for (int x = 0; x < 100; ++x)
+        on += At(img, x, 57) == kRed;
     EXPECT_GT(on, 40); // dashes of 5 with gaps of 3
     EXPECT_LT(on, 80);
 }

@@ -21,7 +21,7 @@ constexpr NumberCase kNumberCases[] = {
     {1.2345, "0.00#", "1.235"},
     {0, "0.00#", "0.00"},
     {-2.5, "0.00#", "-2.50"},
-    {1.005, "0.00", "1.01"},   // rounded on the decimal digits, not the binary value
+    {1.005, "0.00", "1.01"}, // rounded on the decimal digits, not the binary value
     {0.95, "0.0", "1.0"},
     {9.9999, "0.00", "10.00"}, // carry into a new integer digit
     {2.5, "0", "3"},           // halves go away from zero here, unlike CInt
@@ -32,7 +32,7 @@ constexpr NumberCase kNumberCases[] = {
     {0.5, "#####.00#", ".50"},
     {0.0567, ".00#", ".057"},
     {0.05, ".00#", ".05"},
-    {5.25, ".00", "5.25"},     // integer digits shown with no integer place
+    {5.25, ".00", "5.25"}, // integer digits shown with no integer place
     {0.456, "#.00", ".46"},
     {12.3, "#####0.00", "12.30"},
     {0.0049, "#####0.00", "0.00"},
@@ -56,7 +56,7 @@ constexpr NumberCase kNumberCases[] = {
     {3, "###0", "3"},
     {0, "#", ""},
     {12, "000", "012"},
-    {1234, "000", "1234"},     // more digits than places are all shown
+    {1234, "000", "1234"}, // more digits than places are all shown
     {7, "0000", "0007"},
     {12.34, "000.0", "012.3"},
     {12.25, "####0.0", "12.3"},

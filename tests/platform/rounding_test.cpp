@@ -53,9 +53,9 @@ TEST(Money, FourDecimalsWithTiesToEven) {
     EXPECT_FALSE(Money::FromDouble(1e15).has_value());
     EXPECT_FALSE(Money::FromDouble(std::numeric_limits<double>::infinity()).has_value());
 
-    const Money a = Money::FromRaw(15000); // 1.5
-    const Money b = Money::FromRaw(3);     // 0.0003
-    EXPECT_EQ(a.Times(b)->raw(), 4);       // 0.00045 -> 0.0004
+    const Money a = Money::FromRaw(15000);              // 1.5
+    const Money b = Money::FromRaw(3);                  // 0.0003
+    EXPECT_EQ(a.Times(b)->raw(), 4);                    // 0.00045 -> 0.0004
     EXPECT_EQ(Money::FromRaw(5000).Times(b)->raw(), 2); // 0.00015 -> 0.0002
     EXPECT_EQ((-a).Times(b)->raw(), -4);
     EXPECT_FALSE(Money::FromRaw(std::numeric_limits<std::int64_t>::max())

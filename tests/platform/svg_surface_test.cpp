@@ -39,7 +39,8 @@ TEST(SvgSurface, WritesShapesWithColoursWidthsAndStyles) {
     EXPECT_TRUE(Has(doc, "<rect x=\"10\" y=\"20\" width=\"30\" height=\"30\" fill=\"none\" "
                          "stroke=\"#0000ff\" stroke-width=\"1\"/>"));
     EXPECT_TRUE(Has(doc, "<rect x=\"5\" y=\"6\" width=\"3\" height=\"4\" fill=\"#ffff00\"/>"));
-    EXPECT_TRUE(Has(doc, "<rect x=\"98.5\" y=\"98.5\" width=\"3\" height=\"3\" fill=\"#0000ff\"/>"));
+    EXPECT_TRUE(
+        Has(doc, "<rect x=\"98.5\" y=\"98.5\" width=\"3\" height=\"3\" fill=\"#0000ff\"/>"));
 }
 
 TEST(SvgSurface, TextStandsWithItsTopLeftAtThePositionAndIsEscaped) {
@@ -49,14 +50,16 @@ TEST(SvgSurface, TextStandsWithItsTopLeftAtThePositionAndIsEscaped) {
     s.SetFontBold(true);
     s.SetForeColour(Rgb(255, 255, 255));
     s.SetTextPosition(10, 20);
-    s.PrintText("A  <b> & \xA3" "5");
+    s.PrintText("A  <b> & \xA3"
+                "5");
     s.SetFontBold(false);
     s.SetFontItalic(true);
     s.PrintText("next");
     const std::string doc = s.Document();
     EXPECT_TRUE(Has(doc, "<text x=\"10\" y=\"34.48\" font-family=\"Arial\" font-size=\"16\" "
                          "font-weight=\"bold\" fill=\"#ffffff\" xml:space=\"preserve\">"
-                         "A  &lt;b&gt; &amp; \xC2\xA3" "5</text>"));
+                         "A  &lt;b&gt; &amp; \xC2\xA3"
+                         "5</text>"));
     // The next print goes one line lower.
     EXPECT_TRUE(Has(doc, "<text x=\"10\" y=\"52.864\" font-family=\"Arial\" font-size=\"16\" "
                          "font-style=\"italic\""));

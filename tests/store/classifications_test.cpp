@@ -26,7 +26,8 @@ TEST(Classifications, GroupWalksTakeThreeCharacterClassesOnly) {
         r.IndustryClass = cls;
         return r;
     };
-    const std::vector<NameRecord> names = {rec("121"), rec("12 "), rec("131"), rec("125"), rec("   ")};
+    const std::vector<NameRecord> names = {rec("121"), rec("12 "), rec("131"), rec("125"),
+                                           rec("   ")};
     EXPECT_EQ(FindNextClassRecord(names, 0, "120", false), 1);
     EXPECT_EQ(FindNextClassRecord(names, 1, "120", false), 4) << "\"12\" is never in a group";
     EXPECT_EQ(FindNextClassRecord(names, 4, "120", false), 0);

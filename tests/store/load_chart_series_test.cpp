@@ -59,11 +59,11 @@ TEST(LoadChartSeries, DailyNoTradeCopiesThePreviousClose) {
 
 TEST(LoadChartSeries, WeeksRollByWeekdayAndAZeroCloseEndsOnTheLastGoodClose) {
     const std::vector<PriceRecord> recs = {
-        Day("20261102", 10, 12, 9, 11, 100),    // Mon
-        Day("20261103", 11, 13, 10, 12, 200),   // Tue
-        Day("20261104", 12, 12.5f, 11, 12, 300),// Wed
-        Day("20261109", 12, 14, 11.5f, 13, 400),// Mon: weekday fell, new week
-        Day("20261116", 13, 15, 12, 0, 0)};     // Mon again: no fall, same bar
+        Day("20261102", 10, 12, 9, 11, 100),     // Mon
+        Day("20261103", 11, 13, 10, 12, 200),    // Tue
+        Day("20261104", 12, 12.5f, 11, 12, 300), // Wed
+        Day("20261109", 12, 14, 11.5f, 13, 400), // Mon: weekday fell, new week
+        Day("20261116", 13, 15, 12, 0, 0)};      // Mon again: no fall, same bar
     const auto s = Load(recs, 'W');
     ASSERT_EQ(s.LastBar, 1);
     const auto& w1 = s.ChartBars[0];
@@ -88,7 +88,8 @@ TEST(LoadChartSeries, WeeksRollByWeekdayAndAZeroCloseEndsOnTheLastGoodClose) {
 
 TEST(LoadChartSeries, OneRecordGivesOneBarInEveryPeriod) {
     const std::vector<PriceRecord> recs = {Day("20261102", 10, 12, 9, 11, 100)};
-    for (char p : {'A', 'W', 'M'}) EXPECT_EQ(Load(recs, p).LastBar, 0) << p;
+    for (char p : {'A', 'W', 'M'})
+        EXPECT_EQ(Load(recs, p).LastBar, 0) << p;
 }
 
 TEST(LoadChartSeries, MonthsRollByKeyWithVolumesInHundreds) {

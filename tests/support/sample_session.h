@@ -27,8 +27,8 @@ struct SampleSession {
         dialogs.QueueAnswer(platform::Answer::No);  // white stays white
         app::InitialiseSession(session, "");
         app::SampleSummary summary;
-        const auto s = app::MakeSampleLibrary(session.folders.SystemFolder, session.folders.DataFolder,
-                                              settings, summary);
+        const auto s = app::MakeSampleLibrary(session.folders.SystemFolder,
+                                              session.folders.DataFolder, settings, summary);
         EXPECT_TRUE(s.ok()) << s.message();
         dialogs.clear();
     }

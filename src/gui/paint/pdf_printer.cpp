@@ -87,11 +87,21 @@ platform::Status PdfPrinter::EndDoc() {
     return platform::Status::Ok();
 }
 
-void PdfPrinter::Clear() { Page().Clear(); }
-void PdfPrinter::SetBackColour(platform::Colour c) { Page().SetBackColour(c); }
-void PdfPrinter::SetLineWidth(int width) { Page().SetLineWidth(width); }
-void PdfPrinter::SetLineStyle(platform::LineStyle style) { Page().SetLineStyle(style); }
-void PdfPrinter::SetForeColour(platform::Colour c) { Page().SetForeColour(c); }
+void PdfPrinter::Clear() {
+    Page().Clear();
+}
+void PdfPrinter::SetBackColour(platform::Colour c) {
+    Page().SetBackColour(c);
+}
+void PdfPrinter::SetLineWidth(int width) {
+    Page().SetLineWidth(width);
+}
+void PdfPrinter::SetLineStyle(platform::LineStyle style) {
+    Page().SetLineStyle(style);
+}
+void PdfPrinter::SetForeColour(platform::Colour c) {
+    Page().SetForeColour(c);
+}
 void PdfPrinter::Line(double x1, double y1, double x2, double y2, platform::Colour c) {
     Page().Line(x1, y1, x2, y2, c);
 }
@@ -101,14 +111,32 @@ void PdfPrinter::Box(double x1, double y1, double x2, double y2, platform::Colou
 void PdfPrinter::FilledBox(double x1, double y1, double x2, double y2, platform::Colour c) {
     Page().FilledBox(x1, y1, x2, y2, c);
 }
-void PdfPrinter::Point(double x, double y, platform::Colour c) { Page().Point(x, y, c); }
-void PdfPrinter::SetFontName(std::string_view name) { Page().SetFontName(name); }
-void PdfPrinter::SetFontSize(double points) { Page().SetFontSize(points); }
-void PdfPrinter::SetFontBold(bool bold) { Page().SetFontBold(bold); }
-void PdfPrinter::SetFontItalic(bool italic) { Page().SetFontItalic(italic); }
-void PdfPrinter::SetTextPosition(double x, double y) { Page().SetTextPosition(x, y); }
-void PdfPrinter::PrintText(std::string_view text) { Page().PrintText(text); }
-double PdfPrinter::TextWidth(std::string_view text) { return Page().TextWidth(text); }
-double PdfPrinter::TextHeight(std::string_view text) { return Page().TextHeight(text); }
+void PdfPrinter::Point(double x, double y, platform::Colour c) {
+    Page().Point(x, y, c);
+}
+void PdfPrinter::SetFontName(std::string_view name) {
+    Page().SetFontName(name);
+}
+void PdfPrinter::SetFontSize(double points) {
+    Page().SetFontSize(points);
+}
+void PdfPrinter::SetFontBold(bool bold) {
+    Page().SetFontBold(bold);
+}
+void PdfPrinter::SetFontItalic(bool italic) {
+    Page().SetFontItalic(italic);
+}
+void PdfPrinter::SetTextPosition(double x, double y) {
+    Page().SetTextPosition(x, y);
+}
+void PdfPrinter::PrintText(std::string_view text) {
+    Page().PrintText(text);
+}
+double PdfPrinter::TextWidth(std::string_view text) {
+    return Page().TextWidth(text);
+}
+double PdfPrinter::TextHeight(std::string_view text) {
+    return Page().TextHeight(text);
+}
 
 } // namespace kori::gui

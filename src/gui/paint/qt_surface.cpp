@@ -53,7 +53,9 @@ QPen QtSurface::Pen(platform::Colour c) const {
     return pen;
 }
 
-void QtSurface::Clear() { m_painter->fillRect(QRectF(0, 0, m_width, m_height), ToQColor(m_back)); }
+void QtSurface::Clear() {
+    m_painter->fillRect(QRectF(0, 0, m_width, m_height), ToQColor(m_back));
+}
 
 // A zero-length line is a dot as wide as the pen: the large dots of the paper.
 void QtSurface::Dot(double x, double y, platform::Colour c) {
@@ -95,7 +97,9 @@ void QtSurface::SetFontName(std::string_view name) {
     m_font.setFamily(FromStreamText(name));
 }
 
-void QtSurface::SetFontSize(double points) { m_font.setPointSizeF(std::max(points, 1.0)); }
+void QtSurface::SetFontSize(double points) {
+    m_font.setPointSizeF(std::max(points, 1.0));
+}
 
 void QtSurface::PrintText(std::string_view text) {
     const QFontMetricsF fm(m_font, m_painter->device());
@@ -142,8 +146,8 @@ platform::Status SavePng(const QImage& image, const std::filesystem::path& path)
     buffer.open(QIODevice::WriteOnly);
     if (!image.save(&buffer, "PNG"))
         return platform::Status::Error("Cannot make a picture for " + path.string());
-    return platform::WriteFileAtomic(path, std::string_view(bytes.constData(),
-                                                            static_cast<std::size_t>(bytes.size())));
+    return platform::WriteFileAtomic(
+        path, std::string_view(bytes.constData(), static_cast<std::size_t>(bytes.size())));
 }
 
 } // namespace kori::gui

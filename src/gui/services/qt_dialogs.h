@@ -11,8 +11,8 @@ public:
     explicit QtDialogs(QWidget* parent = nullptr) : m_parent(parent) {}
     void SetParent(QWidget* parent) { m_parent = parent; }
 
-    platform::Answer MsgBox(std::string_view text, std::string_view title, platform::Buttons buttons,
-                            platform::Icon icon) override;
+    platform::Answer MsgBox(std::string_view text, std::string_view title,
+                            platform::Buttons buttons, platform::Icon icon) override;
     std::optional<std::string> InputBox(std::string_view prompt, std::string_view title,
                                         std::string_view defaultText) override;
     void Beep() override;

@@ -9,8 +9,9 @@ QtPrinter::QtPrinter(QPrinter& printer) : m_printer(printer) {
     // The print scale is worked out from twips per printer dot; at 600 dots an inch a chart
     // fills the page as it does on the PDF printer, whatever resolution the dialog chose.
     m_printer.setResolution(600);
-    m_orientation = printer.pageLayout().orientation() == QPageLayout::Landscape ? platform::kLandscape
-                                                                                 : platform::kPortrait;
+    m_orientation = printer.pageLayout().orientation() == QPageLayout::Landscape
+                        ? platform::kLandscape
+                        : platform::kPortrait;
 }
 
 QtPrinter::~QtPrinter() {
@@ -23,12 +24,18 @@ void QtPrinter::SetOrientation(int orientation) {
                                                                      : QPageLayout::Portrait);
 }
 
-double QtPrinter::Width() const { return m_printer.pageLayout().paintRectPixels(m_printer.resolution()).width(); }
+double QtPrinter::Width() const {
+    return m_printer.pageLayout().paintRectPixels(m_printer.resolution()).width();
+}
 double QtPrinter::Height() const {
     return m_printer.pageLayout().paintRectPixels(m_printer.resolution()).height();
 }
-double QtPrinter::TwipsPerPixelX() const { return 1440.0 / m_printer.resolution(); }
-double QtPrinter::TwipsPerPixelY() const { return 1440.0 / m_printer.resolution(); }
+double QtPrinter::TwipsPerPixelX() const {
+    return 1440.0 / m_printer.resolution();
+}
+double QtPrinter::TwipsPerPixelY() const {
+    return 1440.0 / m_printer.resolution();
+}
 
 void QtPrinter::ApplyOrigin() {
     m_painter.resetTransform();

@@ -37,7 +37,9 @@ void QtProgress::SetValue(long long value) {
     Yield();
 }
 
-void QtProgress::Yield() { QCoreApplication::processEvents(); }
+void QtProgress::Yield() {
+    QCoreApplication::processEvents();
+}
 
 void QtProgress::Finish() {
     m_label->hide();

@@ -44,6 +44,8 @@ void ChartView::mouseReleaseEvent(QMouseEvent* e) {
     emit ChartMouseRelease(e->position().x(), e->position().y(), e->button());
 }
 
-void ChartView::resizeEvent(QResizeEvent*) { emit Resized(); }
+void ChartView::resizeEvent(QResizeEvent*) {
+    emit Resized();
+}
 
 } // namespace kori::gui

@@ -10,7 +10,8 @@ namespace kori::gui {
 QHBoxLayout* ButtonRow(std::initializer_list<QWidget*> buttons) {
     auto* row = new QHBoxLayout;
     row->addStretch();
-    for (QWidget* b : buttons) row->addWidget(b);
+    for (QWidget* b : buttons)
+        row->addWidget(b);
     return row;
 }
 

@@ -13,8 +13,8 @@
 #include <QApplication>
 #include <QMdiArea>
 #include <QMdiSubWindow>
-#include <QPageSetupDialog>
 #include <QPageLayout>
+#include <QPageSetupDialog>
 #include <QPrinter>
 
 namespace kori::gui {
@@ -23,7 +23,9 @@ ChartWindows::ChartWindows(MainWindow& main) : QObject(&main), m_main(main) {
     setObjectName(QStringLiteral("ChartWindows"));
     // The settings windows change what the chart on show is built from.
     SettingsHub& hub = Hub(m_main);
-    const auto reload = [this] { m_state.Defaults = chart::LoadChartDefaults(m_main.session().ini()); };
+    const auto reload = [this] {
+        m_state.Defaults = chart::LoadChartDefaults(m_main.session().ini());
+    };
     const auto rebuild = [this, reload] {
         reload();
         if (Chts* c = chts(); c && m_chartWindow->isVisible()) c->Rebuild();
@@ -91,12 +93,12 @@ void ChartWindows::OpenCharts() {
                     s->Load();
                 }
         });
-        connect(sel, &ChtSel::SetDefaultsRequested, this, [this] {
-            OpenChartDefaults(m_main, ChtDef::Caller::ChartSelection);
-        });
+        connect(sel, &ChtSel::SetDefaultsRequested, this,
+                [this] { OpenChartDefaults(m_main, ChtDef::Caller::ChartSelection); });
         // Placed from the main window's size, as the selection has always sat.
         const QRect area = m_main.mdiArea()->rect();
-        m_selWindow->move(static_cast<int>(0.006 * area.width()), static_cast<int>(0.077 * area.height()));
+        m_selWindow->move(static_cast<int>(0.006 * area.width()),
+                          static_cast<int>(0.077 * area.height()));
         sel->Load();
     } else if (ChtSel* s = chtSel()) {
         s->Activate();

@@ -17,8 +17,10 @@ CHTPage::CHTPage(app::Session& session, QWidget* parent)
     setObjectName(QStringLiteral("CHTPage"));
     setWindowTitle(QStringLiteral("Page Setup"));
     auto* form = new QFormLayout(this);
-    form->addRow(new QLabel(QStringLiteral("Printer origin in printer units; 0 centres the chart."), this));
-    for (QSpinBox* s : {m_left, m_top}) s->setRange(-100000, 100000);
+    form->addRow(
+        new QLabel(QStringLiteral("Printer origin in printer units; 0 centres the chart."), this));
+    for (QSpinBox* s : {m_left, m_top})
+        s->setRange(-100000, 100000);
     m_left->setObjectName(QStringLiteral("txtLeft"));
     m_top->setObjectName(QStringLiteral("txtTop"));
     m_left->setValue(session.page.PPLft);
@@ -26,7 +28,8 @@ CHTPage::CHTPage(app::Session& session, QWidget* parent)
     m_orient->setObjectName(QStringLiteral("cboOrient"));
     m_orient->addItems({QStringLiteral("Printer default"), QStringLiteral("Portrait"),
                         QStringLiteral("Landscape")});
-    m_orient->setCurrentIndex(session.page.Orient == 1 || session.page.Orient == 2 ? session.page.Orient : 0);
+    m_orient->setCurrentIndex(
+        session.page.Orient == 1 || session.page.Orient == 2 ? session.page.Orient : 0);
     form->addRow(QStringLiteral("Left"), m_left);
     form->addRow(QStringLiteral("Top"), m_top);
     form->addRow(QStringLiteral("Orientation"), m_orient);

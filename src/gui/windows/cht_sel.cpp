@@ -26,7 +26,9 @@
 namespace kori::gui {
 
 namespace {
-QString Q(const std::string& s) { return QString::fromStdString(s); }
+QString Q(const std::string& s) {
+    return QString::fromStdString(s);
+}
 QColor ToQColor(platform::Colour c) {
     return QColor(static_cast<int>(c & 0xFF), static_cast<int>((c >> 8) & 0xFF),
                   static_cast<int>((c >> 16) & 0xFF));
@@ -97,16 +99,20 @@ ChtSel::ChtSel(app::Session& session, app::ChartState& state, QWidget* parent)
     auto* cg = new QGridLayout(chart);
     m_style = new QComboBox(chart);
     m_style->setObjectName(QStringLiteral("Combo1"));
-    for (const char* c : app::kStyleCaptions) m_style->addItem(QString::fromLatin1(c));
+    for (const char* c : app::kStyleCaptions)
+        m_style->addItem(QString::fromLatin1(c));
     m_osc = new QComboBox(chart);
     m_osc->setObjectName(QStringLiteral("Combo2"));
-    for (const auto& row : app::OscChoices()) m_osc->addItem(QString::fromLatin1(row.Caption));
+    for (const auto& row : app::OscChoices())
+        m_osc->addItem(QString::fromLatin1(row.Caption));
     m_bands = new QComboBox(chart);
     m_bands->setObjectName(QStringLiteral("Combo3"));
-    for (const char* c : app::kBandCaptions) m_bands->addItem(QString::fromLatin1(c));
+    for (const char* c : app::kBandCaptions)
+        m_bands->addItem(QString::fromLatin1(c));
     m_period = new QComboBox(chart);
     m_period->setObjectName(QStringLiteral("Combo4"));
-    for (int i = 0; i < 3; ++i) m_period->addItem(QString::fromLatin1(app::kPeriodCaptions[static_cast<std::size_t>(i)]));
+    for (int i = 0; i < 3; ++i)
+        m_period->addItem(QString::fromLatin1(app::kPeriodCaptions[static_cast<std::size_t>(i)]));
     m_spacingCaption = new QLabel(chart);
     m_spacing = new QLineEdit(chart);
     m_spacing->setObjectName(QStringLiteral("txtSpacing"));
@@ -167,7 +173,8 @@ ChtSel::ChtSel(app::Session& session, app::ChartState& state, QWidget* parent)
     m_folder->setObjectName(QStringLiteral("cmdFolder"));
     m_defaults = new QPushButton(QStringLiteral("Set Defaults"), this);
     m_defaults->setObjectName(QStringLiteral("cmdDefaults"));
-    for (QPushButton* b : {show, list, m_folder, m_defaults, close}) buttons->addWidget(b);
+    for (QPushButton* b : {show, list, m_folder, m_defaults, close})
+        buttons->addWidget(b);
     outer->addLayout(buttons);
     m_folder->hide();
     m_defaults->hide();
@@ -240,8 +247,12 @@ void ChtSel::Activate() {
     Refresh();
 }
 
-void ChtSel::SetFolderButton(bool shown) { m_folder->setVisible(shown); }
-void ChtSel::SetDefaultsButton(bool shown) { m_defaults->setVisible(shown); }
+void ChtSel::SetFolderButton(bool shown) {
+    m_folder->setVisible(shown);
+}
+void ChtSel::SetDefaultsButton(bool shown) {
+    m_defaults->setVisible(shown);
+}
 
 void ChtSel::Refresh() {
     m_updating = true;
@@ -267,8 +278,10 @@ void ChtSel::Refresh() {
     m_av1->setChecked(f.AvOne);
     m_av2->setChecked(f.AvTwo);
     const QColor on = ToQColor(m_session.palette[20]);
-    m_av1->setStyleSheet(f.AvOne ? QStringLiteral("color: %1").arg(on.name()) : QStringLiteral("color: black"));
-    m_av2->setStyleSheet(f.AvTwo ? QStringLiteral("color: %1").arg(on.name()) : QStringLiteral("color: black"));
+    m_av1->setStyleSheet(f.AvOne ? QStringLiteral("color: %1").arg(on.name())
+                                 : QStringLiteral("color: black"));
+    m_av2->setStyleSheet(f.AvTwo ? QStringLiteral("color: %1").arg(on.name())
+                                 : QStringLiteral("color: black"));
     for (QWidget* w : std::initializer_list<QWidget*>{m_osc, m_bands, m_av1, m_av2})
         w->setEnabled(f.ChoosersEnabled);
     m_period->setEnabled(f.ChoosersEnabled);
@@ -301,12 +314,13 @@ void ChtSel::NameEntered() {
                                    "Search by Name");
         return;
     }
-    Search s(m_sel.walk().names(), m_sel.form().Position, m_session.dialogs(),
-             [this](int pos) {
-                 m_sel.ScrollTo(pos);
-                 Refresh();
-             },
-             this);
+    Search s(
+        m_sel.walk().names(), m_sel.form().Position, m_session.dialogs(),
+        [this](int pos) {
+            m_sel.ScrollTo(pos);
+            Refresh();
+        },
+        this);
     s.field()->setText(m_name->text());
     s.exec();
 }
@@ -339,7 +353,8 @@ void ChtSel::BandsChosen(int index) {
     }
     const auto rec = m_sel.Current();
     for (;;) {
-        const auto values = ChtBands::Ask(this, rec ? rec->PercentBandUp : 0, rec ? rec->PercentBandDown : 0);
+        const auto values =
+            ChtBands::Ask(this, rec ? rec->PercentBandUp : 0, rec ? rec->PercentBandDown : 0);
         if (m_sel.ChooseBands(index, values)) break;
     }
     Refresh();

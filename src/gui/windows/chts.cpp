@@ -10,8 +10,8 @@
 #include "gui/paint/qt_surface.h"
 #include "gui/services/qt_printer.h"
 #include "gui/widgets/chart_view.h"
-#include "osc/osc_identifiers.h"
 #include "gui/windows/cht_page.h"
+#include "osc/osc_identifiers.h"
 #include "platform/date_text.h"
 #include "platform/files.h"
 #include "platform/text.h"
@@ -24,8 +24,8 @@
 #include <QDialog>
 #include <QFileDialog>
 #include <QLabel>
-#include <QMenu>
 #include <QMdiSubWindow>
+#include <QMenu>
 #include <QMenuBar>
 #include <QPageLayout>
 #include <QPainter>
@@ -44,7 +44,9 @@
 namespace kori::gui {
 
 namespace {
-QString Q(const std::string& s) { return QString::fromStdString(s); }
+QString Q(const std::string& s) {
+    return QString::fromStdString(s);
+}
 constexpr int kPanes = 5;
 constexpr int kOscPanelHeight = 170;
 
@@ -64,10 +66,12 @@ std::string ShortDate(const std::string& yyyymmdd) {
 
 Chts::Chts(app::Session& session, app::ChartState& state, QWidget* parent)
     : QWidget(parent), m_session(session), m_state(state), m_walk(session),
-      m_chart(std::make_unique<chart::Chart>()), m_toolbar(new QToolBar(this)), m_toolbar2(new QToolBar(this)),
-      m_oscBox(new QComboBox(this)), m_picture1(new ChartView(this)), m_picture2(new ChartView(this)),
+      m_chart(std::make_unique<chart::Chart>()), m_toolbar(new QToolBar(this)),
+      m_toolbar2(new QToolBar(this)), m_oscBox(new QComboBox(this)),
+      m_picture1(new ChartView(this)), m_picture2(new ChartView(this)),
       m_picture4(new ChartView(this)), m_koriScroll(new QScrollBar(Qt::Horizontal, this)),
-      m_status(new QStatusBar(this)), m_autoTimer(new QTimer(this)), m_resizeTimer(new QTimer(this)) {
+      m_status(new QStatusBar(this)), m_autoTimer(new QTimer(this)),
+      m_resizeTimer(new QTimer(this)) {
     setObjectName(QStringLiteral("Chts"));
     setWindowTitle(QStringLiteral("Chart"));
     auto* layout = new QVBoxLayout(this);
@@ -76,8 +80,10 @@ Chts::Chts(app::Session& session, app::ChartState& state, QWidget* parent)
 
     auto* menus = new QMenuBar(this);
     QMenu* file = menus->addMenu(QStringLiteral("&Chart"));
-    file->addAction(QStringLiteral("&Print"), this, &Chts::Print)->setObjectName(QStringLiteral("cmPrintChart"));
-    file->addAction(QStringLiteral("Page Set&up"), this, &Chts::PageSetup)->setObjectName(QStringLiteral("cmPageSetup"));
+    file->addAction(QStringLiteral("&Print"), this, &Chts::Print)
+        ->setObjectName(QStringLiteral("cmPrintChart"));
+    file->addAction(QStringLiteral("Page Set&up"), this, &Chts::PageSetup)
+        ->setObjectName(QStringLiteral("cmPageSetup"));
     file->addSeparator();
     file->addAction(QStringLiteral("Save Chart As ..."), this, &Chts::SaveChartDialog)
         ->setObjectName(QStringLiteral("cmSaveChart"));
@@ -93,11 +99,14 @@ Chts::Chts(app::Session& session, app::ChartState& state, QWidget* parent)
             close();
     });
     QMenu* tools = menus->addMenu(QStringLiteral("&Tools"));
-    tools->addAction(QStringLiteral("Remove all trendlines for ..."), this, &Chts::RemoveAllTrendlines)
+    tools
+        ->addAction(QStringLiteral("Remove all trendlines for ..."), this,
+                    &Chts::RemoveAllTrendlines)
         ->setObjectName(QStringLiteral("cmRemoveTrendlines"));
     m_timeLinesCaption = tools->addAction(QStringLiteral("Fib Time Lines - Trading Days"));
     m_timeLinesCaption->setObjectName(QStringLiteral("cmFibTimeKind"));
-    connect(m_timeLinesCaption, &QAction::triggered, this, [this] { SetCalendarTimeLines(!m_calendarLines); });
+    connect(m_timeLinesCaption, &QAction::triggered, this,
+            [this] { SetCalendarTimeLines(!m_calendarLines); });
     QMenu* overlays = menus->addMenu(QStringLiteral("&Overlays"));
     QAction* mma = overlays->addAction(QStringLiteral("&Multiple Moving Averages"));
     mma->setObjectName(QStringLiteral("cmMMA"));
@@ -164,7 +173,9 @@ Chts::Chts(app::Session& session, app::ChartState& state, QWidget* parent)
     });
 }
 
-Chts::~Chts() { LeaveChart(); }
+Chts::~Chts() {
+    LeaveChart();
+}
 
 void Chts::BuildToolBar() {
     m_toolbar->setObjectName(QStringLiteral("Toolbar1"));
@@ -172,7 +183,8 @@ void Chts::BuildToolBar() {
     m_toolbar2->setObjectName(QStringLiteral("Toolbar2"));
     m_toolbar2->setToolButtonStyle(Qt::ToolButtonTextOnly);
     QToolBar* bar = m_toolbar;
-    auto add = [this, &bar](const char* key, const char* text, const char* tip, auto fn, bool checkable = false) {
+    auto add = [this, &bar](const char* key, const char* text, const char* tip, auto fn,
+                            bool checkable = false) {
         QAction* a = bar->addAction(QString::fromLatin1(text));
         a->setObjectName(QString::fromLatin1(key));
         a->setToolTip(QString::fromLatin1(tip));
@@ -213,7 +225,8 @@ void Chts::BuildToolBar() {
         Rebuild();
     });
     m_oscBox->setObjectName(QStringLiteral("cboOsc"));
-    for (const auto& row : app::OscChoices()) m_oscBox->addItem(QString::fromLatin1(row.Caption));
+    for (const auto& row : app::OscChoices())
+        m_oscBox->addItem(QString::fromLatin1(row.Caption));
     m_oscBox->setToolTip(QStringLiteral("Oscillator"));
     connect(m_oscBox, &QComboBox::activated, this, [this](int i) {
         const auto& row = app::OscChoices()[static_cast<std::size_t>(i)];
@@ -224,17 +237,32 @@ void Chts::BuildToolBar() {
     });
     m_toolbar->addWidget(m_oscBox);
     bar = m_toolbar2;
-    add("tline", "Trend", "Draw trendlines", [this] { SetTool(m_tool == kToolTrendline ? kToolNone : kToolTrendline); }, true);
-    add("terase", "Erase", "Delete a trendline", [this] { SetTool(kToolErase); }, true);
-    add("fib", "Fib", "Fibonacci retracement", [this] { SetTool(m_tool == kToolFibRetracement ? kToolNone : kToolFibRetracement); }, true);
-    add("sFibLines", "FibT", "Fibonacci time lines", [this] { SetTool(m_tool == kToolFibTimeLines ? kToolNone : kToolFibTimeLines); }, true);
-    add("sGannAng", "Gann", "Gann angles", [this] { SetTool(m_tool == kToolGann ? kToolNone : kToolGann); }, true);
-    add("text", "Text", "Text notes", [this] { SetTool(m_tool == kToolText ? kToolNone : kToolText); }, true);
-    add("sDayCount", "Days", "Count the days between two bars",
+    add(
+        "tline", "Trend", "Draw trendlines",
+        [this] { SetTool(m_tool == kToolTrendline ? kToolNone : kToolTrendline); }, true);
+    add(
+        "terase", "Erase", "Delete a trendline", [this] { SetTool(kToolErase); }, true);
+    add(
+        "fib", "Fib", "Fibonacci retracement",
+        [this] { SetTool(m_tool == kToolFibRetracement ? kToolNone : kToolFibRetracement); }, true);
+    add(
+        "sFibLines", "FibT", "Fibonacci time lines",
+        [this] { SetTool(m_tool == kToolFibTimeLines ? kToolNone : kToolFibTimeLines); }, true);
+    add(
+        "sGannAng", "Gann", "Gann angles",
+        [this] { SetTool(m_tool == kToolGann ? kToolNone : kToolGann); }, true);
+    add(
+        "text", "Text", "Text notes",
+        [this] { SetTool(m_tool == kToolText ? kToolNone : kToolText); }, true);
+    add(
+        "sDayCount", "Days", "Count the days between two bars",
         [this] { SetTool(m_tool == kToolDayCount ? kToolNone : kToolDayCount); }, true);
-    add("sZoom", "Zoom", "Zoom", [this] { SetTool(m_tool == kToolZoom ? kToolNone : kToolZoom); }, true);
+    add(
+        "sZoom", "Zoom", "Zoom", [this] { SetTool(m_tool == kToolZoom ? kToolNone : kToolZoom); },
+        true);
     m_toolbar2->addSeparator();
-    add("scroll", "Scroll", "Scroll through the history", [this] { ShowScrollBar(m_koriScroll->isHidden()); });
+    add("scroll", "Scroll", "Scroll through the history",
+        [this] { ShowScrollBar(m_koriScroll->isHidden()); });
     add("auto", "Auto", "Automatic scroll through the list", [this] {
         if (m_autoTimer->isActive())
             StopAutoScroll();
@@ -251,7 +279,9 @@ QAction* Chts::ToolKey(const char* key) const {
     return nullptr;
 }
 
-std::string Chts::Code() const { return platform::Trim(m_name.Code); }
+std::string Chts::Code() const {
+    return platform::Trim(m_name.Code);
+}
 
 QSize Chts::AreaSize() const {
     QSize s = m_picture1->size();
@@ -266,7 +296,8 @@ void Chts::SetPanes(const std::vector<std::string>& texts) {
 
 std::vector<std::string> Chts::StatusPanes() const {
     std::vector<std::string> out;
-    for (QLabel* p : m_panes) out.push_back(p->text().toStdString());
+    for (QLabel* p : m_panes)
+        out.push_back(p->text().toStdString());
     return out;
 }
 
@@ -283,15 +314,17 @@ bool Chts::NextChart(int delta) {
         return false;
     }
     const bool classWalk = (m_state.ClassWalk || m_state.GicsWalk) && m_state.Request.ListMode == 1;
-    const auto r = classWalk ? app::StepClassChart(m_walk, m_state.Request, delta,
-                                                   m_state.GicsWalk ? m_state.GicsCode : m_state.ClassCode,
-                                                   m_state.GicsWalk, m_session.dialogs())
-                             : app::StepChart(m_walk, m_state.Request, delta);
+    const auto r =
+        classWalk ? app::StepClassChart(m_walk, m_state.Request, delta,
+                                        m_state.GicsWalk ? m_state.GicsCode : m_state.ClassCode,
+                                        m_state.GicsWalk, m_session.dialogs())
+                  : app::StepChart(m_walk, m_state.Request, delta);
     if (!r) return false;
     m_name = *r;
     m_haveName = true;
     m_state.Split.AfterNextChart(delta);
-    if (delta != 0) m_state.Request.ByFinishDate = m_state.Request.ByFinishDate && !m_koriScroll->isVisible();
+    if (delta != 0)
+        m_state.Request.ByFinishDate = m_state.Request.ByFinishDate && !m_koriScroll->isVisible();
     return Rebuild();
 }
 
@@ -403,8 +436,11 @@ void Chts::DrawLegend() {
         const char* text;
         int entry;
         int y;
-    } rows[] = {{" Reversal", 29, 1}, {" Key Reversal", 30, 10}, {" Hook Reversal", 31, 20},
-                {" Open-Close Rev.", 32, 30}, {" Pivot Point", 33, 40}};
+    } rows[] = {{" Reversal", 29, 1},
+                {" Key Reversal", 30, 10},
+                {" Hook Reversal", 31, 20},
+                {" Open-Close Rev.", 32, 30},
+                {" Pivot Point", 33, 40}};
     legend.SetFontSize(7);
     for (const auto& r : rows) {
         const auto colour = m_session.palette[static_cast<std::size_t>(r.entry)];
@@ -437,7 +473,8 @@ void Chts::SetPeriod(char period) {
 void Chts::StepEnd(char unit, int direction) {
     if (!m_haveName || m_chart->LastBar() < 0) return;
     auto& req = m_state.Request;
-    const std::string shown(m_chart->ChartBars()[static_cast<std::size_t>(m_chart->LastBar())].DateText());
+    const std::string shown(
+        m_chart->ChartBars()[static_cast<std::size_t>(m_chart->LastBar())].DateText());
     const std::string next = chart::AddCalendarPeriods(shown, unit, direction);
     const int count = app::PriceRecordCount(m_session, Code());
     const std::string latest = app::PriceRecordDate(m_session, Code(), count);
@@ -458,21 +495,24 @@ void Chts::SetTool(int mode) {
         emit ChartSelectionRequested();
         return;
     }
-    if (mode == kToolZoom && m_state.Request.ChartStyle != 'B' && m_state.Request.ChartStyle != 'C') {
+    if (mode == kToolZoom && m_state.Request.ChartStyle != 'B' &&
+        m_state.Request.ChartStyle != 'C') {
         m_session.dialogs().MsgBox("Zoom only available on Bar & Candlestick charts", "Zoom");
         mode = kToolNone;
     }
     if (mode == kToolErase)
-        m_session.dialogs().MsgBox("To delete a trendline, click that trendline with your RIGHT mouse button",
-                                   "Trendlines");
+        m_session.dialogs().MsgBox(
+            "To delete a trendline, click that trendline with your RIGHT mouse button",
+            "Trendlines");
     m_tool = mode;
     m_clickStage = 0;
     const struct {
         const char* key;
         int mode;
-    } keys[] = {{"tline", kToolTrendline}, {"terase", kToolErase}, {"fib", kToolFibRetracement},
-                {"sFibLines", kToolFibTimeLines}, {"sGannAng", kToolGann}, {"text", kToolText},
-                {"sZoom", kToolZoom}, {"sDayCount", kToolDayCount}};
+    } keys[] = {{"tline", kToolTrendline},    {"terase", kToolErase},
+                {"fib", kToolFibRetracement}, {"sFibLines", kToolFibTimeLines},
+                {"sGannAng", kToolGann},      {"text", kToolText},
+                {"sZoom", kToolZoom},         {"sDayCount", kToolDayCount}};
     for (const auto& k : keys)
         if (QAction* a = ToolKey(k.key)) a->setChecked(m_tool == k.mode);
     if (m_tool == kToolFibRetracement) SetPanes({});
@@ -553,18 +593,22 @@ void Chts::MousePress(double x, double y, Qt::MouseButton button) {
         const auto levels = chart::FibonacciLevels(m_fibStart, price);
         const double rise = price - m_fibStart;
         if (levels.empty()) {
-            SetPanes({"Start  " + app::ReadoutPrice(m_fibStart), "End   " + app::ReadoutPrice(price),
+            SetPanes({"Start  " + app::ReadoutPrice(m_fibStart),
+                      "End   " + app::ReadoutPrice(price),
                       "Rise   " + platform::Trim(chart::FormatNumber(rise, "#####.00#"))});
             SetTool(kToolNone);
             return;
         }
-        std::vector<std::string> panes = {"End   " + app::ReadoutPrice(price),
-                                          "Rise   " + platform::Trim(chart::FormatNumber(rise, "#####.00#"))};
-        for (const auto& l : levels) panes.push_back(l.StatusText + app::ReadoutPrice(l.Price));
+        std::vector<std::string> panes = {
+            "End   " + app::ReadoutPrice(price),
+            "Rise   " + platform::Trim(chart::FormatNumber(rise, "#####.00#"))};
+        for (const auto& l : levels)
+            panes.push_back(l.StatusText + app::ReadoutPrice(l.Price));
         SetPanes(panes);
         const auto lines = chart::FibonacciLines(frame, x, levels);
         PaintOnPicture([&](platform::Surface& s) {
-            for (const auto& seg : lines) app::RecordChartLine(m_session, s, seg);
+            for (const auto& seg : lines)
+                app::RecordChartLine(m_session, s, seg);
         });
         return;
     }
@@ -576,21 +620,23 @@ void Chts::MousePress(double x, double y, Qt::MouseButton button) {
             for (double lx : xs)
                 app::RecordChartLine(m_session, s,
                                      {lx, static_cast<double>(m_chart->PlotTop), lx,
-                                      static_cast<double>(m_chart->PlotBottom), kFibTimeLineEntry, 'D'});
+                                      static_cast<double>(m_chart->PlotBottom), kFibTimeLineEntry,
+                                      'D'});
         });
         return;
     }
     case kToolGann: {
         const auto fan = chart::GannFan(frame, x, y, button == Qt::LeftButton);
         PaintOnPicture([&](platform::Surface& s) {
-            for (const auto& seg : fan) app::RecordChartLine(m_session, s, seg);
+            for (const auto& seg : fan)
+                app::RecordChartLine(m_session, s, seg);
         });
         return;
     }
     case kToolText: {
         if (m_chart->YToPrice(y) <= 0) return;
-        const auto text = m_session.dialogs().InputBox("Text - Enter text required - Press ENTER to Save",
-                                                       "Text");
+        const auto text = m_session.dialogs().InputBox(
+            "Text - Enter text required - Press ENTER to Save", "Text");
         if (!text || platform::Trim(*text).empty()) return;
         if (app::AddTextNote(m_session, *m_chart, req, code, x, y, *text)) Rebuild();
         return;
@@ -603,9 +649,10 @@ void Chts::MousePress(double x, double y, Qt::MouseButton button) {
         if (m_clickStage == 0) {
             m_countFromX = x;
             m_clickStage = 1;
-            SetPanes({"From  " + ShortDate(std::string(
-                                     m_chart->ChartBars()[static_cast<std::size_t>(app::BarUnder(*m_chart, x))]
-                                         .DateText()))});
+            SetPanes({"From  " +
+                      ShortDate(std::string(
+                          m_chart->ChartBars()[static_cast<std::size_t>(app::BarUnder(*m_chart, x))]
+                              .DateText()))});
             return;
         }
         m_clickStage = 0;
@@ -623,7 +670,8 @@ void Chts::MouseRelease(double x, double y, Qt::MouseButton button) {
     if (m_moving >= 0 && button == Qt::RightButton) {
         const int record = m_trendEnds[static_cast<std::size_t>(m_moving)].RecordNumber;
         m_moving = -1;
-        if (app::MoveTrendline(m_session, *m_chart, req, Code(), record, m_fixedX, m_fixedY, x, y)) {
+        if (app::MoveTrendline(m_session, *m_chart, req, Code(), record, m_fixedX, m_fixedY, x,
+                               y)) {
             m_trendChanged = true;
             Rebuild();
         }
@@ -654,8 +702,8 @@ void Chts::Zoom(double x, double y) {
     zoom->setWindowTitle(QStringLiteral("Zoom"));
     zoom->setAttribute(Qt::WA_DeleteOnClose);
     auto* label = new QLabel(zoom);
-    label->setPixmap(QPixmap::fromImage(image.copy(part).scaled(part.size() * 3, Qt::KeepAspectRatio,
-                                                                 Qt::FastTransformation)));
+    label->setPixmap(QPixmap::fromImage(
+        image.copy(part).scaled(part.size() * 3, Qt::KeepAspectRatio, Qt::FastTransformation)));
     auto* l = new QVBoxLayout(zoom);
     l->addWidget(label);
     zoom->show();
@@ -683,8 +731,8 @@ bool Chts::PrintTo(QPrinter& printer) {
     const QImage& shown = m_picture1->picture();
     chart::PaperJob job{paper, m_session.palette, m_session.fonts,
                         static_cast<double>(shown.width()), static_cast<double>(shown.height())};
-    const std::filesystem::path source = m_showingSaved ? std::filesystem::path(m_savedPath)
-                                                        : app::ChartStreamPath(m_session);
+    const std::filesystem::path source =
+        m_showingSaved ? std::filesystem::path(m_savedPath) : app::ChartStreamPath(m_session);
     const auto outcome = chart::PrintChart(source, job, *m_print);
     QApplication::restoreOverrideCursor();
     m_panes[0]->setText(before);
@@ -724,8 +772,8 @@ void Chts::SaveChartDialog() {
     platform::CreateFolder(m_session.folders.ChtSaveFolder);
     const std::string proposed = chart::ProposedChartName(m_session.folders.ChtSaveFolder, Code());
     const QString chosen = QFileDialog::getSaveFileName(
-        this, QStringLiteral("Save Chart As ..."), Q(proposed), QStringLiteral("Saved charts (*.cht)"),
-        nullptr, QFileDialog::DontConfirmOverwrite);
+        this, QStringLiteral("Save Chart As ..."), Q(proposed),
+        QStringLiteral("Saved charts (*.cht)"), nullptr, QFileDialog::DontConfirmOverwrite);
     SaveChartAs(chosen.isEmpty() ? std::string(chart::kNameCancel) : chosen.toStdString());
 }
 

@@ -55,9 +55,10 @@ public:
     // draws the panel into Picture2 (`panel` is the panel's own area) and may add to the price
     // chart (`price`, still open), as the classic MACD lines do. It answers whether the panel
     // is wanted; when not (RMO on a weekly chart), the price chart is built again on its own.
-    using OverlayHook = std::function<void(chart::Chart&, const chart::ChartRequest&, platform::Surface&)>;
-    using OscillatorPainter = std::function<bool(chart::Chart&, const app::ChartJob&,
-                                                 platform::Surface& price, platform::Surface& panel)>;
+    using OverlayHook =
+        std::function<void(chart::Chart&, const chart::ChartRequest&, platform::Surface&)>;
+    using OscillatorPainter = std::function<bool(
+        chart::Chart&, const app::ChartJob&, platform::Surface& price, platform::Surface& panel)>;
     void SetOverlayHook(OverlayHook hook) { m_overlayHook = std::move(hook); }
     void SetOscillatorPainter(OscillatorPainter painter) { m_oscPainter = std::move(painter); }
 
@@ -153,7 +154,7 @@ private:
     bool m_leftDown = false;
     double m_fibStart = 0;
     double m_countFromX = 0;
-    int m_moving = -1;          // index in m_trendEnds of a line being moved
+    int m_moving = -1; // index in m_trendEnds of a line being moved
     double m_fixedX = 0, m_fixedY = 0;
     bool m_calendarLines = false;
     bool m_showingSaved = false;

@@ -19,7 +19,9 @@
 namespace kori::gui {
 
 namespace {
-QString Q(const std::string& s) { return QString::fromStdString(s); }
+QString Q(const std::string& s) {
+    return QString::fromStdString(s);
+}
 } // namespace
 
 MainWindow::MainWindow(app::Session& session, QWidget* parent)
@@ -86,7 +88,8 @@ void MainWindow::RebuildMenus() {
     // so that nothing finds them by name in the meantime.
     for (QAction* a : menuBar()->actions()) {
         if (QMenu* m = a->menu()) {
-            for (QObject* o : m->findChildren<QObject*>()) o->setObjectName(QString());
+            for (QObject* o : m->findChildren<QObject*>())
+                o->setObjectName(QString());
             m->setObjectName(QString());
             m->deleteLater();
         }
@@ -140,7 +143,9 @@ void MainWindow::SetModalToolRunning(bool running) {
     RebuildMenus();
 }
 
-void MainWindow::ULForms() { m_mdi->closeAllSubWindows(); }
+void MainWindow::ULForms() {
+    m_mdi->closeAllSubWindows();
+}
 
 void MainWindow::closeEvent(QCloseEvent* e) {
     // Unloading saves the main window's size (in twips, as the settings hold it).
@@ -157,10 +162,11 @@ void MainWindow::closeEvent(QCloseEvent* e) {
 }
 
 void MainWindow::ShowAbout() {
-    QMessageBox::about(this, QStringLiteral("About KORI"),
-                       QStringLiteral("KORI Charting 8\n\nEnd-of-day share-market charting.\n\n"
-                                      "System folder: %1\nData folder: %2")
-                           .arg(Q(m_session.folders.SystemFolder), Q(m_session.folders.DataFolder)));
+    QMessageBox::about(
+        this, QStringLiteral("About KORI"),
+        QStringLiteral("KORI Charting 8\n\nEnd-of-day share-market charting.\n\n"
+                       "System folder: %1\nData folder: %2")
+            .arg(Q(m_session.folders.SystemFolder), Q(m_session.folders.DataFolder)));
 }
 
 } // namespace kori::gui

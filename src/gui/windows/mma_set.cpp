@@ -3,9 +3,9 @@
 #include "app/window_rules.h"
 
 #include <QFormLayout>
-#include <QLineEdit>
 #include <QGroupBox>
 #include <QHBoxLayout>
+#include <QLineEdit>
 #include <QPushButton>
 
 namespace kori::gui {

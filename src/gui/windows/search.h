@@ -20,8 +20,8 @@ namespace kori::gui {
 class Search : public QDialog {
     Q_OBJECT
 public:
-    Search(const std::vector<store::NameRecord>& names, int fromPosition, platform::Dialogs& dialogs,
-           std::function<void(int)> found, QWidget* parent = nullptr);
+    Search(const std::vector<store::NameRecord>& names, int fromPosition,
+           platform::Dialogs& dialogs, std::function<void(int)> found, QWidget* parent = nullptr);
     QLineEdit* field() const { return m_field; }
     // "Find Next": shows the next match, or "No more matches" when the walk ends.
     void FindNext();

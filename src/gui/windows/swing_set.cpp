@@ -3,8 +3,8 @@
 #include "app/window_rules.h"
 
 #include <QFormLayout>
-#include <QLineEdit>
 #include <QGroupBox>
+#include <QLineEdit>
 #include <QRadioButton>
 #include <QVBoxLayout>
 
