@@ -4,6 +4,7 @@
 #include "platform/files.h"
 #include "platform/text.h"
 #include "store/classifications.h"
+#include "store/name_file.h"
 #include "store/name_record.h"
 
 #include <algorithm>
@@ -131,7 +132,10 @@ bool ChartSelection::Load() {
     m_form.Spacing = r.BarSpacing;
     ShowAverages();
     if (r.ListMode >= 12) r.ListMode = 1;
-    m_walk.Open(r);
+    // A name file that exists but cannot be used says why (a missing one is the empty library).
+    if (!m_walk.Open(r) &&
+        platform::FileExists(store::NameFile::PathIn(m_session.folders.DataFolder)))
+        m_session.dialogs().MsgBox(m_walk.status().message(), "Chart Selection");
     m_form.ListCaption = m_walk.Caption();
     m_state.SettingsLoaded = true;
     m_form.Count = m_walk.Count();

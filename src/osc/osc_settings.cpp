@@ -155,6 +155,7 @@ OscDef ReadOscSettings(const platform::IniFile& ini) {
 }
 
 bool WriteOscSettings(platform::IniFile& ini, const OscDef& def) {
+    platform::IniFile::Batch once(ini); // one write of the file for the whole save
     bool ok = true;
     auto put = [&](std::string_view key, std::string_view value) {
         ok = ini.Write(kOscDefSection, key, value) && ok;
@@ -175,7 +176,7 @@ bool WriteOscSettings(platform::IniFile& ini, const OscDef& def) {
     put("LCalTp", def.LCalTp);
     put("VCalTp", def.VCalTp);
     put("CutVols", def.CutVols);
-    return ok;
+    return once.Commit() && ok;
 }
 
 void FillOscDefaults(OscDef& def, std::string_view oscName, bool weekly) {
