@@ -3,8 +3,8 @@
 #include "chart/draw_date_axis.h"
 #include "chart/draw_frame.h"
 #include "chart/draw_price_chart.h"
-#include "chart/number_format.h"
 #include "chart/scale.h"
+#include "platform/number_format.h"
 #include "platform/text.h"
 
 #include <algorithm>
@@ -138,9 +138,11 @@ std::optional<float> PFRangeProblem(const std::vector<float>& closes, float boxV
 }
 
 std::string PFLabel(float value, std::int16_t recordType) {
-    if (value > 0 && value < 0.1f) return FormatNumber(value, ".00#");
-    if (recordType == 4) return FormatNumber(value, "####.00");
-    return FormatNumber(value, "######");
+    if (value > 0 && value < 0.1f)
+        return platform::FormatSingle(value, ".00#", platform::ZeroSign::Dropped);
+    if (recordType == 4)
+        return platform::FormatSingle(value, "####.00", platform::ZeroSign::Dropped);
+    return platform::FormatSingle(value, "######", platform::ZeroSign::Dropped);
 }
 
 namespace {
