@@ -142,7 +142,7 @@ void ApplyOptions(const ChartOptions& o, app::ChartJob& job) {
     r.AvTwoPeriod = r.ChartPeriod == 'A' ? job.Defaults.MAPeriod2Daily : job.Defaults.MAPeriod2Long;
 }
 
-void PrintNumbers(const chart::Chart& c) {
+void PrintNumbers(std::ostream& to, const chart::Chart& c) {
     json out = {{"first_record", c.FirstRecord},
                 {"last_record", c.LastRecord},
                 {"last_bar", c.LastBar()},
@@ -156,7 +156,7 @@ void PrintNumbers(const chart::Chart& c) {
                 {"grid_count", c.GridCount},
                 {"max_high", FloatJson(c.MaxHigh)},
                 {"min_low", FloatJson(c.MinLow)}};
-    std::cout << out.dump() << "\n";
+    to << out.dump() << "\n";
 }
 
 void CopyStream(const app::Session& session, const std::string& to) {
@@ -224,7 +224,7 @@ void Run(CliContext& ctx, const ChartOptions& o) {
             throw CliError{"Cannot print the chart to " + o.pdf};
     }
     if (!o.stream.empty()) CopyStream(session, o.stream);
-    if (o.json) PrintNumbers(c);
+    if (o.json) PrintNumbers(ctx.out, c);
 }
 
 } // namespace
@@ -278,7 +278,7 @@ void AddChartCommand(CLI::App& app, CliContext& ctx) {
     cmd->callback([&ctx, o] { Run(ctx, *o); });
 }
 
-void AddScaleCommand(CLI::App& app, CliContext&) {
+void AddScaleCommand(CLI::App& app, CliContext& ctx) {
     struct ScaleOptions {
         float high = 0, low = 0;
         bool json = false;
@@ -289,19 +289,19 @@ void AddScaleCommand(CLI::App& app, CliContext&) {
     cmd->add_option("--high", o->high, "Highest price")->required();
     cmd->add_option("--low", o->low, "Lowest price")->required();
     cmd->add_flag("--json", o->json, "JSON output");
-    cmd->callback([o] {
+    cmd->callback([&ctx, o] {
         const chart::ChartScale s = chart::AutoScale(o->high, o->low);
         if (o->json) {
             json out = {{"chart_base", FloatJson(s.ChartBase)},
                         {"chart_ceiling", FloatJson(s.ChartCeiling)},
                         {"grid_step", FloatJson(s.GridStep)},
                         {"grid_count", s.GridCount}};
-            std::cout << out.dump() << "\n";
+            ctx.out << out.dump() << "\n";
             return;
         }
-        std::cout << "Base " << platform::FloatText(s.ChartBase) << "  ceiling "
-                  << platform::FloatText(s.ChartCeiling) << "  grid step "
-                  << platform::FloatText(s.GridStep) << " (" << s.GridCount << " lines)\n";
+        ctx.out << "Base " << platform::FloatText(s.ChartBase) << "  ceiling "
+                << platform::FloatText(s.ChartCeiling) << "  grid step "
+                << platform::FloatText(s.GridStep) << " (" << s.GridCount << " lines)\n";
     });
 }
 

@@ -173,7 +173,7 @@ void RunIndicator(CliContext& ctx, const IndicatorOptions& o) {
         }
         out += '\n';
     }
-    std::cout << out;
+    ctx.out << out;
 }
 
 } // namespace
