@@ -10,6 +10,7 @@
 #include "platform/sub_surface.h"
 #include "platform/text.h"
 #include "store/load_chart_series.h"
+#include "store/name_file.h"
 #include "store/price_file.h"
 
 #include <CLI/CLI.hpp>
@@ -119,9 +120,11 @@ void RunIndicator(CliContext& ctx, const IndicatorOptions& o) {
     if (!o.csv) throw CliError{"kori indicator writes CSV only: add --csv"};
     const std::string name = CheckedOscName(o.name);
     auto& session = ctx.OpenSession();
-    const auto found = app::FindSecurity(session, o.code);
+    platform::Status why;
+    const auto found = store::FindCode(session.folders.DataFolder, o.code, why);
+    if (!why) throw CliError{why.message()};
     if (!found) throw CliError{"No File For That Name: " + platform::Trim(o.code)};
-    const store::NameRecord& rec = found->second;
+    const store::NameRecord& rec = found->Record;
 
     osc::OscDef def = osc::ReadOscSettings(session.ini());
     ApplyOscSets(def, o.sets);
@@ -180,7 +183,7 @@ void RunIndicator(CliContext& ctx, const IndicatorOptions& o) {
         }
         out += '\n';
     }
-    std::cout << out;
+    ctx.out << out;
 }
 
 } // namespace
