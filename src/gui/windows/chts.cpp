@@ -335,9 +335,7 @@ void Chts::SetSwing(bool on) {
         const app::SwingSettings settings = app::ReadSwingSettings(m_session.ini());
         r.SwingMethod = settings.SwingMethod;
         r.SwingValue = settings.SwingValue;
-        r.SwingPanel = r.SwingMethod == "NORM"         ? chart::SidePanel::None
-                       : r.SwingMethod == "XPointAuto" ? chart::SidePanel::XPointAuto
-                                                       : chart::SidePanel::Other;
+        r.SwingPanel = chart::SwingSidePanel(r.SwingMethod);
     } else {
         r.SwingPanel = chart::SidePanel::None;
     }
