@@ -8,6 +8,7 @@
 #include "osc/osc_panel.h"
 #include "platform/printer.h"
 #include "platform/sub_surface.h"
+#include "store/name_file.h"
 #include "support/sample_session.h"
 
 #include <gtest/gtest.h>
@@ -23,9 +24,10 @@ struct PrintedChart : ::testing::Test {
 
     app::ChartJob Job(std::string_view code, char style) {
         app::ChartJob job;
-        const auto found = app::FindSecurity(s.session, code);
+        platform::Status why;
+        const auto found = store::FindCode(s.session.folders.DataFolder, code, why);
         EXPECT_TRUE(found);
-        if (found) job.Name = found->second;
+        if (found) job.Name = found->Record;
         job.Defaults = chart::LoadChartDefaults(s.session.ini());
         job.Request.ChartStyle = style;
         job.Request.ChartPeriod = 'A';
