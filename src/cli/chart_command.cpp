@@ -13,6 +13,7 @@
 #include "platform/files.h"
 #include "platform/svg_surface.h"
 #include "platform/text.h"
+#include "store/name_file.h"
 
 #include <CLI/CLI.hpp>
 #include <nlohmann/json.hpp>
@@ -102,10 +103,13 @@ void ApplySplit(const app::Session& session, const std::string& text, const Char
                                                           : platform::Upper(text.substr(colon + 1));
     if (period != "A" && period != "W" && period != "M")
         throw CliError{"--split wants CODE or CODE:PERIOD with the period A, W or M"};
-    const auto found = code.empty() ? std::nullopt : app::FindSecurity(session, code);
+    platform::Status why;
+    const auto found =
+        code.empty() ? std::nullopt : store::FindCode(session.folders.DataFolder, code, why);
+    if (!why) throw CliError{why.message()};
     if (!found) throw CliError{"No record on file for that code: " + code};
     if (!o.osc.osc.empty()) throw CliError{"--split draws no oscillator panel: leave out --osc"};
-    split.Choose({found->second, period[0]}, true);
+    split.Choose({found->Record, period[0]}, true);
     if (!split.Applies(job.Request)) throw CliError{"A point-and-figure chart is never split"};
     job.Lower = split.Lower();
 }
@@ -197,13 +201,15 @@ void CopyStream(const app::Session& session, const std::string& to) {
 
 void Run(CliContext& ctx, const ChartOptions& o) {
     auto& session = ctx.OpenSession();
-    const auto found = app::FindSecurity(session, o.code);
+    platform::Status why;
+    const auto found = store::FindCode(session.folders.DataFolder, o.code, why);
+    if (!why) throw CliError{why.message()};
     if (!found) throw CliError{"No File For That Name: " + platform::Trim(o.code)};
     const auto [w, h] = ParseArea(o.size);
     const PrivateStream stream(session);
 
     app::ChartJob job;
-    job.Name = found->second;
+    job.Name = found->Record;
     job.Defaults = chart::LoadChartDefaults(session.ini());
     chart::LoadChartRequestSettings(session.ini(), job.Request);
     ApplyOptions(o, job);

@@ -6,6 +6,7 @@
 #include "app/window_rules.h"
 #include "chart/number_format.h"
 #include "chart/saved_chart.h"
+#include "chart/screen_player.h"
 #include "chart/swing.h"
 #include "gui/paint/qt_surface.h"
 #include "gui/services/qt_printer.h"
@@ -779,15 +780,21 @@ void Chts::SaveChartDialog() {
 
 bool Chts::DisplaySavedChart(const std::string& chosen) {
     if (chosen.empty()) return false;
+    // The stream is played whole: what lies below the price area (an oscillator panel) goes to
+    // Picture2, as it did when the chart was built.
     const QSize size = AreaSize();
-    ImageSurface area(size.width(), size.height());
+    const chart::StreamReach reach =
+        chart::MeasureStream(platform::ResolvePath(platform::NormalisePath(chosen)));
+    const int panel = reach.Bottom > size.height() ? kOscPanelHeight : 0;
+    ImageSurface area(size.width(), size.height() + panel);
     const bool shown = chart::DisplaySavedChart(chosen, area, m_session.palette, m_session.fonts,
                                                 m_session.dialogs());
     const QImage& picture = area.Finish();
     if (!shown) return false;
     LeaveChart();
-    m_picture1->SetPicture(picture);
-    m_picture2->hide();
+    m_picture1->SetPicture(picture.copy(0, 0, size.width(), size.height()));
+    if (panel > 0) m_picture2->SetPicture(picture.copy(0, size.height(), size.width(), panel));
+    m_picture2->setVisible(panel > 0);
     m_showingSaved = true;
     m_splitShown = false;
     m_savedPath = chosen;
