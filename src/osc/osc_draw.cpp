@@ -938,11 +938,11 @@ OscOutcome ShowOscillator(chart::Chart& chart, std::string_view oscName, char ch
         else if (name == "OBV")
             OscOBV(chart, in, panel, false);
     } catch (const std::bad_alloc&) {
-        chart.Stream.Close();
+        (void)chart.Stream.Close();
         ShowOscFailure(in.Dialogs, 480, "");
         return OscOutcome::Failed;
     } catch (const std::exception& e) {
-        chart.Stream.Close();
+        (void)chart.Stream.Close();
         ShowOscFailure(in.Dialogs, 5, e.what());
         return OscOutcome::Failed;
     }
