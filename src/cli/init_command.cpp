@@ -97,7 +97,7 @@ void AddInitCommand(CLI::App& app, CliContext& ctx) {
         if (!fresh) {
             // Folders that are missing are made; the files there stay as they are.
             (void)BuildRoot(ctx.OpenSession(false), false);
-            std::cout << "Install root ready at " << root.string() << "\n";
+            ctx.out << "Install root ready at " << root.string() << "\n";
             return;
         }
         // A new root is built whole beside its place and moved in by one rename, so a failure
@@ -128,7 +128,7 @@ void AddInitCommand(CLI::App& app, CliContext& ctx) {
             fs::remove_all(staging, ec);
             throw;
         }
-        std::cout << "Install root ready at " << root.string() << "\n" << report;
+        ctx.out << "Install root ready at " << root.string() << "\n" << report;
     });
 }
 

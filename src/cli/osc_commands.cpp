@@ -42,6 +42,9 @@ std::string CheckedOscName(const std::string& text) {
 void ApplyOscSets(osc::OscDef& def, const std::vector<std::string>& sets) {
     for (const std::string& set : sets) {
         const auto eq = set.find('=');
+        if (eq != std::string::npos && osc::FindOscPeriodKeyByName(set.substr(0, eq)) != nullptr &&
+            platform::Val(set.substr(eq + 1)) < 0)
+            throw CliError{"--set " + set + ": an oscillator period cannot be negative"};
         if (eq == std::string::npos || !app::SetOscKey(def, set.substr(0, eq), set.substr(eq + 1)))
             throw CliError{"--set wants KEY=VALUE with a key of section OscDef, such as RsiP=9: " +
                            set};
@@ -80,6 +83,8 @@ platform::Status BuildChartWithPanel(app::Session& session, app::ChartJob& job, 
         panel.Settings = def;
     }
     const osc::OscOutcome outcome = app::DrawSecurityOscillator(session, job, c, panel, panelArea);
+    if (outcome == osc::OscOutcome::NotValid)
+        return platform::Status::Error(name + " Oscillator values not valid");
     if (outcome == osc::OscOutcome::NotSet)
         std::cerr << "kori: the period of " << name
                   << " is 0 in section OscDef of Kori.ini: no panel drawn\n";
@@ -123,6 +128,8 @@ void RunIndicator(CliContext& ctx, const IndicatorOptions& o) {
 
     osc::OscDef def = osc::ReadOscSettings(session.ini());
     ApplyOscSets(def, o.sets);
+    if (const auto problem = osc::NegativePeriodProblem(def, name, o.period))
+        throw CliError{problem->text};
 
     const auto path = store::PriceFile::PathFor(session.folders.DataFolder, rec.Code);
     store::PriceFile pf(path);
@@ -173,7 +180,7 @@ void RunIndicator(CliContext& ctx, const IndicatorOptions& o) {
         }
         out += '\n';
     }
-    std::cout << out;
+    ctx.out << out;
 }
 
 } // namespace

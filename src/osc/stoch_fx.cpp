@@ -1,4 +1,7 @@
 #include "osc/stoch_fx.h"
+#include "store/name_record.h"
+
+#include <algorithm>
 
 namespace kori::osc {
 
@@ -9,23 +12,29 @@ struct Extremes {
 };
 
 // Each bar's candidate for the window's high and low: the high and low of a bar that has
-// them, else a non-zero close; a zero is never taken. A bar with no candidate stands as the
-// starting value (0 for the high, 100000 for the low), which can never win.
+// them, else a non-zero close; a zero is never taken. The window's high starts at 0 and its low
+// at 100000, and those starting values take part: a window of negative totals keeps a high of 0.
 Extremes WindowExtremes(const store::ChartSeries& s, int n, int width, std::int16_t recordType) {
     std::vector<float> hiC(static_cast<std::size_t>(n), 0.0f);
     std::vector<float> loC(static_cast<std::size_t>(n), 100000.0f);
     for (std::size_t j = 0; j < hiC.size(); ++j) {
         const store::ChartBar& b = s.ChartBars[j];
-        if (b.High != 0 && recordType > 3)
+        const bool closeOnly = store::IsCloseOnly(recordType);
+        if (b.High != 0 && !closeOnly)
             hiC[j] = b.High;
         else if (b.Close != 0)
             hiC[j] = b.Close;
-        if (b.Low != 0 && recordType > 3)
+        if (b.Low != 0 && !closeOnly)
             loC[j] = b.Low;
         else if (b.Close != 0)
             loC[j] = b.Close;
     }
-    return {WindowMax(hiC, width), WindowMin(loC, width)};
+    Extremes ex{WindowMax(hiC, width), WindowMin(loC, width)};
+    for (float& h : ex.hi)
+        h = std::max(h, 0.0f);
+    for (float& l : ex.lo)
+        l = std::min(l, 100000.0f);
+    return ex;
 }
 
 std::int32_t Percent(float part, float whole) {
@@ -66,8 +75,8 @@ StochResult ComputeStochFX(const store::ChartSeries& series, std::int16_t period
         if (!slowStochastic) continue;
         ringSum += dpct;
         if (i - periodD >= first) ringSum -= *r.d[static_cast<std::size_t>(i - periodD)];
-        if (i >= periodK + periodD)
-            r.slowd[u] = RoundToInt32(static_cast<double>(ringSum) / periodD);
+        // Every bar after K has its second smoothing; only the drawing waits for a full ring.
+        r.slowd[u] = RoundToInt32(static_cast<double>(ringSum) / periodD);
     }
     return r;
 }

@@ -310,6 +310,37 @@ TEST_F(Road, AChosenOscillatorDrawsItsPanelUnderTheChartAndTheParabolicNone) {
     EXPECT_FALSE(chts()->picture2()->isVisible());
 }
 
+TEST_F(Road, ASavedChartShowsItsOscillatorPanelAgain) {
+    TypeCode("krm");
+    auto& req = charts()->state().Request;
+    req.AutoOsc = true;
+    req.AutoOscCode = "RSI";
+    Key("ref");
+    ASSERT_TRUE(chts()->picture2()->isVisible());
+    const QImage livePanel = chts()->picture2()->picture().copy();
+    const std::string saved = s.session.folders.ChtSaveFolder + "KRMRSI.cht";
+    ASSERT_TRUE(chts()->SaveChartAs(saved));
+
+    req.AutoOsc = false;
+    Key("fwd");
+    ASSERT_FALSE(chts()->picture2()->isVisible());
+    ASSERT_TRUE(chts()->DisplaySavedChart(saved));
+    ASSERT_TRUE(chts()->picture2()->isVisible()) << "the panel of the saved stream is dropped";
+    // The played panel is the live one but for what only the builder draws (blanks of titles).
+    const QImage played = chts()->picture2()->picture().convertToFormat(livePanel.format());
+    ASSERT_EQ(played.size(), livePanel.size());
+    long same = 0, drawn = 0;
+    const QRgb back = livePanel.pixel(livePanel.width() - 1, livePanel.height() - 1);
+    for (int y = 0; y < played.height(); ++y)
+        for (int x = 0; x < played.width(); ++x) {
+            same += played.pixel(x, y) == livePanel.pixel(x, y);
+            drawn += played.pixel(x, y) != back;
+        }
+    const long all = static_cast<long>(played.width()) * played.height();
+    EXPECT_GT(same, all * 95 / 100);
+    EXPECT_GT(drawn, all / 50);
+}
+
 TEST_F(Road, SwingAndSettingsWindowsReachTheChartOnShow) {
     TypeCode("krm");
     auto& req = charts()->state().Request;

@@ -4,8 +4,8 @@
 #include "app/chart_window_tools.h"
 #include "app/colour_table.h"
 #include "app/window_rules.h"
-#include "chart/number_format.h"
 #include "chart/saved_chart.h"
+#include "chart/screen_player.h"
 #include "chart/swing.h"
 #include "gui/paint/qt_surface.h"
 #include "gui/services/qt_printer.h"
@@ -14,6 +14,7 @@
 #include "osc/osc_identifiers.h"
 #include "platform/date_text.h"
 #include "platform/files.h"
+#include "platform/number_format.h"
 #include "platform/text.h"
 #include "store/price_file.h"
 
@@ -334,9 +335,7 @@ void Chts::SetSwing(bool on) {
         const app::SwingSettings settings = app::ReadSwingSettings(m_session.ini());
         r.SwingMethod = settings.SwingMethod;
         r.SwingValue = settings.SwingValue;
-        r.SwingPanel = r.SwingMethod == "NORM"         ? chart::SidePanel::None
-                       : r.SwingMethod == "XPointAuto" ? chart::SidePanel::XPointAuto
-                                                       : chart::SidePanel::Other;
+        r.SwingPanel = chart::SwingSidePanel(r.SwingMethod);
     } else {
         r.SwingPanel = chart::SidePanel::None;
     }
@@ -595,13 +594,15 @@ void Chts::MousePress(double x, double y, Qt::MouseButton button) {
         if (levels.empty()) {
             SetPanes({"Start  " + app::ReadoutPrice(m_fibStart),
                       "End   " + app::ReadoutPrice(price),
-                      "Rise   " + platform::Trim(chart::FormatNumber(rise, "#####.00#"))});
+                      "Rise   " + platform::Trim(platform::Format(rise, "#####.00#",
+                                                                  platform::ZeroSign::Dropped))});
             SetTool(kToolNone);
             return;
         }
         std::vector<std::string> panes = {
             "End   " + app::ReadoutPrice(price),
-            "Rise   " + platform::Trim(chart::FormatNumber(rise, "#####.00#"))};
+            "Rise   " +
+                platform::Trim(platform::Format(rise, "#####.00#", platform::ZeroSign::Dropped))};
         for (const auto& l : levels)
             panes.push_back(l.StatusText + app::ReadoutPrice(l.Price));
         SetPanes(panes);
@@ -779,15 +780,21 @@ void Chts::SaveChartDialog() {
 
 bool Chts::DisplaySavedChart(const std::string& chosen) {
     if (chosen.empty()) return false;
+    // The stream is played whole: what lies below the price area (an oscillator panel) goes to
+    // Picture2, as it did when the chart was built.
     const QSize size = AreaSize();
-    ImageSurface area(size.width(), size.height());
+    const chart::StreamReach reach =
+        chart::MeasureStream(platform::ResolvePath(platform::NormalisePath(chosen)));
+    const int panel = reach.Bottom > size.height() ? kOscPanelHeight : 0;
+    ImageSurface area(size.width(), size.height() + panel);
     const bool shown = chart::DisplaySavedChart(chosen, area, m_session.palette, m_session.fonts,
                                                 m_session.dialogs());
     const QImage& picture = area.Finish();
     if (!shown) return false;
     LeaveChart();
-    m_picture1->SetPicture(picture);
-    m_picture2->hide();
+    m_picture1->SetPicture(picture.copy(0, 0, size.width(), size.height()));
+    if (panel > 0) m_picture2->SetPicture(picture.copy(0, size.height(), size.width(), panel));
+    m_picture2->setVisible(panel > 0);
     m_showingSaved = true;
     m_splitShown = false;
     m_savedPath = chosen;
