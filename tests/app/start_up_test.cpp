@@ -146,7 +146,7 @@ TEST_F(StartUp, IndicesFolderComesFromChtPathsOnlyForServiceThree) {
 TEST_F(StartUp, PendingFilesMessageByDataService) {
     KnownInstall();
     session.ReadFolders();
-    ASSERT_TRUE(kori::platform::CreateFolder(session.folders.DownloadFolder));
+    ASSERT_TRUE(kori::platform::CreateFolderPath(session.folders.DownloadFolder));
     session.download.DataService = 2;
     EXPECT_FALSE(OfferPendingUpdate(session)); // nothing waiting
     EXPECT_TRUE(dialogs.shown().empty());
