@@ -71,7 +71,7 @@ void BM_Overlays(benchmark::State& state) {
         chart::DrawChartOverlays(p);
     }
     state.counters["calls"] = static_cast<double>(s.surface.calls().size());
-    c.Stream.Close();
+    (void)c.Stream.Close();
 }
 BENCHMARK(BM_Overlays)->Arg(0)->Arg(1)->Unit(benchmark::kMicrosecond);
 

@@ -906,11 +906,11 @@ OscOutcome ShowOscillator(chart::Chart& chart, std::string_view oscName, char ch
     try {
         id->Draw(chart, def, chartPeriod, in, panel);
     } catch (const std::bad_alloc&) {
-        chart.Stream.Close();
+        (void)chart.Stream.Close();
         ShowOscFailure(in.Dialogs, 480, "");
         return OscOutcome::Failed;
     } catch (const std::exception& e) {
-        chart.Stream.Close();
+        (void)chart.Stream.Close();
         ShowOscFailure(in.Dialogs, 5, e.what());
         return OscOutcome::Failed;
     }
