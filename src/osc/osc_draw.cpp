@@ -896,8 +896,10 @@ OscOutcome ShowOscillator(chart::Chart& chart, std::string_view oscName, char ch
     if (name == "DM")
         for (std::int16_t OscDef::*f : {&OscDef::DMA, &OscDef::DMW, &OscDef::DMXA, &OscDef::DMXW})
             if (checked.*f == 0) checked.*f = 10;
+    // The comparison file of RMO and RMX was resolved by the caller, which says when it is
+    // missing; only the periods are checked here.
     const std::string column(1, chartPeriod);
-    if (!CheckOscSettings(checked, name, column, in.TargetName, in.Dialogs))
+    if (!CheckOscSettings(checked, name, column, in.TargetName, in.Dialogs, false))
         return OscOutcome::NotValid;
     if (const auto problem = NegativePeriodProblem(checked, name, column)) {
         in.Dialogs.MsgBox(problem->text, problem->title);

@@ -192,11 +192,11 @@ std::string CompareFileCode(std::string_view compFile) {
 
 std::optional<OscMessage> OscSettingsProblem(const OscDef& def, std::string_view oscName,
                                              std::string_view chartPeriod,
-                                             std::string_view targetName) {
+                                             std::string_view targetName, bool compareFile) {
     if (platform::Upper(targetName) != "CHTS") return std::nullopt;
     if (FirstFailingKey(def, oscName, WeeklyColumn(chartPeriod), true) != nullptr)
         return NotValid(oscName);
-    if (UsesCompareFile(oscName)) return CompareFileProblem(def);
+    if (compareFile && UsesCompareFile(oscName)) return CompareFileProblem(def);
     return std::nullopt;
 }
 
@@ -212,8 +212,8 @@ std::optional<OscMessage> NegativePeriodProblem(const OscDef& def, std::string_v
 }
 
 bool CheckOscSettings(const OscDef& def, std::string_view oscName, std::string_view chartPeriod,
-                      std::string_view targetName, platform::Dialogs& dialogs) {
-    const auto problem = OscSettingsProblem(def, oscName, chartPeriod, targetName);
+                      std::string_view targetName, platform::Dialogs& dialogs, bool compareFile) {
+    const auto problem = OscSettingsProblem(def, oscName, chartPeriod, targetName, compareFile);
     if (!problem) return true;
     dialogs.MsgBox(problem->text, problem->title);
     return false;
