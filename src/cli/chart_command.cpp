@@ -50,22 +50,19 @@ struct ChartOptions {
 void ApplySwing(const std::string& text, app::ChartJob& job) {
     auto& r = job.Request;
     const auto colon = text.find(':');
-    const std::string method = text.substr(0, colon);
-    if (method != "NORM" && method != "XDay" && method != "XPoint" && method != "XPointAuto")
-        throw CliError{"--swing wants NORM, XDay:N, XPoint:N or XPointAuto"};
+    const auto method = chart::ParseSwingMethod(text.substr(0, colon));
+    if (!method) throw CliError{"--swing wants NORM, XDay:N, XPoint:N or XPointAuto"};
     float value = 0;
     if (colon != std::string::npos)
         value = static_cast<float>(platform::Val(text.substr(colon + 1)));
-    if ((method == "XDay" || method == "XPoint") && colon != std::string::npos &&
-        !chart::SwingValueValid(method, value))
+    if (chart::SwingMethodTakesValue(*method) && colon != std::string::npos &&
+        !chart::SwingValueValid(*method, value))
         throw CliError{std::string(chart::kSwingRefusal)};
     chart::SwingSwitch swing;
     swing.Set(r, true);
-    r.SwingMethod = method;
+    r.SwingMethod = *method;
     r.SwingValue = value;
-    r.SwingPanel = method == "NORM"         ? chart::SidePanel::None
-                   : method == "XPointAuto" ? chart::SidePanel::XPointAuto
-                                            : chart::SidePanel::Other;
+    r.SwingPanel = chart::SwingSidePanel(*method);
 }
 
 void ApplyOverlays(const ChartOptions& o, app::ChartJob& job) {

@@ -68,11 +68,15 @@ bool ChartListPanel::Display(int mode) {
 }
 
 bool ChartListPanel::Save() {
-    if (auto s = m_box.Save(m_session.folders.DataFolder); !s) {
+    std::vector<std::string> dropped;
+    if (auto s = m_box.Save(m_session.folders.DataFolder, &dropped); !s) {
         m_session.dialogs().MsgBox(s.message(), "Chart Lists");
         return false;
     }
     Refresh();
+    if (!dropped.empty())
+        m_session.dialogs().MsgBox(store::RefusedCodesMessage(store::kSaveDroppedHeading, dropped),
+                                   "Chart Lists");
     return true;
 }
 
@@ -98,7 +102,8 @@ void ChartListPanel::Refresh() {
     for (const auto& code : m_box.codes())
         m_list->addItem(Q(code));
     if (current >= 0 && current < m_list->count()) m_list->setCurrentRow(current);
-    m_count->setText(displayed() ? QStringLiteral("%1 charts").arg(m_box.codes().size())
+    const auto n = m_box.codes().size();
+    m_count->setText(displayed() ? QStringLiteral("%1 chart%2").arg(n).arg(n == 1 ? "" : "s")
                                  : QString());
 }
 
