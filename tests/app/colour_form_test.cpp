@@ -29,7 +29,7 @@ struct Colours : ::testing::Test {
                                    const std::string& oscName = "", bool mma = false) {
         s.session.palette = palette;
         app::ChartJob job;
-        job.Name = app::FindSecurity(s.session, "KRM")->second;
+        job.Name = s.Name("KRM");
         job.Defaults = chart::LoadChartDefaults(s.session.ini());
         job.Defaults.ShowPriceGrid = true;
         job.Request.ChartStyle = style;
