@@ -1,6 +1,6 @@
 #include "chart/draw_frame.h"
 
-#include "chart/number_format.h"
+#include "platform/number_format.h"
 #include "platform/text.h"
 
 #include <algorithm>
@@ -116,11 +116,11 @@ void DrawVerticalGrid(ChartPainter& p) {
 
 std::string VolumeLabel(double volume) {
     const double v = std::max(0.0, volume);
-    if (v < 10000) return FormatNumber(v, "0");
-    if (v < 1e6) return FormatNumber(v / 1e3, "0") + "K";
-    if (v < 1e7) return FormatNumber(v / 1e6, "0.0") + "M";
-    if (v < 1e9) return FormatNumber(v / 1e6, "0") + "M";
-    return FormatNumber(v / 1e9, "0.0") + "G";
+    if (v < 10000) return platform::Format(v, "0", platform::ZeroSign::Dropped);
+    if (v < 1e6) return platform::Format(v / 1e3, "0", platform::ZeroSign::Dropped) + "K";
+    if (v < 1e7) return platform::Format(v / 1e6, "0.0", platform::ZeroSign::Dropped) + "M";
+    if (v < 1e9) return platform::Format(v / 1e6, "0", platform::ZeroSign::Dropped) + "M";
+    return platform::Format(v / 1e9, "0.0", platform::ZeroSign::Dropped) + "G";
 }
 
 std::string HeadingLine(const ChartRequest& r, const ChartName& name, bool logarithmic,
@@ -143,9 +143,12 @@ std::string HeadingLine(const ChartRequest& r, const ChartName& name, bool logar
 }
 
 std::string PriceLabel(float value, float range, std::int16_t recordType) {
-    if (value >= 0 && value <= 0.2f) return FormatNumber(value, ".00#");
-    if (recordType == 5) return FormatNumber(value, "######");
-    return FormatNumber(value, range > 0.1f ? "###.00" : "###.00#");
+    if (value >= 0 && value <= 0.2f)
+        return platform::FormatSingle(value, ".00#", platform::ZeroSign::Dropped);
+    if (recordType == 5)
+        return platform::FormatSingle(value, "######", platform::ZeroSign::Dropped);
+    return platform::FormatSingle(value, range > 0.1f ? "###.00" : "###.00#",
+                                  platform::ZeroSign::Dropped);
 }
 
 bool LabelShows(int n, int gridCount, bool& skip) {
