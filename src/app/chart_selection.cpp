@@ -1,5 +1,6 @@
 #include "app/chart_selection.h"
 
+#include "osc/osc_identifiers.h"
 #include "platform/date_text.h"
 #include "platform/files.h"
 #include "platform/text.h"
@@ -14,28 +15,13 @@
 namespace kori::app {
 
 const std::vector<OscChoice>& OscChoices() {
-    static const std::vector<OscChoice> rows = {
-        {"(None)", "", false},
-        {"Average True Range", "ATR", false},
-        {"Directional Movement", "DM", false},
-        {"Coppock", "COP", false},
-        {"ElderRay", "ERY", false},
-        {"FX", "FX", false},
-        {"Jones Holy Grail", "JHG", false},
-        {"MACD", "MACD", false},
-        {"Momentum", "MOM", false},
-        {"On-Balance Volume", "OBV", false},
-        {"ROC", "ROC", false},
-        {"ROC & FX", "R/F", false},
-        {"RMO", "RMO", false},
-        {"RMX", "RMX", false},
-        {"RSI", "RSI", false},
-        {"Stochastic", "STO", false},
-        {"Stochastic(slow)", "STO", true},
-        {"Volatility", "VTY", false},
-        {"Williams %R", "WMS", false},
-        {"Parabolic", "PARA", false},
-    };
+    static const std::vector<OscChoice> rows = [] {
+        std::vector<OscChoice> r{{"(None)", "", false}};
+        for (const osc::OscChoice& c : osc::ChooserOrder())
+            r.push_back(
+                {std::string(osc::ChooserCaption(c)), std::string(c.OscName), c.SlowStochastic});
+        return r;
+    }();
     return rows;
 }
 

@@ -1,5 +1,6 @@
 // kori names, kori bars, kori lists: the library as text and JSON.
 #include "cli/cli_context.h"
+#include "cli/json_out.h"
 
 #include "platform/files.h"
 #include "platform/text.h"
@@ -17,7 +18,6 @@
 
 namespace kori::cli {
 
-using json = nlohmann::ordered_json;
 using platform::Trim;
 
 namespace {
@@ -29,11 +29,6 @@ std::vector<store::NameRecord> ReadNames(app::Session& session) {
     std::vector<store::NameRecord> names;
     if (auto st = nf.ReadAll(names); !st) throw CliError{st.message()};
     return names;
-}
-
-// A float as a JSON number that reads back to the same 32-bit value.
-json FloatJson(float v) {
-    return json::parse(platform::FloatText(v));
 }
 
 } // namespace
@@ -58,10 +53,10 @@ void AddNamesCommand(CLI::App& app, CliContext& ctx) {
             for (const auto& n : names) {
                 out.push_back({{"record", ++rec},
                                {"status", n.Status},
-                               {"code", Trim(n.Code)},
+                               {"code", TextJson(n.Code)},
                                {"type", n.RecordType},
-                               {"name", Trim(n.Name)},
-                               {"other_details", Trim(n.OtherDetails)},
+                               {"name", TextJson(n.Name)},
+                               {"other_details", TextJson(n.OtherDetails)},
                                {"base", FloatJson(n.Base)},
                                {"top", FloatJson(n.Top)},
                                {"pf_increment", FloatJson(n.PFIncrement)},
@@ -71,9 +66,9 @@ void AddNamesCommand(CLI::App& app, CliContext& ctx) {
                                {"bollinger_period", n.BollingerPeriod},
                                {"bollinger_width", n.BollingerWidth},
                                {"category", n.Category},
-                               {"id", Trim(n.Id)},
-                               {"industry_class", Trim(n.IndustryClass)},
-                               {"gics_sector", Trim(n.GicsSector)}});
+                               {"id", TextJson(n.Id)},
+                               {"industry_class", TextJson(n.IndustryClass)},
+                               {"gics_sector", TextJson(n.GicsSector)}});
             }
             ctx.out << out.dump(2) << "\n";
             return;
@@ -134,7 +129,7 @@ void AddBarsCommand(CLI::App& app, CliContext& ctx) {
             json bars = json::array();
             for (int i = 0; i <= s.LastBar; ++i) {
                 const auto& b = s.ChartBars[static_cast<std::size_t>(i)];
-                bars.push_back({{"date", std::string(b.DateText())},
+                bars.push_back({{"date", TextJson(b.DateText())},
                                 {"open", FloatJson(b.Open)},
                                 {"high", FloatJson(b.High)},
                                 {"low", FloatJson(b.Low)},
@@ -142,7 +137,7 @@ void AddBarsCommand(CLI::App& app, CliContext& ctx) {
                                 {"volume", b.Volume},
                                 {"note", b.Note}});
             }
-            json out = {{"code", Trim(rec->Code)},
+            json out = {{"code", TextJson(rec->Code)},
                         {"period", o->period},
                         {"first_record", q.FirstRecord},
                         {"last_record", q.LastRecord},
@@ -191,13 +186,15 @@ void AddListsCommand(CLI::App& app, CliContext& ctx) {
                     unreadable.push_back(st.message());
             json codes = json::array();
             for (const auto& e : entries)
-                codes.push_back(Trim(e.Code));
+                codes.push_back(TextJson(e.Code));
             const std::string name = i < display.size() ? display[i] : "Chart List Z";
-            out.push_back({{"list", std::string(1, letter)}, {"name", name}, {"codes", codes}});
+            out.push_back({{"list", std::string(1, letter)},
+                           {"name", platform::Latin1ToUtf8(name)},
+                           {"codes", codes}});
             if (!*asJson && !entries.empty()) {
                 ctx.out << letter << "  " << name << ":";
-                for (const auto& c : codes)
-                    ctx.out << " " << c.get<std::string>();
+                for (const auto& e : entries)
+                    ctx.out << " " << Trim(e.Code);
                 ctx.out << "\n";
             }
         }

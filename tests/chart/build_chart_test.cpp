@@ -187,7 +187,8 @@ TEST(BuildChart, OverlaysFollowTheTrailingLabelsInTheSameStream) {
     ASSERT_TRUE(BuildChart(r.chart, b, r.source, r.surface).ok());
     const auto lines = r.Lines();
     ASSERT_GE(lines.size(), 2u);
-    EXPECT_EQ(lines[lines.size() - 2], "Z, 7, 269.4, 120,KORI Charting, 27");
+    EXPECT_EQ(lines[lines.size() - 2], "Z, 7, 269.4, 120,KORI\xA0"
+                                       "Charting, 27");
     EXPECT_EQ(lines.back(), "L, 5, 900, 354, 900, 20");
 }
 
