@@ -7,7 +7,6 @@
 #include "app/osc_service.h"
 #include "osc/osc_panel.h"
 #include "platform/sub_surface.h"
-#include "store/name_file.h"
 #include "support/sample_session.h"
 
 #include <gtest/gtest.h>
@@ -30,10 +29,7 @@ struct Colours : ::testing::Test {
                                    const std::string& oscName = "", bool mma = false) {
         s.session.palette = palette;
         app::ChartJob job;
-        platform::Status why;
-        const auto found = store::FindCode(s.session.folders.DataFolder, "KRM", why);
-        EXPECT_TRUE(found);
-        if (found) job.Name = found->Record;
+        job.Name = s.Name("KRM");
         job.Defaults = chart::LoadChartDefaults(s.session.ini());
         job.Defaults.ShowPriceGrid = true;
         job.Request.ChartStyle = style;

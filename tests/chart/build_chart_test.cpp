@@ -206,8 +206,8 @@ TEST(BuildChart, SplitLowerHalfShowsItsOwnSecurityAndPeriod) {
                  r.streamPath, false,      1,      nullptr,   {}};
     b.Lower = &lower;
     ASSERT_TRUE(BuildChart(r.chart, b, r.source, r.surface).ok());
-    EXPECT_EQ(r.source.LastLoad.ChartPeriod, 'A');
-    EXPECT_EQ(lowerSource.LastLoad.ChartPeriod, 'W');
+    EXPECT_EQ(r.source.LastLoad.Period, 'A');
+    EXPECT_EQ(lowerSource.LastLoad.Period, 'W');
     EXPECT_EQ(r.request.ChartPeriod, 'A') << "the period in hand comes back after the split";
     EXPECT_FALSE(r.request.SplitMode);
     const auto lines = r.Lines();
