@@ -41,7 +41,16 @@ void ChartPainter::PlotLine(char letter, double x1, double y1, double x2, double
 
 void ChartPainter::PlotLine(char letter, double x1, double y1, double x2, double y2,
                             platform::Colour colour) {
-    const auto part = ClipToFrame(PlotFrame(chart), x1, y1, x2, y2);
+    const PlotRect f = PlotFrame(chart);
+    const auto inside = [&f](double x, double y) {
+        return x >= f.Left && x <= f.Right && y >= f.Top && y <= f.Bottom;
+    };
+    if (inside(x1, y1) && inside(x2, y2)) { // the common case: nothing to cut
+        screen.Line(x1, y1, x2, y2, colour);
+        stream.Shape(letter, x1, y1, x2, y2, colour);
+        return;
+    }
+    const auto part = ClipToFrame(f, x1, y1, x2, y2);
     if (!part) return;
     screen.Line(part->X1, part->Y1, part->X2, part->Y2, colour);
     stream.Shape(letter, part->X1, part->Y1, part->X2, part->Y2, colour);
