@@ -418,3 +418,23 @@ TEST_F(Lists, AMissingClassFileStartsAnEmptyGridAndIsWrittenOnClose) {
     EXPECT_EQ(ReadSys("Gics.dat"), "4510,Information Technology,\r\n");
     EXPECT_EQ(store::SectorNameOf(sys(), "4510"), "Information Technology_");
 }
+
+TEST_F(Lists, TheCountUnderAListSaysOneChartNotOneCharts) {
+    gui::SubList2 w(s.session, hub());
+    auto& left = w.panel(0);
+    auto& right = w.panel(1);
+    left.chooser()->setCurrentIndex(1);   // Resources
+    right.chooser()->setCurrentIndex(10); // Z, empty
+    QLabel* count = nullptr;
+    for (auto* l : right.findChildren<QLabel*>())
+        if (l->objectName().startsWith(QStringLiteral("lblCount"))) count = l;
+    ASSERT_NE(count, nullptr);
+    Select(left.list(), {0});
+    Click(w, "cmdCopyRight");
+    EXPECT_EQ(count->text(), QStringLiteral("1 chart"));
+    Select(left.list(), {5});
+    Click(w, "cmdCopyRight");
+    EXPECT_EQ(count->text(), QStringLiteral("2 charts"));
+    s.dialogs.QueueAnswer(Answer::No);
+    w.reject();
+}

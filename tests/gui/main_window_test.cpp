@@ -1,4 +1,5 @@
 #include "app/session.h"
+#include "gui/services/qt_progress.h"
 #include "gui/windows/main_window.h"
 #include "platform/clock.h"
 #include "platform/dialogs.h"
@@ -8,6 +9,8 @@
 #include <QAction>
 #include <QMenu>
 #include <QMenuBar>
+#include <QPushButton>
+#include <QStatusBar>
 #include <gtest/gtest.h>
 
 using namespace kori;
@@ -57,4 +60,36 @@ TEST(MainWindow, ModalToolsHideTheTopsAndBringThemBack) {
     EXPECT_TRUE(MenuTitles(w).contains("&Help"));
     w.SetModalToolRunning(false);
     EXPECT_TRUE(MenuTitles(w).contains("&File"));
+}
+
+TEST(MainWindow, TheSessionsWalksReportToTheBarOfTheMainWindowWithAWorkingCancel) {
+    test::TempRoot root;
+    platform::ScriptedDialogs dialogs;
+    gui::QtProgress progress(new QStatusBar);
+    platform::SettingsStore settings{root.path() / "settings.ini"};
+    platform::FixedClock clock{"20261120"};
+    app::Session session{root.path(), platform::Services{dialogs, progress, settings, clock}};
+    gui::MainWindow w(session, &progress);
+    w.show();
+    EXPECT_EQ(w.statusBar(), progress.statusBar());
+    EXPECT_EQ(&w.progress(), &progress);
+    // A walk of the session: its bar shows in the main window and Cancel reaches the walk.
+    platform::Progress& walk = session.services().progress;
+    walk.SetRange(10);
+    walk.SetValue(3);
+    EXPECT_TRUE(progress.barShown());
+    auto* cancel = w.statusBar()->findChild<QPushButton*>();
+    ASSERT_NE(cancel, nullptr);
+    EXPECT_TRUE(cancel->isVisible());
+    cancel->click();
+    EXPECT_TRUE(walk.Cancelled());
+    progress.Finish();
+    EXPECT_FALSE(progress.barShown());
+}
+
+TEST(MainWindow, AboutNamesTheVersionOfThisBuild) {
+    Fixture f;
+    gui::MainWindow w(f.session);
+    EXPECT_TRUE(w.AboutText().startsWith(QStringLiteral("KORI Charting\nVersion 8.0\n")))
+        << w.AboutText().toStdString();
 }

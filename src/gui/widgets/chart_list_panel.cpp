@@ -98,7 +98,8 @@ void ChartListPanel::Refresh() {
     for (const auto& code : m_box.codes())
         m_list->addItem(Q(code));
     if (current >= 0 && current < m_list->count()) m_list->setCurrentRow(current);
-    m_count->setText(displayed() ? QStringLiteral("%1 charts").arg(m_box.codes().size())
+    const auto n = m_box.codes().size();
+    m_count->setText(displayed() ? QStringLiteral("%1 chart%2").arg(n).arg(n == 1 ? "" : "s")
                                  : QString());
 }
 
