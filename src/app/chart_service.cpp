@@ -33,17 +33,6 @@ chart::ChartName ChartNameOf(const store::NameRecord& r) {
     return n;
 }
 
-std::optional<std::pair<int, store::NameRecord>> FindSecurity(const Session& session,
-                                                              std::string_view code) {
-    store::NameFile nf(store::NameFile::PathIn(session.folders.DataFolder));
-    std::vector<store::NameRecord> names;
-    if (!platform::FileExists(nf.path()) || !nf.ReadAll(names)) return std::nullopt;
-    const std::string wanted = store::PadCode(code);
-    for (std::size_t i = 0; i < names.size(); ++i)
-        if (names[i].Code == wanted) return std::pair{static_cast<int>(i) + 1, names[i]};
-    return std::nullopt;
-}
-
 ChartContext ChartContext::Of(Session& session, bool writeStream, platform::Dialogs* dialogs) {
     return ChartContext{session.palette,
                         session.fonts,

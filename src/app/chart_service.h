@@ -21,10 +21,6 @@ std::filesystem::path ChartStreamPath(const Session& session);
 
 chart::ChartName ChartNameOf(const store::NameRecord& r);
 
-// Finds a code in the data folder's name file (no message when absent).
-std::optional<std::pair<int, store::NameRecord>> FindSecurity(const Session& session,
-                                                              std::string_view code);
-
 // What every build of the session reads and none changes: made once from the `Session`.
 struct ChartContext {
     const platform::Palette& Palette;

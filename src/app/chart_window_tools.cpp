@@ -52,7 +52,7 @@ chart::ToolFrame ToolFrameOf(const chart::Chart& chart, const chart::ChartReques
 
 std::filesystem::path TrendlinePath(const Session& session, std::string_view code) {
     platform::CreateFolder(session.folders.ChtMiscFolder);
-    return chart::TrendlineFile::PathFor(session.folders.ChtMiscFolder, platform::Trim(code));
+    return store::TrendlineFile::PathFor(session.folders.ChtMiscFolder, platform::Trim(code));
 }
 
 std::filesystem::path NotesPath(const Session& session, std::string_view code) {
@@ -95,7 +95,7 @@ std::vector<chart::TrendEnds> TrendEndsOf(const Session& session, const chart::C
     const auto path = TrendlinePath(session, code);
     if (!platform::FileHasData(path)) return {};
     return chart::ReplayTrendlines(ToolFrameOf(chart, request),
-                                   chart::TrendlineFile::ReadAll(path));
+                                   store::TrendlineFile::ReadAll(path));
 }
 
 std::vector<chart::TrendEnds> DrawChartLines(const Session& session, chart::Chart& chart,
@@ -117,7 +117,7 @@ bool AddTrendline(const Session& session, const chart::Chart& chart,
     const auto record = chart::MakeTrendRecord(frame, x1, y1, x2, y2);
     if (!record) return false;
     platform::Status s;
-    chart::TrendlineFile::AddRecord(TrendlinePath(session, code), *record, s);
+    store::TrendlineFile::AddRecord(TrendlinePath(session, code), *record, s);
     if (!s) return false;
     if (x2 < x1) {
         std::swap(x1, x2);
@@ -133,7 +133,7 @@ bool AddTrendline(const Session& session, const chart::Chart& chart,
 }
 
 platform::Status EraseTrendline(const Session& session, std::string_view code, int recordNumber) {
-    return chart::TrendlineFile::DeleteRecord(TrendlinePath(session, code), recordNumber);
+    return store::TrendlineFile::DeleteRecord(TrendlinePath(session, code), recordNumber);
 }
 
 bool MoveTrendline(const Session& session, const chart::Chart& chart,
@@ -141,14 +141,14 @@ bool MoveTrendline(const Session& session, const chart::Chart& chart,
                    double x1, double y1, double x2, double y2) {
     const auto record = chart::MakeTrendRecord(ToolFrameOf(chart, request), x1, y1, x2, y2);
     if (!record) return false;
-    return chart::TrendlineFile::WriteRecord(TrendlinePath(session, code), recordNumber, *record)
+    return store::TrendlineFile::WriteRecord(TrendlinePath(session, code), recordNumber, *record)
         .ok();
 }
 
 platform::Status PackTrendlines(const Session& session, std::string_view code) {
     const auto path = TrendlinePath(session, code);
     if (!platform::FileExists(path)) return platform::Status::Ok();
-    return chart::TrendlineFile::Pack(path);
+    return store::TrendlineFile::Pack(path);
 }
 
 bool RemoveAllTrendlines(Session& session, std::string_view code) {

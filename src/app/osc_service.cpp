@@ -66,13 +66,12 @@ platform::Status InstallOscDefaults(Session& session) {
 
 bool SetOscKey(osc::OscDef& def, std::string_view key, std::string_view value) {
     const std::string k = platform::Trim(key);
-    for (const osc::OscPeriodKey& p : osc::OscPeriodKeys()) {
-        std::int16_t osc::OscDef::*field = nullptr;
-        if (k == p.Daily) field = p.DailyField;
-        if (k == p.Weekly) field = p.WeeklyField;
-        if (field == nullptr) continue;
+    if (const osc::OscPeriodKey* p = osc::FindOscPeriodKeyByName(k)) {
         const double v = platform::Val(value);
-        def.*field = static_cast<std::int16_t>(v < -32768 ? -32768 : v > 32767 ? 32767 : v);
+        def.*(k == p->Daily ? p->DailyField : p->WeeklyField) =
+            static_cast<std::int16_t>(v < -32768  ? -32768
+                                      : v > 32767 ? 32767
+                                                  : v);
         return true;
     }
     if (k == "CompFile") {

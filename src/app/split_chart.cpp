@@ -2,6 +2,7 @@
 
 #include "app/chart_service.h"
 #include "platform/text.h"
+#include "store/name_file.h"
 
 #include <array>
 
@@ -11,7 +12,13 @@ std::optional<SecondChart> ChooseSecondChart(const Session& session, std::string
                                              int periodIndex, platform::Dialogs& dialogs) {
     static constexpr std::array<char, 3> kPeriods = {'A', 'W', 'M'};
     const std::string code = platform::Upper(platform::Trim(codeText));
-    const auto found = code.empty() ? std::nullopt : FindSecurity(session, code);
+    platform::Status why;
+    const auto found =
+        code.empty() ? std::nullopt : store::FindCode(session.folders.DataFolder, code, why);
+    if (!why) {
+        dialogs.MsgBox(why.message(), "Second Chart");
+        return std::nullopt;
+    }
     if (!found) {
         dialogs.MsgBox("No record on file for that code", "Second Chart");
         return std::nullopt;
@@ -19,7 +26,7 @@ std::optional<SecondChart> ChooseSecondChart(const Session& session, std::string
     const std::size_t i = periodIndex >= 0 && periodIndex < 3
                               ? static_cast<std::size_t>(periodIndex)
                               : std::size_t{0};
-    return SecondChart{found->second, kPeriods[i]};
+    return SecondChart{found->Record, kPeriods[i]};
 }
 
 void SplitChart::Choose(SecondChart lower, bool chartOnShow) {

@@ -2,8 +2,8 @@
 // What the mouse tools of the chart window compute: trendlines to and from their records,
 // Fibonacci retracement levels and time lines, Gann fans. Pure geometry over the numbers of
 // the chart in hand; the window draws the results and writes them to the streams.
-#include "chart/trendline_file.h"
 #include "store/chart_bars.h"
+#include "store/trendline_file.h"
 
 #include <functional>
 #include <optional>
@@ -11,6 +11,8 @@
 #include <vector>
 
 namespace kori::chart {
+
+using store::TrendRecord;
 
 struct ToolFrame {
     double PlotLeft = 0, PlotRight = 0, PlotTop = 0, PlotBottom = 0;

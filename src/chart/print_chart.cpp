@@ -16,6 +16,24 @@ using platform::LineStyle;
 constexpr int kNormalWidth = 1;
 constexpr int kLargeDotWidth = 3;
 
+// Text, and lines drawn at the normal width; heavy lines, fills and dots are the rest.
+bool IsTextOrThinLine(char letter) {
+    switch (letter) {
+    case 'T':
+    case 'S':
+    case 'Z':
+    case 'B':
+    case 'L':
+    case 'M':
+    case 'D':
+    case 'E':
+    case 'V':
+        return true;
+    default:
+        return false;
+    }
+}
+
 std::int32_t Round32(double v) {
     const double r = std::nearbyint(v);
     if (!(r >= -2147483648.0)) return INT32_MIN;
@@ -47,7 +65,7 @@ public:
 
     // False on a run-time failure.
     bool Play(Instruction in) {
-        in.Colour = PrintColourOf(in.Colour, m_settings, m_job.Palette);
+        in.Colour = PrintColourOf(in.Letter, in.Colour, m_settings, m_job.Palette);
         switch (in.Letter) {
         case 'T':
             Text(in);
@@ -216,11 +234,17 @@ std::int16_t PrintScaleFactor(double twipsPerPixel, float printScale) {
     return static_cast<std::int16_t>(v);
 }
 
-platform::Colour PrintColourOf(platform::Colour colour, const PrintSettings& settings,
+bool NearWhite(platform::Colour colour) {
+    constexpr int kPale = 192; // light grey, entry 7 of the standard colours, and above
+    return platform::Red(colour) >= kPale && platform::Green(colour) >= kPale &&
+           platform::Blue(colour) >= kPale;
+}
+
+platform::Colour PrintColourOf(char letter, platform::Colour colour, const PrintSettings& settings,
                                const platform::Palette& palette) {
     if (settings.PrintColour != 1) return palette[0];
-    if (settings.PrintColourLines == 1 && colour != palette[15] && colour != palette[7])
-        return palette[0];
+    if (colour == palette[15] || colour == palette[7] || NearWhite(colour)) return palette[0];
+    if (settings.PrintColourLines == 1 && IsTextOrThinLine(letter)) return palette[0];
     return colour;
 }
 

@@ -22,7 +22,7 @@ struct PrintSettings {
     std::int16_t PrintLineWidth = 2;   // "Line Width": "H" and "P"; 1 to 10, otherwise 2
     std::int16_t PrintOrientation = 0; // 1 portrait, 2 landscape; else the printer's own
     int PrintColour = 1;               // 1 colour, otherwise black
-    int PrintColourLines = 0;          // 1: every colour but the two whites prints black
+    int PrintColourLines = 0;          // 1: text and thin lines print black, the rest in colour
     bool PrintBold = false;            // chart text prints bold
     // Printer origin in printer units. Either one 0 centres the chart on the next print,
     // which keeps the values it worked out for the rest of the run.
@@ -45,8 +45,14 @@ struct PaperJob {
 // Chart units to printer units: twips per pixel times the print scale, as a 16-bit integer.
 std::int16_t PrintScaleFactor(double twipsPerPixel, float printScale);
 
-// The colour a stream line prints in.
-platform::Colour PrintColourOf(platform::Colour colour, const PrintSettings& settings,
+// True for white, light grey and anything as pale: it would vanish on white paper.
+bool NearWhite(platform::Colour colour);
+
+// The colour a stream line of `letter` prints in. Black printers print everything in entry 0.
+// On a colour printer nothing pale reaches the paper (entry 0 instead), and with
+// PrintColourLines 1 text and thin lines go black too, while heavy lines, fills and dots keep
+// their colours.
+platform::Colour PrintColourOf(char letter, platform::Colour colour, const PrintSettings& settings,
                                const platform::Palette& palette);
 
 // `PrintChart`: plays `source` (TCht.Tmp or a saved chart) onto the printer and ends the

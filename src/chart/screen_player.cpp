@@ -2,6 +2,7 @@
 
 #include "platform/text.h"
 
+#include <algorithm>
 #include <cmath>
 #include <optional>
 
@@ -157,6 +158,22 @@ PlayOutcome PlayOnScreen(StreamReader& reader, platform::Surface& area,
         if (!play.Play(in, handled)) return PlayOutcome::Malformed;
         played = played || handled;
     }
+}
+
+StreamReach MeasureStream(const std::filesystem::path& path) {
+    constexpr double kTextLine = 14; // room under a text's top for one line of chart text
+    StreamReach reach;
+    StreamReader reader(path);
+    Instruction in;
+    while (reader.Next(in) == StreamReader::Result::Instruction) {
+        const bool text = IsTextLetter(in.Letter);
+        const bool dot = IsDotLetter(in.Letter);
+        const double right = text || dot ? in.X1 : std::max(in.X1, in.X2);
+        const double bottom = text ? in.Y1 + kTextLine : dot ? in.Y1 : std::max(in.Y1, in.Y2);
+        reach.Right = std::max(reach.Right, right);
+        reach.Bottom = std::max(reach.Bottom, bottom);
+    }
+    return reach;
 }
 
 bool ShowSavedChart(const std::filesystem::path& path, platform::Surface& area,

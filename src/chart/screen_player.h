@@ -20,6 +20,14 @@ inline constexpr const char* kShowSavedChartTitle = "Show Saved Chart";
 PlayOutcome PlayOnScreen(StreamReader& reader, platform::Surface& area,
                          const platform::Palette& palette, const platform::ChartFonts& fonts);
 
+// How far a stream reaches: the largest x and y of its instructions, text taken one line
+// high. A chart with an oscillator panel reaches below its price area; a player that shows
+// the stream whole needs an area this large. Zero for a file that cannot be read.
+struct StreamReach {
+    double Right = 0, Bottom = 0;
+};
+StreamReach MeasureStream(const std::filesystem::path& path);
+
 // `ShowSavedChart`: clears the area, plays the file, and shows the format message under
 // "Show Saved Chart" unless something was drawn. True when the chart showed.
 bool ShowSavedChart(const std::filesystem::path& path, platform::Surface& area,

@@ -13,6 +13,7 @@
 #include "platform/files.h"
 #include "platform/svg_surface.h"
 #include "platform/text.h"
+#include "store/name_file.h"
 
 #include <CLI/CLI.hpp>
 #include <nlohmann/json.hpp>
@@ -99,10 +100,13 @@ void ApplySplit(const app::Session& session, const std::string& text, const Char
                                                           : platform::Upper(text.substr(colon + 1));
     if (period != "A" && period != "W" && period != "M")
         throw CliError{"--split wants CODE or CODE:PERIOD with the period A, W or M"};
-    const auto found = code.empty() ? std::nullopt : app::FindSecurity(session, code);
+    platform::Status why;
+    const auto found =
+        code.empty() ? std::nullopt : store::FindCode(session.folders.DataFolder, code, why);
+    if (!why) throw CliError{why.message()};
     if (!found) throw CliError{"No record on file for that code: " + code};
     if (!o.osc.osc.empty()) throw CliError{"--split draws no oscillator panel: leave out --osc"};
-    split.Choose({found->second, period[0]}, true);
+    split.Choose({found->Record, period[0]}, true);
     if (!split.Applies(job.Request)) throw CliError{"A point-and-figure chart is never split"};
     job.Lower = split.Lower();
 }
@@ -142,7 +146,7 @@ void ApplyOptions(const ChartOptions& o, app::ChartJob& job) {
     r.AvTwoPeriod = r.ChartPeriod == 'A' ? job.Defaults.MAPeriod2Daily : job.Defaults.MAPeriod2Long;
 }
 
-void PrintNumbers(const chart::Chart& c) {
+void PrintNumbers(std::ostream& to, const chart::Chart& c) {
     json out = {{"first_record", c.FirstRecord},
                 {"last_record", c.LastRecord},
                 {"last_bar", c.LastBar()},
@@ -156,7 +160,7 @@ void PrintNumbers(const chart::Chart& c) {
                 {"grid_count", c.GridCount},
                 {"max_high", FloatJson(c.MaxHigh)},
                 {"min_low", FloatJson(c.MinLow)}};
-    std::cout << out.dump() << "\n";
+    to << out.dump() << "\n";
 }
 
 void CopyStream(const app::Session& session, const std::string& to) {
@@ -167,12 +171,14 @@ void CopyStream(const app::Session& session, const std::string& to) {
 
 void Run(CliContext& ctx, const ChartOptions& o) {
     auto& session = ctx.OpenSession();
-    const auto found = app::FindSecurity(session, o.code);
+    platform::Status why;
+    const auto found = store::FindCode(session.folders.DataFolder, o.code, why);
+    if (!why) throw CliError{why.message()};
     if (!found) throw CliError{"No File For That Name: " + platform::Trim(o.code)};
     const auto [w, h] = ParseArea(o.size);
 
     app::ChartJob job;
-    job.Name = found->second;
+    job.Name = found->Record;
     job.Defaults = chart::LoadChartDefaults(session.ini());
     chart::LoadChartRequestSettings(session.ini(), job.Request);
     ApplyOptions(o, job);
@@ -222,7 +228,7 @@ void Run(CliContext& ctx, const ChartOptions& o) {
             throw CliError{"Cannot print the chart to " + o.pdf};
     }
     if (!o.stream.empty()) CopyStream(session, o.stream);
-    if (o.json) PrintNumbers(c);
+    if (o.json) PrintNumbers(ctx.out, c);
 }
 
 } // namespace
@@ -276,7 +282,7 @@ void AddChartCommand(CLI::App& app, CliContext& ctx) {
     cmd->callback([&ctx, o] { Run(ctx, *o); });
 }
 
-void AddScaleCommand(CLI::App& app, CliContext&) {
+void AddScaleCommand(CLI::App& app, CliContext& ctx) {
     struct ScaleOptions {
         float high = 0, low = 0;
         bool json = false;
@@ -287,19 +293,19 @@ void AddScaleCommand(CLI::App& app, CliContext&) {
     cmd->add_option("--high", o->high, "Highest price")->required();
     cmd->add_option("--low", o->low, "Lowest price")->required();
     cmd->add_flag("--json", o->json, "JSON output");
-    cmd->callback([o] {
+    cmd->callback([&ctx, o] {
         const chart::ChartScale s = chart::AutoScale(o->high, o->low);
         if (o->json) {
             json out = {{"chart_base", FloatJson(s.ChartBase)},
                         {"chart_ceiling", FloatJson(s.ChartCeiling)},
                         {"grid_step", FloatJson(s.GridStep)},
                         {"grid_count", s.GridCount}};
-            std::cout << out.dump() << "\n";
+            ctx.out << out.dump() << "\n";
             return;
         }
-        std::cout << "Base " << platform::FloatText(s.ChartBase) << "  ceiling "
-                  << platform::FloatText(s.ChartCeiling) << "  grid step "
-                  << platform::FloatText(s.GridStep) << " (" << s.GridCount << " lines)\n";
+        ctx.out << "Base " << platform::FloatText(s.ChartBase) << "  ceiling "
+                << platform::FloatText(s.ChartCeiling) << "  grid step "
+                << platform::FloatText(s.GridStep) << " (" << s.GridCount << " lines)\n";
     });
 }
 

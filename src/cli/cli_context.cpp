@@ -4,11 +4,14 @@
 #include "app/start_up.h"
 #include "platform/files.h"
 
+#include <cstdarg>
+#include <cstdio>
+
 #include <unistd.h>
 
 namespace kori::cli {
 
-CliContext::CliContext() = default;
+CliContext::CliContext(std::ostream& out_, std::ostream& err_) : out(out_), err(err_) {}
 CliContext::~CliContext() = default;
 
 app::Session& CliContext::OpenSession(bool mustExist) {
@@ -36,6 +39,19 @@ app::Session& CliContext::OpenSession(bool mustExist) {
         m_session->folders.IndicesFolder = m_session->folders.DataFolder;
     }
     return *m_session;
+}
+
+std::string Printf(const char* format, ...) {
+    va_list args;
+    va_start(args, format);
+    va_list again;
+    va_copy(again, args);
+    const int n = std::vsnprintf(nullptr, 0, format, args);
+    va_end(args);
+    std::string text(n > 0 ? static_cast<std::size_t>(n) : 0, '\0');
+    if (n > 0) std::vsnprintf(text.data(), text.size() + 1, format, again);
+    va_end(again);
+    return text;
 }
 
 } // namespace kori::cli

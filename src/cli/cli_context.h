@@ -6,6 +6,7 @@
 #include "platform/progress.h"
 #include "platform/settings_store.h"
 
+#include <iosfwd>
 #include <memory>
 #include <optional>
 #include <string>
@@ -24,8 +25,12 @@ struct CliError {
 
 class CliContext {
 public:
-    CliContext();
+    // Commands write their results to `out` and their warnings to `err`.
+    CliContext(std::ostream& out, std::ostream& err);
     ~CliContext();
+
+    std::ostream& out;
+    std::ostream& err;
 
     std::optional<std::string> root; // --root
     std::optional<std::string> data; // --data
@@ -41,6 +46,9 @@ private:
     platform::SystemClock m_clock;
     std::unique_ptr<app::Session> m_session;
 };
+
+// printf-style text, for the commands' fixed-width tables.
+std::string Printf(const char* format, ...) __attribute__((format(printf, 1, 2)));
 
 // One function per subcommand; each adds itself to the app.
 void AddInitCommand(CLI::App& app, CliContext& ctx);

@@ -31,7 +31,7 @@ void AddInitCommand(CLI::App& app, CliContext& ctx) {
         app::LoadColours(session);
         if (!platform::FileExists(platform::ResolveIn(f.SystemFolder, "koriclr.dat")))
             throw CliError{"Cannot write " + f.SystemFolder + "koriclr.dat"};
-        std::cout << "Install root ready at " << session.root().string() << "\n";
+        ctx.out << "Install root ready at " << session.root().string() << "\n";
         if (*sample) {
             app::SampleSummary summary;
             auto st = app::MakeSampleLibrary(f.SystemFolder, f.DataFolder,
@@ -41,9 +41,9 @@ void AddInitCommand(CLI::App& app, CliContext& ctx) {
             auto defaults = chart::LoadChartDefaults(session.ini());
             defaults.LimitVolumeHeight = true;
             chart::SaveChartDefaults(session.ini(), defaults);
-            std::cout << "Sample library: " << summary.Securities << " securities, "
-                      << summary.Records << " daily records to " << summary.LastDate << " in "
-                      << f.DataFolder << "\n";
+            ctx.out << "Sample library: " << summary.Securities << " securities, "
+                    << summary.Records << " daily records to " << summary.LastDate << " in "
+                    << f.DataFolder << "\n";
         }
     });
 }

@@ -11,6 +11,7 @@
 #include "platform/sub_surface.h"
 #include "platform/text.h"
 #include "store/load_chart_series.h"
+#include "store/name_file.h"
 #include "store/price_file.h"
 
 #include <CLI/CLI.hpp>
@@ -42,6 +43,9 @@ std::string CheckedOscName(const std::string& text) {
 void ApplyOscSets(osc::OscDef& def, const std::vector<std::string>& sets) {
     for (const std::string& set : sets) {
         const auto eq = set.find('=');
+        if (eq != std::string::npos && osc::FindOscPeriodKeyByName(set.substr(0, eq)) != nullptr &&
+            platform::Val(set.substr(eq + 1)) < 0)
+            throw CliError{"--set " + set + ": an oscillator period cannot be negative"};
         if (eq == std::string::npos || !app::SetOscKey(def, set.substr(0, eq), set.substr(eq + 1)))
             throw CliError{"--set wants KEY=VALUE with a key of section OscDef, such as RsiP=9: " +
                            set};
@@ -63,6 +67,8 @@ platform::Status BuildChartWithPanel(app::Session& session, app::ChartJob& job, 
         }
     }
     const app::ChartOutcome out = app::BuildChartWithPanel(session, job, c, area, panel);
+    if (out.Panel == osc::OscOutcome::NotValid)
+        return platform::Status::Error(job.Request.AutoOscCode + " Oscillator values not valid");
     if (out.Panel == osc::OscOutcome::NotSet)
         std::cerr << "kori: the period of " << job.Request.AutoOscCode
                   << " is 0 in section OscDef of Kori.ini: no panel drawn\n";
@@ -93,12 +99,16 @@ void RunIndicator(CliContext& ctx, const IndicatorOptions& o) {
     if (!o.csv) throw CliError{"kori indicator writes CSV only: add --csv"};
     const std::string name = CheckedOscName(o.name);
     auto& session = ctx.OpenSession();
-    const auto found = app::FindSecurity(session, o.code);
+    platform::Status why;
+    const auto found = store::FindCode(session.folders.DataFolder, o.code, why);
+    if (!why) throw CliError{why.message()};
     if (!found) throw CliError{"No File For That Name: " + platform::Trim(o.code)};
-    const store::NameRecord& rec = found->second;
+    const store::NameRecord& rec = found->Record;
 
     osc::OscDef def = osc::ReadOscSettings(session.ini());
     ApplyOscSets(def, o.sets);
+    if (const auto problem = osc::NegativePeriodProblem(def, name, o.period))
+        throw CliError{problem->text};
 
     const auto path = store::PriceFile::PathFor(session.folders.DataFolder, rec.Code);
     store::PriceFile pf(path);
@@ -152,7 +162,7 @@ void RunIndicator(CliContext& ctx, const IndicatorOptions& o) {
         }
         out += '\n';
     }
-    std::cout << out;
+    ctx.out << out;
 }
 
 } // namespace

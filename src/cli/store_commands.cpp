@@ -49,7 +49,7 @@ void AddNamesCommand(CLI::App& app, CliContext& ctx) {
         const auto names = ReadNames(session);
         if (*codes) {
             for (const auto& n : names)
-                std::cout << n.TrimmedCode() << "\n";
+                ctx.out << n.TrimmedCode() << "\n";
             return;
         }
         if (*asJson) {
@@ -75,17 +75,17 @@ void AddNamesCommand(CLI::App& app, CliContext& ctx) {
                                {"industry_class", Trim(n.IndustryClass)},
                                {"gics_sector", Trim(n.GicsSector)}});
             }
-            std::cout << out.dump(2) << "\n";
+            ctx.out << out.dump(2) << "\n";
             return;
         }
-        std::printf("%5s  %-6s %4s  %-35s %-4s %-5s\n", "Rec", "Code", "Type", "Name", "Cat.",
-                    "Class");
+        ctx.out << Printf("%5s  %-6s %4s  %-35s %-4s %-5s\n", "Rec", "Code", "Type", "Name", "Cat.",
+                          "Class");
         int rec = 0;
         for (const auto& n : names)
-            std::printf("%5d  %-6s %4d  %-35s %4d %-5s\n", ++rec, n.TrimmedCode().c_str(),
-                        n.RecordType, Trim(n.Name).c_str(), n.Category,
-                        Trim(n.IndustryClass).c_str());
-        std::printf("%d securities in %s\n", rec, session.folders.DataFolder.c_str());
+            ctx.out << Printf("%5d  %-6s %4d  %-35s %4d %-5s\n", ++rec, n.TrimmedCode().c_str(),
+                              n.RecordType, Trim(n.Name).c_str(), n.Category,
+                              Trim(n.IndustryClass).c_str());
+        ctx.out << Printf("%d securities in %s\n", rec, session.folders.DataFolder.c_str());
     });
 }
 
@@ -161,21 +161,22 @@ void AddBarsCommand(CLI::App& app, CliContext& ctx) {
                         {"average_volume", r.AverageVolume},
                         {"volumes_present", r.VolumesPresent},
                         {"bars", bars}};
-            std::cout << out.dump() << "\n";
+            ctx.out << out.dump() << "\n";
             return;
         }
-        std::printf("%s  %s  records %d to %d, %d bars\n", Trim(rec->Code).c_str(),
-                    Trim(rec->Name).c_str(), q.FirstRecord, q.LastRecord, s.LastBar + 1);
-        std::printf("%-8s %10s %10s %10s %10s %12s %5s\n", "Date", "Open", "High", "Low", "Close",
-                    "Volume", "Note");
+        ctx.out << Printf("%s  %s  records %d to %d, %d bars\n", Trim(rec->Code).c_str(),
+                          Trim(rec->Name).c_str(), q.FirstRecord, q.LastRecord, s.LastBar + 1);
+        ctx.out << Printf("%-8s %10s %10s %10s %10s %12s %5s\n", "Date", "Open", "High", "Low",
+                          "Close", "Volume", "Note");
         for (int i = 0; i <= s.LastBar; ++i) {
             const auto& b = s.ChartBars[static_cast<std::size_t>(i)];
-            std::printf("%-8s %10g %10g %10g %10g %12d %5d\n", std::string(b.DateText()).c_str(),
-                        b.Open, b.High, b.Low, b.Close, b.Volume, b.Note);
+            ctx.out << Printf("%-8s %10g %10g %10g %10g %12d %5d\n",
+                              std::string(b.DateText()).c_str(), b.Open, b.High, b.Low, b.Close,
+                              b.Volume, b.Note);
         }
-        std::printf("Highest %g  lowest %g  volume %d..%d average %d%s\n", r.HighestPrice,
-                    r.LowestPrice, r.LowestVolume, r.HighestVolume, r.AverageVolume,
-                    r.VolumesPresent ? "" : " (no volumes)");
+        ctx.out << Printf("Highest %g  lowest %g  volume %d..%d average %d%s\n", r.HighestPrice,
+                          r.LowestPrice, r.LowestVolume, r.HighestVolume, r.AverageVolume,
+                          r.VolumesPresent ? "" : " (no volumes)");
     });
 }
 
@@ -198,13 +199,13 @@ void AddListsCommand(CLI::App& app, CliContext& ctx) {
             const std::string name = i < display.size() ? display[i] : "Chart List Z";
             out.push_back({{"list", std::string(1, letter)}, {"name", name}, {"codes", codes}});
             if (!*asJson && !entries.empty()) {
-                std::cout << letter << "  " << name << ":";
+                ctx.out << letter << "  " << name << ":";
                 for (const auto& c : codes)
-                    std::cout << " " << c.get<std::string>();
-                std::cout << "\n";
+                    ctx.out << " " << c.get<std::string>();
+                ctx.out << "\n";
             }
         }
-        if (*asJson) std::cout << out.dump(2) << "\n";
+        if (*asJson) ctx.out << out.dump(2) << "\n";
     });
 }
 

@@ -7,26 +7,26 @@ namespace kori::osc {
 
 namespace {
 
-Money ToMoney(float v) {
+std::optional<Money> ToMoney(float v) {
     return Money::FromDouble(v);
 }
 
 // The largest of the bar's range and the two gaps to the close before, the range taking ties;
-// the gaps keep their sign.
-Money TrueRange(const store::ChartBar& bar, const store::ChartBar& before) {
-    Money tr = ToMoney(bar.High - bar.Low);
-    const Money b = ToMoney(before.Close - bar.Low);
-    const Money c = ToMoney(bar.High - before.Close);
-    if (b > tr) tr = b;
-    if (c > tr) tr = c;
-    return tr;
+// the gaps keep their sign. None when a price cannot be held in currency (not a number, or
+// beyond its range), rather than a wrapped-around value.
+std::optional<Money> TrueRange(const store::ChartBar& bar, const store::ChartBar& before) {
+    const auto a = ToMoney(bar.High - bar.Low);
+    const auto b = ToMoney(before.Close - bar.Low);
+    const auto c = ToMoney(bar.High - before.Close);
+    if (!a || !b || !c) return std::nullopt;
+    return std::max({*a, *b, *c});
 }
 
 // The routine's first scale stops it when every non-zero true range is the same.
 bool HasSpread(const Series<Money>& tr) {
     std::optional<Money> hi, lo;
     for (const auto& v : tr) {
-        if (!v || v->Raw == 0) continue;
+        if (!v || v->raw() == 0) continue;
         hi = hi ? std::max(*hi, *v) : *v;
         lo = lo ? std::min(*lo, *v) : *v;
     }
@@ -48,20 +48,29 @@ AtrResult ComputeATR(const store::ChartSeries& series, std::int16_t period) {
     r.atr = r.tr;
     const int p = period;
     if (p <= 0) return r;
-    for (std::size_t i = 1; i < r.tr.size(); ++i)
+    // The average stops at the first bar whose true range cannot be held in currency.
+    std::size_t usable = r.tr.size();
+    for (std::size_t i = 1; i < r.tr.size(); ++i) {
         r.tr[i] = TrueRange(series.ChartBars[i], series.ChartBars[i - 1]);
+        if (!r.tr[i]) {
+            usable = i;
+            break;
+        }
+    }
     r.NoSpread = !HasSpread(r.tr);
-    if (r.NoSpread || n <= p) return r;
+    if (r.NoSpread || usable <= static_cast<std::size_t>(p)) return r;
 
     // Bars 1 to P fill the buffer; its mean is taken in float and back to currency.
     float sum = 0.0f;
     for (std::size_t i = 1; i <= static_cast<std::size_t>(p); ++i)
         sum += r.tr[i]->ToFloat();
-    Money atr = ToMoney(sum / static_cast<float>(p));
-    for (std::size_t i = static_cast<std::size_t>(p) + 1; i < r.tr.size(); ++i) {
-        const Money before = atr;
-        atr = (*r.tr[i] + atr * p) / (p + 1);
-        if (before.Raw != 0) r.atr[i] = atr;
+    std::optional<Money> atr = ToMoney(sum / static_cast<float>(p));
+    for (std::size_t i = static_cast<std::size_t>(p) + 1; atr && i < usable; ++i) {
+        const Money before = *atr;
+        const auto scaled = atr->Times(p);
+        const auto total = scaled ? r.tr[i]->Plus(*scaled) : std::nullopt;
+        atr = total ? total->DividedBy(std::int64_t{p} + 1) : std::nullopt;
+        if (atr && before.raw() != 0) r.atr[i] = *atr;
     }
     return r;
 }
@@ -113,10 +122,8 @@ ObvResult ComputeOBV(const store::ChartSeries& series) {
         }
         r.obv[i] = obv;
     }
-    if (obv == 100000 && hi == 100000 && lo == 100000) {
-        r.NoVolumeData = true;
-        r.obv.assign(r.obv.size(), std::nullopt);
-    }
+    // The values stay as stored (100000 on each bar): only the panel says there is no volume.
+    r.NoVolumeData = obv == 100000 && hi == 100000 && lo == 100000;
     return r;
 }
 

@@ -888,6 +888,18 @@ OscOutcome ShowOscillator(chart::Chart& chart, std::string_view oscName, char ch
         const auto periods = Periods(def, name == "R/F" ? "ROC" : name, chartPeriod);
         if (periods.empty() || periods[0] == 0) return OscOutcome::NotSet;
     }
+    // Directional Movement works a period of 0 as 10, so it is validated as such.
+    OscDef checked = def;
+    if (name == "DM")
+        for (std::int16_t OscDef::*f : {&OscDef::DMA, &OscDef::DMW, &OscDef::DMXA, &OscDef::DMXW})
+            if (checked.*f == 0) checked.*f = 10;
+    const std::string column(1, chartPeriod);
+    if (!CheckOscSettings(checked, name, column, in.TargetName, in.Dialogs))
+        return OscOutcome::NotValid;
+    if (const auto problem = NegativePeriodProblem(checked, name, column)) {
+        in.Dialogs.MsgBox(problem->text, problem->title);
+        return OscOutcome::NotValid;
+    }
     try {
         if (name == "ATR")
             OscATR(chart, def, chartPeriod, in, panel);

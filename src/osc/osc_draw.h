@@ -13,6 +13,7 @@ namespace kori::osc {
 enum class OscOutcome {
     Drawn,        // the routine ran (it may have stopped early, as its rules say)
     NotSet,       // its first period is 0: nothing drawn
+    NotValid,     // a period out of its range (or negative): message shown, nothing drawn
     OnPriceChart, // "PARA", "PARAV": the overlays draw them
     DailyOnly,    // "RMO" on a weekly or monthly chart: message shown, panel not wanted
     Unknown,      // no such identifier

@@ -87,21 +87,28 @@ bool WeeklyColumn(std::string_view chartPeriod) {
     return platform::Trim(chartPeriod) != "A";
 }
 
+// A negative period fails even on a key without a range test: no routine can count back a
+// negative number of bars.
 bool InRange(const OscPeriodKey& k, std::int16_t v) {
-    return v >= k.Min && v <= k.Max;
+    if (v < 0) return false;
+    return !k.Tested || (v >= k.Min && v <= k.Max);
 }
 
-// The first tested key of the oscillator whose value is out of range, if any.
+// The first key of the oscillator whose value is out of range, if any.
 const OscPeriodKey* FirstFailingKey(const OscDef& def, std::string_view oscName, bool weekly,
                                     bool rmxDailyOnly) {
     for (std::string_view name : OscSettingKeys(oscName)) {
         const OscPeriodKey* k = FindOscPeriodKey(name);
-        if (k == nullptr || !k->Tested) continue;
+        if (k == nullptr) continue;
         const bool useWeekly = weekly && !(rmxDailyOnly && name == "RmxP");
         const std::int16_t v = def.*(useWeekly ? k->WeeklyField : k->DailyField);
         if (!InRange(*k, v)) return k;
     }
     return nullptr;
+}
+
+std::optional<OscMessage> NotValid(std::string_view oscName) {
+    return OscMessage{std::string(oscName) + " Oscillator values not valid", "Oscillator Values"};
 }
 
 bool UsesCompareFile(std::string_view oscName) {
@@ -125,6 +132,13 @@ std::span<const OscPeriodKey> OscPeriodKeys() {
 const OscPeriodKey* FindOscPeriodKey(std::string_view dailyKey) {
     for (const auto& k : OscPeriodKeys())
         if (platform::EqualsNoCase(k.Daily, dailyKey)) return &k;
+    return nullptr;
+}
+
+const OscPeriodKey* FindOscPeriodKeyByName(std::string_view key) {
+    const std::string k = platform::Trim(key);
+    for (const auto& p : OscPeriodKeys())
+        if (p.Daily == k || p.Weekly == k) return &p;
     return nullptr;
 }
 
@@ -206,9 +220,19 @@ std::optional<OscMessage> OscSettingsProblem(const OscDef& def, std::string_view
                                              std::string_view targetName) {
     if (platform::Upper(targetName) != "CHTS") return std::nullopt;
     if (FirstFailingKey(def, oscName, WeeklyColumn(chartPeriod), true) != nullptr)
-        return OscMessage{std::string(oscName) + " Oscillator values not valid",
-                          "Oscillator Values"};
+        return NotValid(oscName);
     if (UsesCompareFile(oscName)) return CompareFileProblem(def);
+    return std::nullopt;
+}
+
+std::optional<OscMessage> NegativePeriodProblem(const OscDef& def, std::string_view oscName,
+                                                std::string_view chartPeriod) {
+    const bool weekly = WeeklyColumn(chartPeriod);
+    for (std::string_view name : OscSettingKeys(oscName)) {
+        const OscPeriodKey* k = FindOscPeriodKey(name);
+        if (k != nullptr && def.*(weekly ? k->WeeklyField : k->DailyField) < 0)
+            return NotValid(oscName);
+    }
     return std::nullopt;
 }
 

@@ -55,6 +55,8 @@ struct OscPeriodKey {
 
 std::span<const OscPeriodKey> OscPeriodKeys();
 const OscPeriodKey* FindOscPeriodKey(std::string_view dailyKey);
+// By its daily or its weekly key.
+const OscPeriodKey* FindOscPeriodKeyByName(std::string_view key);
 
 OscDef ReadOscSettings(const platform::IniFile& ini);
 // Writes every key of the section; failures are ignored as the settings rules say, but the
@@ -85,6 +87,10 @@ std::string CompareFileCode(std::string_view compFile);
 std::optional<OscMessage> OscSettingsProblem(const OscDef& def, std::string_view oscName,
                                              std::string_view chartPeriod,
                                              std::string_view targetName);
+// Whatever the window: a negative period in the column in use (it would count back before
+// the first bar), with the same message.
+std::optional<OscMessage> NegativePeriodProblem(const OscDef& def, std::string_view oscName,
+                                                std::string_view chartPeriod);
 // Shows the problem, if any, through `dialogs`; true when the settings pass.
 bool CheckOscSettings(const OscDef& def, std::string_view oscName, std::string_view chartPeriod,
                       std::string_view targetName, platform::Dialogs& dialogs);

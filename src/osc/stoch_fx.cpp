@@ -1,5 +1,7 @@
 #include "osc/stoch_fx.h"
 
+#include <algorithm>
+
 namespace kori::osc {
 
 namespace {
@@ -9,8 +11,8 @@ struct Extremes {
 };
 
 // Each bar's candidate for the window's high and low: the high and low of a bar that has
-// them, else a non-zero close; a zero is never taken. A bar with no candidate stands as the
-// starting value (0 for the high, 100000 for the low), which can never win.
+// them, else a non-zero close; a zero is never taken. The window's high starts at 0 and its low
+// at 100000, and those starting values take part: a window of negative totals keeps a high of 0.
 Extremes WindowExtremes(const store::ChartSeries& s, int n, int width, std::int16_t recordType) {
     std::vector<float> hiC(static_cast<std::size_t>(n), 0.0f);
     std::vector<float> loC(static_cast<std::size_t>(n), 100000.0f);
@@ -25,7 +27,12 @@ Extremes WindowExtremes(const store::ChartSeries& s, int n, int width, std::int1
         else if (b.Close != 0)
             loC[j] = b.Close;
     }
-    return {WindowMax(hiC, width), WindowMin(loC, width)};
+    Extremes ex{WindowMax(hiC, width), WindowMin(loC, width)};
+    for (float& h : ex.hi)
+        h = std::max(h, 0.0f);
+    for (float& l : ex.lo)
+        l = std::min(l, 100000.0f);
+    return ex;
 }
 
 std::int32_t Percent(float part, float whole) {
@@ -66,8 +73,8 @@ StochResult ComputeStochFX(const store::ChartSeries& series, std::int16_t period
         if (!slowStochastic) continue;
         ringSum += dpct;
         if (i - periodD >= first) ringSum -= *r.d[static_cast<std::size_t>(i - periodD)];
-        if (i >= periodK + periodD)
-            r.slowd[u] = RoundToInt32(static_cast<double>(ringSum) / periodD);
+        // Every bar after K has its second smoothing; only the drawing waits for a full ring.
+        r.slowd[u] = RoundToInt32(static_cast<double>(ringSum) / periodD);
     }
     return r;
 }

@@ -6,9 +6,10 @@
 namespace kori::osc {
 
 struct StochResult {
-    Series<std::int32_t> k;     // %K, from bar K + 1
-    Series<std::int32_t> d;     // first smoothing, from bar K + 1 when D > 0 (ring filling)
-    Series<std::int32_t> slowd; // slow form with D > 0: from bar K + D, when its ring is full
+    Series<std::int32_t> k; // %K, from bar K + 1
+    Series<std::int32_t> d; // first smoothing, from bar K + 1 when D > 0 (ring filling)
+    Series<std::int32_t>
+        slowd; // slow form with D > 0: from bar K + 1 (unfilled ring places count 0)
 };
 
 // `recordType` 1 to 3 takes the closes for the window's extremes. The values are the computed

@@ -7,7 +7,9 @@
 #include <cstring>
 #include <fcntl.h>
 #include <fstream>
+#include <optional>
 #include <sstream>
+#include <sys/stat.h>
 #include <system_error>
 #include <unistd.h>
 
@@ -91,37 +93,128 @@ std::optional<std::string> ReadWholeFile(const fs::path& path) {
     return ss.str();
 }
 
-void SetWriteFailureAfterBytesForTesting(long long bytes) {
+ScopedWriteFailure::ScopedWriteFailure(long long bytes) : m_previous(g_failAfterBytes) {
     g_failAfterBytes = bytes;
 }
 
-Status WriteFileAtomic(const fs::path& path, std::string_view content) {
-    const fs::path target = ResolvePath(path);
-    fs::path tmp = target;
-    tmp += ".kori-new";
-    const int fd = ::open(tmp.c_str(), O_WRONLY | O_CREAT | O_TRUNC | O_CLOEXEC, 0644);
-    if (fd < 0)
-        return Status::Error("Cannot write " + target.string() + ": " + std::strerror(errno));
-    std::size_t limit = content.size();
-    const bool injectFailure =
-        g_failAfterBytes >= 0 && static_cast<std::size_t>(g_failAfterBytes) < content.size();
-    if (injectFailure) limit = static_cast<std::size_t>(g_failAfterBytes);
-    bool ok = WriteAll(fd, content.data(), limit) && !injectFailure;
-    ok = ok && ::fsync(fd) == 0;
-    const int savedErrno = errno;
-    ::close(fd);
-    if (!ok) {
-        std::error_code ec;
-        fs::remove(tmp, ec);
-        return Status::Error("Cannot write " + target.string() + ": " +
-                             (injectFailure ? "write failed" : std::strerror(savedErrno)));
-    }
+ScopedWriteFailure::~ScopedWriteFailure() {
+    g_failAfterBytes = m_previous;
+}
+
+namespace {
+
+// The file a path names once symbolic links are followed; a dangling link names the place
+// its target will be made.
+fs::path FollowLinks(fs::path p) {
     std::error_code ec;
-    fs::rename(tmp, target, ec);
-    if (ec) {
-        fs::remove(tmp, ec);
-        return Status::Error("Cannot replace " + target.string() + ": " + ec.message());
+    for (int hops = 0; hops < 40 && fs::is_symlink(fs::symlink_status(p, ec)); ++hops) {
+        const fs::path to = fs::read_symlink(p, ec);
+        if (ec) break;
+        p = to.is_absolute() ? to : p.parent_path() / to;
     }
+    return p;
+}
+
+std::string Cannot(const fs::path& target, std::string_view why) {
+    return "Cannot write " + target.string() + ": " + std::string(why);
+}
+
+// An existing target must be a plain file we may write; nullopt when it may be replaced.
+std::optional<std::string> RefusalFor(const fs::path& target, bool& exists, mode_t& mode) {
+    struct stat st {};
+    exists = ::stat(target.c_str(), &st) == 0;
+    if (!exists)
+        return errno == ENOENT ? std::nullopt : std::optional(Cannot(target, std::strerror(errno)));
+    if (!S_ISREG(st.st_mode)) return Cannot(target, "it is not a plain file");
+    if ((st.st_mode & S_IWUSR) == 0 || ::access(target.c_str(), W_OK) != 0)
+        return Cannot(target, "the file is read-only");
+    mode = st.st_mode & 07777;
+    return std::nullopt;
+}
+
+// Creates a file no other writer shares: `<folder>/<stem>.<pid>-<n>`, opened exclusively.
+int CreateUnique(const fs::path& folder, const std::string& stem, fs::path& made) {
+    static unsigned counter = 0;
+    for (int tries = 0; tries < 100; ++tries) {
+        made = folder / (stem + "." + std::to_string(::getpid()) + "-" + std::to_string(++counter));
+        const int fd = ::open(made.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, 0666);
+        if (fd >= 0 || errno != EEXIST) return fd;
+    }
+    return -1;
+}
+
+Status WriteAndSync(int fd, std::string_view content, const fs::path& target) {
+    std::size_t limit = content.size();
+    const bool inject =
+        g_failAfterBytes >= 0 && static_cast<std::size_t>(g_failAfterBytes) < content.size();
+    if (inject) limit = static_cast<std::size_t>(g_failAfterBytes);
+    if (!WriteAll(fd, content.data(), limit))
+        return Status::Error(Cannot(target, std::strerror(errno)));
+    if (inject) return Status::Error(Cannot(target, "write failed"));
+    if (::fsync(fd) != 0) return Status::Error(Cannot(target, std::strerror(errno)));
+    return Status::Ok();
+}
+
+bool SyncFolder(const fs::path& folder) {
+    const int fd = ::open(folder.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC);
+    if (fd < 0) return false;
+    const bool ok = ::fsync(fd) == 0;
+    ::close(fd);
+    return ok;
+}
+
+// Writes `content` under a unique scratch name in `folder`, synced to disk, with the mode of the
+// file it will replace; the caller renames it.
+Status WriteScratch(const fs::path& folder, const std::string& stem, std::string_view content,
+                    mode_t mode, const fs::path& target, fs::path& scratch) {
+    const int fd = CreateUnique(folder, stem, scratch);
+    if (fd < 0) return Status::Error(Cannot(target, std::strerror(errno)));
+    if (mode != 0) (void)::fchmod(fd, mode); // 0: a new file, made as the umask says
+    Status s = WriteAndSync(fd, content, target);
+    if (::close(fd) != 0 && s) s = Status::Error(Cannot(target, std::strerror(errno)));
+    if (!s) {
+        std::error_code ec;
+        fs::remove(scratch, ec);
+    }
+    return s;
+}
+
+Status RenameOver(const fs::path& from, const fs::path& to, const fs::path& target) {
+    if (::rename(from.c_str(), to.c_str()) == 0) return Status::Ok();
+    const Status s =
+        Status::Error("Cannot replace " + target.string() + ": " + std::strerror(errno));
+    std::error_code ec;
+    fs::remove(from, ec);
+    return s;
+}
+
+} // namespace
+
+Status WriteFileAtomic(const fs::path& path, std::string_view content, const ScratchNames& names) {
+    const fs::path target = FollowLinks(ResolvePath(path));
+    bool exists = false;
+    mode_t mode = 0;
+    if (auto refusal = RefusalFor(target, exists, mode)) return Status::Error(*refusal);
+    const fs::path folder = target.has_parent_path() ? target.parent_path() : fs::path(".");
+    const std::string stem =
+        names.Scratch.empty() ? target.filename().string() + ".kori-new" : names.Scratch;
+    fs::path scratch;
+    if (auto s = WriteScratch(folder, stem, content, mode, target, scratch); !s) return s;
+    if (exists && !names.Backup.empty()) {
+        // The old content goes to the back-up first, through its own scratch file.
+        const auto old = ReadWholeFile(target);
+        fs::path backupScratch;
+        Status s = old ? WriteScratch(folder, names.Backup, *old, mode, target, backupScratch)
+                       : Status::Error(Cannot(target, "cannot read the old file"));
+        if (s) s = RenameOver(backupScratch, ResolvePath(folder / names.Backup), target);
+        if (!s) {
+            std::error_code ec;
+            fs::remove(scratch, ec);
+            return s;
+        }
+    }
+    if (auto s = RenameOver(scratch, target, target); !s) return s;
+    if (!SyncFolder(folder)) return Status::Error(Cannot(target, "the folder could not be synced"));
     return Status::Ok();
 }
 
@@ -130,9 +223,13 @@ Status AppendToFile(const fs::path& path, std::string_view bytes) {
     const int fd = ::open(target.c_str(), O_WRONLY | O_CREAT | O_APPEND | O_CLOEXEC, 0644);
     if (fd < 0)
         return Status::Error("Cannot write " + target.string() + ": " + std::strerror(errno));
-    const bool ok = WriteAll(fd, bytes.data(), bytes.size());
-    const int savedErrno = errno;
-    ::close(fd);
+    const bool inject =
+        g_failAfterBytes >= 0 && static_cast<std::size_t>(g_failAfterBytes) < bytes.size();
+    // An injected failure writes nothing: an append is one record, whole or not at all.
+    const bool ok = !inject && WriteAll(fd, bytes.data(), bytes.size());
+    const int savedErrno = inject ? EIO : errno;
+    if (::close(fd) != 0 && ok)
+        return Status::Error("Cannot write " + target.string() + ": " + std::strerror(errno));
     if (!ok)
         return Status::Error("Cannot write " + target.string() + ": " + std::strerror(savedErrno));
     return Status::Ok();

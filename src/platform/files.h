@@ -33,15 +33,37 @@ std::uintmax_t FileSizeOr0(const fs::path& path);
 
 std::optional<std::string> ReadWholeFile(const fs::path& path);
 
-// Writes the complete new content beside the target, flushes it to disk, then renames it over
-// the target: a failure at any point leaves the old file whole.
-Status WriteFileAtomic(const fs::path& path, std::string_view content);
+// Names a rewrite may give its files: the scratch name the new content is written under before
+// it takes the target's place (made unique to this writer by a suffix), and an optional back-up
+// name beside the target that receives the old content first (`.Old`, `names.bak`, ...).
+struct ScratchNames {
+    std::string Scratch; // empty: the target's own name
+    std::string Backup;  // empty: no back-up
+};
+
+// The one gate for replacing a file: writes the complete new content to a scratch file in the
+// target's folder, fsyncs it, keeps a back-up of the old file when asked, renames the scratch
+// over the target and fsyncs the folder. A symbolic link is written through to its target;
+// devices, FIFOs, folders and read-only files are refused. A failure at any step removes the
+// scratch file and leaves the old file whole.
+Status WriteFileAtomic(const fs::path& path, std::string_view content,
+                       const ScratchNames& names = {});
 
 // Appends bytes in one write (a whole record goes in or nothing does).
 Status AppendToFile(const fs::path& path, std::string_view bytes);
 
-// Seam for tests: the next atomic writes fail after this many bytes (negative: never).
-void SetWriteFailureAfterBytesForTesting(long long bytes);
+// For tests: while one is alive, every write through the gate or an append fails after this
+// many bytes of content. Scoped, so a failed assertion cannot leave the fault behind.
+class ScopedWriteFailure {
+public:
+    explicit ScopedWriteFailure(long long bytes);
+    ~ScopedWriteFailure();
+    ScopedWriteFailure(const ScopedWriteFailure&) = delete;
+    ScopedWriteFailure& operator=(const ScopedWriteFailure&) = delete;
+
+private:
+    long long m_previous;
+};
 
 bool CreateFolder(const fs::path& folder);
 

@@ -105,6 +105,26 @@ std::optional<Money> Money::Times(Money o) const {
     return Money(static_cast<std::int64_t>(product));
 }
 
+std::optional<Money> Money::Times(std::int64_t n) const {
+    std::int64_t product = 0;
+    if (__builtin_mul_overflow(m_raw, n, &product)) return std::nullopt;
+    return Money(product);
+}
+
+std::optional<Money> Money::DividedBy(std::int64_t n) const {
+    if (n == 0) return std::nullopt;
+    const Wide q = n > 0 ? DivideHalfEven(m_raw, n)
+                         : DivideHalfEven(-static_cast<Wide>(m_raw), -static_cast<Wide>(n));
+    if (q > std::numeric_limits<std::int64_t>::max()) return std::nullopt; // min / -1
+    return Money(static_cast<std::int64_t>(q));
+}
+
+std::optional<Money> Money::Plus(Money o) const {
+    std::int64_t sum = 0;
+    if (__builtin_add_overflow(m_raw, o.m_raw, &sum)) return std::nullopt;
+    return Money(sum);
+}
+
 std::optional<double> Money::DividedBy(Money o) const {
     if (o.m_raw == 0) return std::nullopt;
     return static_cast<double>(m_raw) / static_cast<double>(o.m_raw);

@@ -48,6 +48,13 @@ public:
     std::optional<Money> Times(Money o) const;
     // Quotient as a double, as mixed currency arithmetic gives it; nullopt for a zero divisor.
     std::optional<double> DividedBy(Money o) const;
+    // By a whole number: the product, nullopt on overflow; the quotient rounded to four
+    // decimals, halves to even, nullopt for a zero divisor.
+    std::optional<Money> Times(std::int64_t n) const;
+    std::optional<Money> DividedBy(std::int64_t n) const;
+    // Sum and difference, nullopt on overflow.
+    std::optional<Money> Plus(Money o) const;
+    float ToFloat() const { return static_cast<float>(ToDouble()); }
 
     constexpr auto operator<=>(const Money&) const = default;
 

@@ -1,6 +1,8 @@
 #pragma once
 // The bars of the chart as a load leaves them: daily records, or weekly and monthly bars
 // folded from them. Every drawing routine, overlay and oscillator reads these.
+#include "platform/issues.h"
+
 #include <array>
 #include <cstdint>
 #include <string>
@@ -42,6 +44,8 @@ struct ChartSeries {
     std::vector<ChartBar> ChartBars;
     std::int16_t LastBar = -1;
     LoadResults Results;
+    // Records the load could not take as they stood (a price that is not a finite number).
+    platform::Issues Issues;
 };
 
 } // namespace kori::store

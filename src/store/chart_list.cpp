@@ -79,40 +79,6 @@ Status SaveListFromCodes(std::string_view dataFolder, char letter,
     return WriteList(ListPath(dataFolder, letter), entries);
 }
 
-int RelinkLists(std::string_view dataFolder, platform::Progress& progress) {
-    std::vector<NameRecord> names;
-    NameFile nf(NameFile::PathIn(dataFolder));
-    if (!nf.Open() || nf.Count() < 2 || !nf.ReadAll(names)) return 0;
-    int rewritten = 0;
-    progress.SetStatus("Checking SubLists");
-    for (std::size_t l = 0; l + 1 < kListLetters.size(); ++l) { // A..K, not Z
-        if (progress.Cancelled()) break;
-        progress.Yield();
-        const auto path = ListPath(dataFolder, kListLetters[l]);
-        if (!platform::FileExists(path)) continue;
-        std::vector<ChartListEntry> entries;
-        if (!ReadList(path, entries) || entries.empty()) continue;
-        progress.SetRange(entries.size() > 2 ? static_cast<long long>(entries.size()) : 1);
-        std::vector<ChartListEntry> kept;
-        for (std::size_t e = 0; e < entries.size(); ++e) {
-            ChartListEntry entry = entries[e];
-            entry.NameRecord = 0;
-            const std::string wanted = platform::PadRight(entry.Code, 6);
-            for (std::size_t i = 0; i < names.size(); ++i) {
-                if (platform::PadRight(names[i].Code, 6) == wanted) {
-                    entry.NameRecord = static_cast<std::int16_t>(i + 1);
-                    break;
-                }
-            }
-            if (entry.NameRecord > 0) kept.push_back(entry);
-            if (entries.size() > 2) progress.SetValue(static_cast<long long>(e + 1));
-        }
-        // A list that lost every entry keeps its stale entries.
-        if (!kept.empty() && WriteList(path, kept)) ++rewritten;
-    }
-    return rewritten;
-}
-
 bool IsImportableCode(std::string_view line) {
     if (line.empty() || line.size() > 6) return false;
     for (char c : line)

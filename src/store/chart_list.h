@@ -44,10 +44,6 @@ void SaveSLNames(platform::SettingsStore& store, const std::array<std::string, 1
 platform::Status SaveListFromCodes(std::string_view dataFolder, char letter,
                                    const std::vector<std::string>& codes);
 
-// Re-links every user list to the record numbers of the name file as it now stands. Stops
-// between lists when the progress reports a cancel. Returns the number of lists rewritten.
-int RelinkLists(std::string_view dataFolder, platform::Progress& progress);
-
 // A line of an imported text file is a code when it has 1 to 6 letters or digits only.
 bool IsImportableCode(std::string_view line);
 

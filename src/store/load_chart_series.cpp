@@ -33,6 +33,26 @@ inline Raw Decode(const char* p) {
     return r;
 }
 
+// A price that is infinite or not a number: exponent bits all set.
+inline bool NotFinite(float v) {
+    std::uint32_t bits;
+    std::memcpy(&bits, &v, sizeof bits);
+    return (bits & 0x7f800000u) == 0x7f800000u;
+}
+
+// A record with a price that is not a finite number is taken as a no-trade record (close 0),
+// and the file and record are reported.
+inline void CheckPrices(Raw& r, int recordNumber, std::string_view fileName,
+                        platform::Issues& issues) {
+    if (!NotFinite(r.open) && !NotFinite(r.high) && !NotFinite(r.low) && !NotFinite(r.close))
+        return;
+    r.open = r.high = r.low = r.close = 0;
+    issues.push_back({platform::Severity::Warning,
+                      "Record " + std::to_string(recordNumber) + " of " + std::string(fileName) +
+                          " holds a price that is not a number; it is read as a no-trade record",
+                      std::string(fileName), recordNumber});
+}
+
 inline int Digit(char c) {
     return c >= '0' && c <= '9' ? c - '0' : -1;
 }
@@ -186,6 +206,7 @@ struct Loader {
 Status LoadChartSeriesFromBytes(std::string_view bytes, const SeriesRequest& req,
                                 std::string_view fileName, ChartSeries& s) {
     s.Results = LoadResults{};
+    s.Issues.clear();
     const int count = req.LastRecord - req.FirstRecord + 1;
     s.ChartBars.assign(static_cast<std::size_t>(std::max(count, 0)), ChartBar{});
     s.LastBar = -1;
@@ -201,6 +222,7 @@ Status LoadChartSeriesFromBytes(std::string_view bytes, const SeriesRequest& req
     for (int i = 0; i < count; ++i) {
         const int recordNumber = req.FirstRecord + i;
         r = Decode(bytes.data() + static_cast<std::size_t>(i) * PriceRecord::kSize);
+        CheckPrices(r, recordNumber, fileName, s.Issues);
         if (req.Period == 'A') {
             ++L.lastIndex;
             L.Store(r, recordNumber);

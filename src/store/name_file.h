@@ -28,7 +28,15 @@ struct FoundCode {
     NameRecord Record;
 };
 
-// Scans from record 1 for the padded upper-case code; "No File For That Name" when absent.
+// The one lookup of a code: from record 1 in file order, the first record whose six-character
+// code equals the request upper-cased and padded to six ("PRN" and "AUX" in their safe forms).
+// Nullopt with `status` ok when the code (or the file) is absent; an error in `status` when the
+// file cannot be read or holds more records than the format allows.
+std::optional<FoundCode> FindCode(std::string_view dataFolder, std::string_view code,
+                                  platform::Status& status);
+
+// `FindCodeInNameFile`: the lookup with the hourglass and "No File For That Name" when absent
+// (a file that cannot be used gives its own message instead).
 std::optional<FoundCode> FindCodeInNameFile(std::string_view dataFolder, std::string_view code,
                                             platform::Dialogs& dialogs);
 

@@ -46,20 +46,4 @@ std::filesystem::path PriceFile::PathFor(std::string_view dataFolder, std::strin
     return platform::ResolveIn(dataFolder, platform::Trim(code) + ".WDT");
 }
 
-Status PriceFile::SortByDate() {
-    std::vector<PriceRecord> records;
-    if (auto s = ReadAll(records); !s) return s;
-    std::stable_sort(records.begin(), records.end(),
-                     [](const PriceRecord& a, const PriceRecord& b) {
-                         return platform::Val(a.Date) < platform::Val(b.Date);
-                     });
-    // The sorted copy goes to Temp.Wk2 first, then takes the file's place.
-    PriceFile work(m_path.parent_path() / "Temp.Wk2");
-    if (auto s = work.WriteAll(records); !s) return s;
-    std::error_code ec;
-    std::filesystem::rename(work.path(), m_path, ec);
-    if (ec) return Status::Error("Cannot replace " + m_path.string() + ": " + ec.message());
-    return Status::Ok();
-}
-
 } // namespace kori::store

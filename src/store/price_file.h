@@ -32,8 +32,6 @@ public:
     using RecordFile::RecordFile;
     // <DataFolder><code>.WDT, found whatever its case.
     static std::filesystem::path PathFor(std::string_view dataFolder, std::string_view code);
-    // Orders the records by the number their date reads as, through Temp.Wk2 beside the file.
-    platform::Status SortByDate();
 };
 
 } // namespace kori::store

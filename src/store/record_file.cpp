@@ -58,10 +58,11 @@ Status RecordFileBase::WriteBytes(int recordNumber, std::string_view bytes) {
     return Status::Ok();
 }
 
-Status RecordFileBase::WriteAllBytes(const std::string& bytes, std::size_t records) {
+Status RecordFileBase::WriteAllBytes(const std::string& bytes, std::size_t records,
+                                     const platform::ScratchNames& names) {
     if (records > static_cast<std::size_t>(kMaxRecords))
         return Status::Error(m_path.filename().string() + " can hold at most 32767 records.");
-    if (auto s = platform::WriteFileAtomic(m_path, bytes); !s) return s;
+    if (auto s = platform::WriteFileAtomic(m_path, bytes, names); !s) return s;
     m_count = static_cast<std::int16_t>(records);
     return Status::Ok();
 }

@@ -33,8 +33,9 @@ public:
     platform::Status ReadRange(int first, int last, std::string& bytes) const;
     // Writes one record's bytes at a place; one past the end appends.
     platform::Status WriteBytes(int recordNumber, std::string_view bytes);
-    // Replaces the whole file (written beside, then renamed).
-    platform::Status WriteAllBytes(const std::string& bytes, std::size_t records);
+    // Replaces the whole file through the scratch-file gate.
+    platform::Status WriteAllBytes(const std::string& bytes, std::size_t records,
+                                   const platform::ScratchNames& names = {});
 
 protected:
     std::filesystem::path m_path;
@@ -79,14 +80,15 @@ public:
                 Record::Decode(bytes.data() + static_cast<std::size_t>(i) * Record::kSize));
         return platform::Status::Ok();
     }
-    platform::Status WriteAll(const std::vector<Record>& records) {
+    platform::Status WriteAll(const std::vector<Record>& records,
+                              const platform::ScratchNames& names = {}) {
         std::string bytes;
         bytes.reserve(records.size() * Record::kSize);
         for (const auto& r : records) {
             const auto b = r.Encode();
             bytes.append(b.data(), b.size());
         }
-        return WriteAllBytes(bytes, records.size());
+        return WriteAllBytes(bytes, records.size(), names);
     }
 };
 

@@ -1,5 +1,6 @@
 #include "app/chart_selection.h"
 #include "app/chart_service.h"
+#include "store/name_file.h"
 #include "support/sample_session.h"
 
 #include <gtest/gtest.h>
@@ -186,10 +187,11 @@ TEST_F(Selection, BandValuesAreCheckedAndWrittenToTheNameRecord) {
     EXPECT_EQ(sel.form().BandIndex, 0);
     ASSERT_TRUE(sel.ChooseBands(1, std::pair{7, 9}));
     EXPECT_EQ(state.Request.ChartBands, 1);
-    const auto found = app::FindSecurity(s.session, "ALX");
+    kori::platform::Status why;
+    const auto found = kori::store::FindCode(s.session.folders.DataFolder, "ALX", why);
     ASSERT_TRUE(found);
-    EXPECT_EQ(found->second.PercentBandUp, 7);
-    EXPECT_EQ(found->second.PercentBandDown, 9);
+    EXPECT_EQ(found->Record.PercentBandUp, 7);
+    EXPECT_EQ(found->Record.PercentBandDown, 9);
 }
 
 TEST_F(Selection, ChartListsAndTheEmptyListFallback) {
@@ -327,5 +329,6 @@ TEST_F(Selection, TheBandValuesAreAskedAboutTheCodeTypedNotTheOneShown) {
     ASSERT_TRUE(sel.Current());
     EXPECT_EQ(sel.Current()->TrimmedCode(), "KRM");
     ASSERT_TRUE(sel.ChooseBands(1, std::pair{4, 6}));
-    EXPECT_EQ(app::FindSecurity(s.session, "KRM")->second.PercentBandUp, 4);
+    platform::Status why;
+    EXPECT_EQ(store::FindCode(s.session.folders.DataFolder, "KRM", why)->Record.PercentBandUp, 4);
 }

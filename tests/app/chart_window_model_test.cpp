@@ -7,6 +7,7 @@
 #include "chart/chart_defaults.h"
 #include "platform/files.h"
 #include "platform/text.h"
+#include "store/name_file.h"
 #include "store/price_file.h"
 #include "support/sample_session.h"
 
@@ -41,10 +42,11 @@ struct Model : ::testing::Test {
     }
     // Steps onto `code` as the selection does: one short of it, then "fwd".
     void Show(std::string_view code) {
-        const auto found = app::FindSecurity(s.session, code);
+        platform::Status why;
+        const auto found = store::FindCode(s.session.folders.DataFolder, code, why);
         ASSERT_TRUE(found);
         state.Request.ListMode = 1;
-        state.Request.ListPosition = static_cast<std::int16_t>(found->first - 1);
+        state.Request.ListPosition = static_cast<std::int16_t>(found->RecordNumber - 1);
         ASSERT_TRUE(model.NextChart(1));
         ASSERT_EQ(model.Code(), std::string(code));
         Build();
@@ -259,7 +261,8 @@ TEST_F(Model, APanelDoubleClickAsksForTheOscillatorSettings) {
 struct WithPanel : Model {
     app::ChartJob Job(std::string_view code, const char* osc, char period = 'A') {
         app::ChartJob job;
-        job.Name = app::FindSecurity(s.session, code)->second;
+        platform::Status why;
+        job.Name = store::FindCode(s.session.folders.DataFolder, code, why)->Record;
         job.Defaults = state.Defaults;
         job.Request.ChartStyle = 'B';
         job.Request.ChartPeriod = period;

@@ -1,8 +1,9 @@
 #include "app/chart_service.h"
 #include "app/chart_window_tools.h"
-#include "chart/trendline_file.h"
 #include "platform/files.h"
 #include "platform/text.h"
+#include "store/name_file.h"
+#include "store/trendline_file.h"
 #include "support/sample_session.h"
 
 #include <gtest/gtest.h>
@@ -18,10 +19,11 @@ struct Tools : ::testing::Test {
     platform::RecordingSurface area{1000, 700};
 
     void Build(std::string_view code, char period) {
-        const auto found = app::FindSecurity(s.session, code);
+        kori::platform::Status why;
+        const auto found = kori::store::FindCode(s.session.folders.DataFolder, code, why);
         ASSERT_TRUE(found);
         job = {};
-        job.Name = found->second;
+        job.Name = found->Record;
         job.Defaults = chart::LoadChartDefaults(s.session.ini());
         job.Request.ChartStyle = 'B';
         job.Request.ChartPeriod = period;
@@ -72,7 +74,7 @@ TEST_F(Tools, ATrendlineLandsInTheFileAndStreamsAndComesBackOnItsPeriodOnly) {
     const double x2 = XOf(last - 5), y2 = YOfClose(last - 5);
     ASSERT_TRUE(app::AddTrendline(s.session, chart, job.Request, "KRM", area, x1, y1, x2, y2));
 
-    const auto records = chart::TrendlineFile::ReadAll(app::TrendlinePath(s.session, "KRM"));
+    const auto records = store::TrendlineFile::ReadAll(app::TrendlinePath(s.session, "KRM"));
     ASSERT_EQ(records.size(), 1u);
     EXPECT_EQ(records[0].Period, 'A');
     EXPECT_EQ(records[0].DateA,
@@ -108,7 +110,7 @@ TEST_F(Tools, AClickWithoutDragKeepsNoLineAndAnEndPastTheChartIsHeldNearTheEdge)
     EXPECT_FALSE(platform::FileHasData(app::TrendlinePath(s.session, "KRM")));
     ASSERT_TRUE(app::AddTrendline(s.session, chart, job.Request, "KRM", area, x, y,
                                   chart.PlotRight + 200, y));
-    const auto records = chart::TrendlineFile::ReadAll(app::TrendlinePath(s.session, "KRM"));
+    const auto records = store::TrendlineFile::ReadAll(app::TrendlinePath(s.session, "KRM"));
     ASSERT_EQ(records.size(), 1u);
     EXPECT_EQ(records[0].DateB[0], 'X');
     EXPECT_EQ(platform::Val(records[0].DateB.substr(1)), chart.PlotRight + 10);
@@ -122,11 +124,11 @@ TEST_F(Tools, ErasedLinesStayAsBlankRecordsUntilPackedAndRemoveAllAsksFirst) {
                                       YOfClose(last - k), XOf(last - 2), YOfClose(last - 2)));
     ASSERT_TRUE(app::EraseTrendline(s.session, "KRM", 2));
     const auto path = app::TrendlinePath(s.session, "KRM");
-    EXPECT_EQ(chart::TrendlineFile::ReadAll(path).size(), 3u);
+    EXPECT_EQ(store::TrendlineFile::ReadAll(path).size(), 3u);
     Build("KRM", 'A');
     EXPECT_EQ(ends.size(), 2u);
     ASSERT_TRUE(app::PackTrendlines(s.session, "KRM"));
-    EXPECT_EQ(chart::TrendlineFile::ReadAll(path).size(), 2u);
+    EXPECT_EQ(store::TrendlineFile::ReadAll(path).size(), 2u);
 
     s.dialogs.QueueAnswer(platform::Answer::No);
     EXPECT_FALSE(app::RemoveAllTrendlines(s.session, "KRM"));

@@ -4,6 +4,7 @@
 #include "chart/stream_reader.h"
 #include "platform/files.h"
 #include "platform/text.h"
+#include "store/name_file.h"
 #include "store/price_file.h"
 #include "support/sample_session.h"
 
@@ -22,9 +23,10 @@ struct Split : ::testing::Test {
 
     app::ChartJob Job(std::string_view code, char period) {
         app::ChartJob job;
-        const auto found = app::FindSecurity(s.session, code);
+        kori::platform::Status why;
+        const auto found = kori::store::FindCode(s.session.folders.DataFolder, code, why);
         EXPECT_TRUE(found);
-        if (found) job.Name = found->second;
+        if (found) job.Name = found->Record;
         job.Defaults = chart::LoadChartDefaults(s.session.ini());
         job.Request.ChartStyle = 'B';
         job.Request.ChartPeriod = period;

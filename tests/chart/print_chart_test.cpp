@@ -128,14 +128,28 @@ TEST(PaperPlayer, LineWidthOutsideOneToTenPrintsAtTwo) {
 TEST(PaperPlayer, ColourRule) {
     const platform::Palette pal = test::PlayerPalette();
     PrintSettings s;
-    EXPECT_EQ(PrintColourOf(255, s, pal), 255u);
+    // Colour printer, whites kept as whites were asked for: every colour stays but the pale.
+    for (char letter : std::string("TSZBLMDEVHPKCFX")) {
+        EXPECT_EQ(PrintColourOf(letter, 255, s, pal), 255u) << letter;
+        EXPECT_EQ(PrintColourOf(letter, 1015, s, pal), 1000u) << letter; // entry 15
+        EXPECT_EQ(PrintColourOf(letter, 1007, s, pal), 1000u) << letter; // entry 7
+        EXPECT_EQ(PrintColourOf(letter, platform::Rgb(250, 250, 240), s, pal), 1000u) << letter;
+    }
+    // White as black: text and thin lines go black, heavy lines, fills and dots keep colour.
     s.PrintColourLines = 1;
-    EXPECT_EQ(PrintColourOf(255, s, pal), 1000u);
-    EXPECT_EQ(PrintColourOf(1015, s, pal), 1015u); // the whites keep their colour
-    EXPECT_EQ(PrintColourOf(1007, s, pal), 1007u);
+    for (char letter : std::string("TSZBLMDEV"))
+        EXPECT_EQ(PrintColourOf(letter, 255, s, pal), 1000u) << letter;
+    for (char letter : std::string("HPKCFX")) {
+        EXPECT_EQ(PrintColourOf(letter, 255, s, pal), 255u) << letter;
+        EXPECT_EQ(PrintColourOf(letter, 1015, s, pal), 1000u) << letter;
+    }
     s.PrintColour = 0;
-    EXPECT_EQ(PrintColourOf(1015, s, pal), 1000u);
-    EXPECT_EQ(PrintColourOf(255, s, pal), 1000u);
+    EXPECT_EQ(PrintColourOf('H', 1015, s, pal), 1000u);
+    EXPECT_EQ(PrintColourOf('F', 255, s, pal), 1000u);
+
+    EXPECT_TRUE(NearWhite(platform::Rgb(192, 192, 192)));
+    EXPECT_FALSE(NearWhite(platform::Rgb(255, 255, 0))); // yellow is a colour, not paper
+    EXPECT_FALSE(NearWhite(platform::Rgb(191, 255, 255)));
 
     PaperRig rig;
     rig.settings.PrintColour = 0;

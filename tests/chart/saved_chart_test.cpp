@@ -67,9 +67,10 @@ TEST(SavedChart, AnExistingFileIsOnlyReplacedWhenTheUserSaysSo) {
 TEST(SavedChart, AFailedSaveLeavesTheOldFileWhole) {
     SaveRig rig;
     rig.root.Write("BHP.cht", "the chart saved last week");
-    platform::SetWriteFailureAfterBytesForTesting(5);
-    const auto result = SaveChartAs(rig.Target("BHP.cht"), rig.stream, rig.dialogs);
-    platform::SetWriteFailureAfterBytesForTesting(-1);
+    const auto result = [&] {
+        platform::ScopedWriteFailure fail(5);
+        return SaveChartAs(rig.Target("BHP.cht"), rig.stream, rig.dialogs);
+    }();
     EXPECT_EQ(result, SaveChartResult::NotSaved);
     EXPECT_EQ(rig.root.Read("BHP.cht"), "the chart saved last week");
     EXPECT_EQ(rig.dialogs.messages().back(), " CHART NOT SAVED ");

@@ -6,7 +6,6 @@
 #include "app/chart_navigation.h"
 #include "app/chart_service.h"
 #include "app/chart_window_tools.h"
-#include "chart/trendline_file.h"
 #include "gui/paint/qt_surface.h"
 #include "gui/widgets/chart_view.h"
 #include "gui/windows/chart_windows.h"
@@ -19,6 +18,7 @@
 #include "platform/date_text.h"
 #include "platform/files.h"
 #include "store/price_file.h"
+#include "store/trendline_file.h"
 
 #include <QAction>
 #include <QApplication>
@@ -152,7 +152,7 @@ TEST_F(Road, ATrendlineDrawnWithTheMouseComesBackOnItsPeriodOnly) {
     QTest::mouseMove(view, QPoint((x1 + x2) / 2, (y1 + y2) / 2));
     QTest::mouseRelease(view, Qt::LeftButton, {}, QPoint(x2, y2));
     const auto path = app::TrendlinePath(s.session, "KRM");
-    const auto records = chart::TrendlineFile::ReadAll(path);
+    const auto records = store::TrendlineFile::ReadAll(path);
     ASSERT_EQ(records.size(), 1u);
     EXPECT_EQ(records[0].Period, 'A');
     EXPECT_EQ(chts()->trendEnds().size(), 1u);
@@ -176,7 +176,7 @@ TEST_F(Road, ATrendlineDrawnWithTheMouseComesBackOnItsPeriodOnly) {
               "To delete a trendline, click that trendline with your RIGHT mouse button");
     QTest::mouseClick(view, Qt::RightButton, {}, QPoint((x1 + x2) / 2, (y1 + y2) / 2));
     EXPECT_TRUE(chts()->trendEnds().empty());
-    EXPECT_TRUE(chart::TrendlineFile::ReadAll(path)[0].deleted());
+    EXPECT_TRUE(store::TrendlineFile::ReadAll(path)[0].deleted());
 }
 
 TEST_F(Road, CursorReadoutAndFibonacciInTheStatusBar) {
@@ -318,6 +318,40 @@ TEST_F(Road, AChosenOscillatorDrawsItsPanelUnderTheChartAndTheParabolicNone) {
     EXPECT_FALSE(chts()->panelShown());
 }
 
+TEST_F(Road, ASavedChartShowsItsOscillatorPanelAgain) {
+    TypeCode("krm");
+    auto& req = charts()->state().Request;
+    req.AutoOsc = true;
+    req.AutoOscCode = "RSI";
+    Key("ref");
+    ASSERT_TRUE(chts()->panelShown());
+    const int top = chts()->model().lastBuild().PriceHeight;
+    const QImage& live = chts()->picture1()->picture();
+    const QImage livePanel = live.copy(0, top, live.width(), live.height() - top);
+    const std::string saved = s.session.folders.ChtSaveFolder + "KRMRSI.cht";
+    ASSERT_TRUE(chts()->SaveChartAs(saved));
+
+    req.AutoOsc = false;
+    Key("fwd");
+    ASSERT_FALSE(chts()->panelShown());
+    ASSERT_TRUE(chts()->DisplaySavedChart(saved));
+    // The played panel is the live one but for what only the builder draws (blanks of titles).
+    const QImage& shown = chts()->picture1()->picture();
+    const QImage played = shown.copy(0, top, livePanel.width(), livePanel.height())
+                              .convertToFormat(livePanel.format());
+    ASSERT_EQ(played.size(), livePanel.size());
+    long same = 0, drawn = 0;
+    const QRgb back = livePanel.pixel(livePanel.width() - 1, livePanel.height() - 1);
+    for (int y = 0; y < played.height(); ++y)
+        for (int x = 0; x < played.width(); ++x) {
+            same += played.pixel(x, y) == livePanel.pixel(x, y);
+            drawn += played.pixel(x, y) != back;
+        }
+    const long all = static_cast<long>(played.width()) * played.height();
+    EXPECT_GT(same, all * 95 / 100) << "the panel of the saved stream is dropped";
+    EXPECT_GT(drawn, all / 50);
+}
+
 TEST_F(Road, SwingAndSettingsWindowsReachTheChartOnShow) {
     TypeCode("krm");
     auto& req = charts()->state().Request;
@@ -428,11 +462,11 @@ TEST_F(Road, ARightDragInTheTrendlineToolMovesTheNearerEnd) {
     chts()->MouseRelease(xB, y, Qt::LeftButton);
     ASSERT_EQ(chts()->trendEnds().size(), 1u);
     const std::string dateB =
-        chart::TrendlineFile::ReadAll(app::TrendlinePath(s.session, "KRM"))[0].DateB;
+        store::TrendlineFile::ReadAll(app::TrendlinePath(s.session, "KRM"))[0].DateB;
     // Grab near the right end and drop it ten bars further right.
     chts()->MousePress(xB - 1, y, Qt::RightButton);
     chts()->MouseRelease(xB + 10 * chts()->chart().BarSpacing, y, Qt::RightButton);
-    const auto records = chart::TrendlineFile::ReadAll(app::TrendlinePath(s.session, "KRM"));
+    const auto records = store::TrendlineFile::ReadAll(app::TrendlinePath(s.session, "KRM"));
     ASSERT_EQ(records.size(), 1u);
     EXPECT_EQ(
         records[0].DateA,

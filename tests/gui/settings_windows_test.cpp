@@ -399,11 +399,12 @@ TEST_F(SampleRoot, ScalesWriteTheNameRecordAndChart2NamesTheLowerChart) {
     w.top()->setText("4.75");
     w.pfIncrement()->setText("0.05");
     Click(w, "cmdOK");
-    const auto found = app::FindSecurity(session, "KRM");
+    kori::platform::Status why;
+    const auto found = kori::store::FindCode(session.folders.DataFolder, "KRM", why);
     ASSERT_TRUE(found);
-    EXPECT_FLOAT_EQ(found->second.Base, 2.5f);
-    EXPECT_FLOAT_EQ(found->second.Top, 4.75f);
-    EXPECT_FLOAT_EQ(found->second.PFIncrement, 0.05f);
+    EXPECT_FLOAT_EQ(found->Record.Base, 2.5f);
+    EXPECT_FLOAT_EQ(found->Record.Top, 4.75f);
+    EXPECT_FLOAT_EQ(found->Record.PFIncrement, 0.05f);
 
     gui::Chart2 second(session, hub);
     QSignalSpy chosen(&hub, &gui::SettingsHub::SecondChart);

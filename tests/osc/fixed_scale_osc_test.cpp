@@ -6,6 +6,8 @@
 
 #include <gtest/gtest.h>
 
+#include <vector>
+
 using namespace kori;
 using namespace kori::osc;
 using test::CloseBars;
@@ -81,7 +83,7 @@ TEST(StochCompute, InclusiveWindowAndBothSmoothings) {
     EXPECT_EQ(*r.d[3], 25);
     EXPECT_EQ(*r.d[4], 50);
     EXPECT_EQ(*r.d[5], 89);
-    EXPECT_FALSE(r.slowd[3]); // the second line begins only after K + D bars
+    EXPECT_EQ(*r.slowd[3], 12); // (25 + an unfilled 0) / 2 = 12.5, to even
     EXPECT_EQ(*r.slowd[4], 38);
     EXPECT_EQ(*r.slowd[5], 70);
 
@@ -100,6 +102,42 @@ TEST(StochCompute, ClosesStandInForHighAndLow) {
     auto noHigh = bars;
     noHigh.ChartBars[1].High = 0;
     EXPECT_EQ(*ComputeStochFX(noHigh, 2, 0, false, 4).k[3], 33);
+}
+
+// The second smoothing is computed at every bar after K, unfilled ring places counting 0.
+// A steady rise with high = close + 1 and low = close - 1.5 gives %K = %D = 11.5 / 12.5 = 92
+// at every bar from 11 (K = 10, D = 5); the slow line is then 92 x n / 5 for n = 1 to 5.
+TEST(StochCompute, SlowSmoothingFromTheFirstBarAfterK) {
+    store::ChartSeries s;
+    for (int c = 10; c <= 30; ++c) {
+        store::ChartBar b;
+        b.Open = b.Close = static_cast<float>(c);
+        b.High = b.Close + 1.0f;
+        b.Low = b.Close - 1.5f;
+        s.ChartBars.push_back(b);
+    }
+    s.LastBar = static_cast<std::int16_t>(s.ChartBars.size() - 1);
+    const StochResult r = ComputeStochFX(s, 10, 5, true, 4);
+    EXPECT_FALSE(r.slowd[10]);
+    EXPECT_EQ(*r.d[11], 92);
+    const std::vector<std::int32_t> expected{18, 37, 55, 74, 92, 92};
+    for (std::size_t j = 0; j < expected.size(); ++j)
+        EXPECT_EQ(*r.slowd[11 + j], expected[j]) << 11 + j;
+}
+
+// The window's high starts at 0 and its low at 100000, and those take part: on a closes-only
+// series of negative totals -20, -40, -76, -18 (K 2, D 2) the high stays 0.
+//   bar 3: window -20 -40 -76: Hi 0 Lo -76, close -76 -> %K 0, ring (0, 76)
+//   bar 4: window -40 -76 -18: Hi 0 Lo -76 -> 58 / 76 -> %K 76; %D 58 / 152 -> 38
+TEST(StochCompute, StartingHighAndLowTakePart) {
+    const auto bars = CloseBars({-10, -20, -40, -76, -18});
+    const StochResult r = ComputeStochFX(bars, 2, 2, false, 3);
+    EXPECT_EQ(*r.k[3], 0);
+    EXPECT_EQ(*r.k[4], 76);
+    EXPECT_EQ(*r.d[4], 38);
+    // A window of prices above 100000 keeps its low at 100000 in the same way.
+    const auto high = CloseBars({200000, 200000, 200200, 200100}); // 100100 / 100200
+    EXPECT_EQ(*ComputeStochFX(high, 2, 0, false, 3).k[3], 100);
 }
 
 // A window with no range: %K = (close - low) x 100 = 0, and %D the same by 100 x DiffSum.

@@ -331,7 +331,7 @@ TEST(OscPanelTest, ZeroClosesAndPeriodsLongerThanTheChart) {
         for (bool longPeriods : {false, true}) {
             PanelRig rig(zeros);
             for (const auto& k : OscPeriodKeys())
-                rig.def.*k.DailyField = longPeriods      ? std::int16_t{300}
+                rig.def.*k.DailyField = longPeriods      ? std::int16_t{200}
                                         : k.DefaultDaily ? k.DefaultDaily
                                                          : std::int16_t{5};
             EXPECT_EQ(ShowOscillator(rig.chart, name, 'A', rig.def, rig.in, rig.panel),
@@ -512,4 +512,43 @@ TEST(OscPanelTest, RateOfChangeOnItsSymmetricScaleByHand) {
 }
 
 } // namespace
+} // namespace kori::osc
+
+namespace kori::osc {
+
+// A negative period would count back before the first bar: refused with the window's message
+// whatever the target, before anything is drawn. In the chart window the range check runs too.
+TEST(OscPanelTest, NegativeAndOutOfRangePeriodsAreRefused) {
+    const struct {
+        const char* name;
+        std::int16_t OscDef::*field;
+        std::int16_t value;
+        const char* target;
+    } cases[] = {
+        {"STO", &OscDef::StochK, -7, "CHTS"}, {"STO", &OscDef::StochK, -7, "ANAL"},
+        {"STO", &OscDef::StochD, -1, "ANAL"}, {"FX", &OscDef::FXX, -3, "ANAL"},
+        {"DM", &OscDef::DMA, -2, "ANAL"},     {"R/F", &OscDef::FXF, -5, "ANAL"},
+        {"ROC", &OscDef::RocA, -4, "CHTS"},   {"STO", &OscDef::StochK, 500, "CHTS"},
+    };
+    for (const auto& c : cases) {
+        PanelRig rig(Rising(60));
+        for (const auto& k : OscPeriodKeys())
+            rig.def.*k.DailyField = k.DefaultDaily ? k.DefaultDaily : std::int16_t{5};
+        rig.def.*c.field = c.value;
+        rig.in.TargetName = c.target;
+        EXPECT_EQ(ShowOscillator(rig.chart, c.name, 'A', rig.def, rig.in, rig.panel),
+                  OscOutcome::NotValid)
+            << c.name << " " << c.value;
+        EXPECT_EQ(rig.dialogs.messages(),
+                  std::vector<std::string>{std::string(c.name) + " Oscillator values not valid"});
+        EXPECT_TRUE(rig.panel.calls().empty()) << c.name;
+    }
+    // Outside the chart window the range check does not run: a long period still draws.
+    PanelRig rig(Rising(60));
+    rig.def.StochK = 500;
+    rig.def.StochD = 3;
+    rig.in.TargetName = "ANAL";
+    EXPECT_EQ(ShowOscillator(rig.chart, "STO", 'A', rig.def, rig.in, rig.panel), OscOutcome::Drawn);
+}
+
 } // namespace kori::osc

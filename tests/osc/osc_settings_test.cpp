@@ -72,6 +72,19 @@ TEST(OscSettings, DialogFillsDefaultsOfItsOwnColumnOnly) {
     EXPECT_EQ(BollingerPeriod(def, true), 100);
 }
 
+// Averages have no range test, but a negative one is refused by the dialog as any period is.
+TEST(OscSettings, NegativePeriodsFailEvenWithoutARangeTest) {
+    OscDef def;
+    FillOscDefaults(def, "ROC", true);
+    EXPECT_FALSE(OscFormProblem(def, "ROC", true));
+    def.RocAW = -3;
+    EXPECT_EQ(OscFormProblem(def, "ROC", true)->text, " Periods must be between 1 - 200 ");
+    EXPECT_FALSE(NegativePeriodProblem(def, "ROC", "A")); // the daily column is fine
+    EXPECT_EQ(NegativePeriodProblem(def, "ROC", "W")->text, "ROC Oscillator values not valid");
+    EXPECT_EQ(FindOscPeriodKeyByName("RocAW")->Daily, "RocA");
+    EXPECT_EQ(FindOscPeriodKeyByName("Nope"), nullptr);
+}
+
 TEST(OscSettings, ChartCheckNamesTheOscillatorAndUsesDailyRmxInBothColumns) {
     test::TempRoot root;
     OscDef def;

@@ -5,6 +5,9 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
+#include <sys/stat.h>
+
 using namespace kori::platform;
 using kori::test::TempRoot;
 
@@ -30,16 +33,81 @@ TEST(Files, FolderTestsIgnoreTheClosingSeparatorAndBackSlashes) {
     EXPECT_FALSE(FileHasData(root.path() / "empty"));
 }
 
-TEST(Files, AFailedAtomicWriteLeavesTheOldFileWhole) {
+namespace {
+std::vector<std::string> FilesIn(const std::filesystem::path& dir) {
+    std::vector<std::string> names;
+    for (const auto& e : std::filesystem::directory_iterator(dir))
+        names.push_back(e.path().filename().string());
+    std::sort(names.begin(), names.end());
+    return names;
+}
+} // namespace
+
+TEST(Files, AFailedAtomicWriteLeavesTheOldFileWholeAndNoScratch) {
     TempRoot root;
     const auto p = root.Write("Names.dat", "old content");
-    SetWriteFailureAfterBytesForTesting(3);
-    EXPECT_FALSE(WriteFileAtomic(p, "new content that fails").ok());
-    SetWriteFailureAfterBytesForTesting(-1);
+    {
+        ScopedWriteFailure fail(3);
+        EXPECT_FALSE(WriteFileAtomic(p, "new content that fails").ok());
+        EXPECT_FALSE(WriteFileAtomic(p, "new content", {"Temp.Wk2", "names.bak"}).ok());
+        EXPECT_FALSE(AppendToFile(p, "appended").ok());
+    }
     EXPECT_EQ(root.Read("Names.dat"), "old content");
-    EXPECT_EQ(std::distance(std::filesystem::directory_iterator(root.path()), {}), 1);
-    ASSERT_TRUE(WriteFileAtomic(p, "new").ok());
+    EXPECT_EQ(FilesIn(root.path()), std::vector<std::string>{"Names.dat"});
+    ASSERT_TRUE(WriteFileAtomic(p, "new").ok()) << "the fault ends with its scope";
     EXPECT_EQ(root.Read("Names.dat"), "new");
+}
+
+TEST(Files, TheGateKeepsABackUpAndTheFileMode) {
+    TempRoot root;
+    const auto p = root.Write("Names.dat", "first");
+    std::filesystem::permissions(p, std::filesystem::perms(0640));
+    ASSERT_TRUE(WriteFileAtomic(p, "second", {"Temp.Wk1", "names.bak"}).ok());
+    EXPECT_EQ(root.Read("Names.dat"), "second");
+    EXPECT_EQ(root.Read("names.bak"), "first");
+    EXPECT_EQ(std::filesystem::status(p).permissions(), std::filesystem::perms(0640));
+    EXPECT_EQ(FilesIn(root.path()), (std::vector<std::string>{"Names.dat", "names.bak"}));
+    // No old file: nothing to back up.
+    ASSERT_TRUE(WriteFileAtomic(root.path() / "New.dat", "x", {"Temp.Wk1", "New.bak"}).ok());
+    EXPECT_FALSE(std::filesystem::exists(root.path() / "New.bak"));
+}
+
+TEST(Files, TheGateWritesThroughALinkAndRefusesWhatIsNoPlainWritableFile) {
+    TempRoot root;
+    std::filesystem::create_directory(root.path() / "real");
+    const auto target = root.Write("real/chart.png", "old");
+    const auto link = root.path() / "link.png";
+    std::filesystem::create_symlink("real/chart.png", link);
+    ASSERT_TRUE(WriteFileAtomic(link, "new").ok());
+    EXPECT_TRUE(std::filesystem::is_symlink(link)) << "the link stays a link";
+    EXPECT_EQ(root.Read("real/chart.png"), "new");
+
+    const auto fifo = root.path() / "pipe";
+    ASSERT_EQ(::mkfifo(fifo.c_str(), 0644), 0);
+    const auto refused = WriteFileAtomic(fifo, "x");
+    EXPECT_FALSE(refused.ok());
+    EXPECT_NE(refused.message().find("not a plain file"), std::string::npos) << refused.message();
+    EXPECT_EQ(std::filesystem::status(fifo).type(), std::filesystem::file_type::fifo);
+
+    EXPECT_FALSE(WriteFileAtomic(root.path() / "real", "x").ok()) << "a folder is refused";
+
+    const auto readOnly = root.Write("locked.dat", "keep");
+    std::filesystem::permissions(readOnly, std::filesystem::perms(0444));
+    const auto locked = WriteFileAtomic(readOnly, "lost");
+    EXPECT_FALSE(locked.ok());
+    EXPECT_NE(locked.message().find("read-only"), std::string::npos) << locked.message();
+    EXPECT_EQ(root.Read("locked.dat"), "keep");
+    EXPECT_EQ(std::filesystem::status(readOnly).permissions(), std::filesystem::perms(0444));
+}
+
+TEST(Files, TwoWritersNeverShareAScratchFile) {
+    TempRoot root;
+    const auto p = root.Write("TCht.Tmp", "");
+    // A scratch file of the old fixed name, left by a killed writer, is not in the way.
+    root.Write("TCht.Tmp.kori-new", "stale");
+    ASSERT_TRUE(WriteFileAtomic(p, "mine").ok());
+    EXPECT_EQ(root.Read("TCht.Tmp"), "mine");
+    EXPECT_EQ(root.Read("TCht.Tmp.kori-new"), "stale");
 }
 
 TEST(IniFile, UnknownForMissingOrEmptyCutAt60CaseFreeNames) {

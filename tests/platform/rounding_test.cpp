@@ -43,6 +43,26 @@ TEST(Rounding, IntegerParts) {
     EXPECT_EQ(FixToInt32(-7.99), -7);
 }
 
+TEST(Money, WholeNumberArithmeticIsRoundedAndChecked) {
+    const auto over = [](std::int64_t raw, std::int64_t n) {
+        return Money::FromRaw(raw).DividedBy(n)->raw();
+    };
+    EXPECT_EQ(over(5, 2), 2);
+    EXPECT_EQ(over(7, 2), 4);
+    EXPECT_EQ(over(-5, 2), -2);
+    EXPECT_EQ(over(5, -2), -2);
+    EXPECT_EQ(over(20666, 3), 6889);
+    EXPECT_FALSE(Money::FromRaw(1).DividedBy(std::int64_t{0}).has_value());
+    EXPECT_EQ(Money::FromDouble(10.9f - 10.2f)->raw(), 7000); // the float 0.6999998 is 0.7
+    const Money big = Money::FromRaw(std::numeric_limits<std::int64_t>::max() / 2 + 1);
+    EXPECT_FALSE(big.Times(std::int64_t{2}).has_value());
+    EXPECT_FALSE(big.Plus(big).has_value());
+    EXPECT_EQ(Money::FromRaw(3).Times(std::int64_t{-4})->raw(), -12);
+    // A price too large for currency, or not a number, is refused rather than wrapped.
+    EXPECT_FALSE(Money::FromDouble(1e30).has_value());
+    EXPECT_FALSE(Money::FromDouble(std::nan("")).has_value());
+}
+
 TEST(Money, FourDecimalsWithTiesToEven) {
     EXPECT_EQ(Money::FromDouble(1.23456)->raw(), 12346);
     EXPECT_EQ(Money::FromDouble(0.00005)->raw(), 0); // half a unit goes to the even 0

@@ -30,36 +30,6 @@ TEST(ChartList, SavingFromCodesDropsUnknownsAndKeepsDuplicates) {
     EXPECT_EQ(list[2].Code, "CCC   ");
 }
 
-TEST(ChartList, RelinkFollowsTheCodesAndKeepsAListThatWouldEmpty) {
-    kori::test::TempRoot root;
-    Names(root, {"AAA", "BBB", "CCC"});
-    ASSERT_TRUE(SaveListFromCodes(root.folder(), 'A', {"CCC", "AAA"}).ok());
-    ASSERT_TRUE(SaveListFromCodes(root.folder(), 'B', {"BBB"}).ok());
-    Names(root, {"CCC", "AAA"}); // re-sorted, BBB gone
-    kori::platform::NullProgress progress;
-    EXPECT_EQ(RelinkLists(root.folder(), progress), 1);
-    std::vector<ChartListEntry> a, b;
-    ASSERT_TRUE(ReadList(ListPath(root.folder(), 'A'), a).ok());
-    EXPECT_EQ(a[0].NameRecord, 1);
-    EXPECT_EQ(a[1].NameRecord, 2);
-    ASSERT_TRUE(ReadList(ListPath(root.folder(), 'B'), b).ok());
-    ASSERT_EQ(b.size(), 1u) << "an emptied list keeps its stale entry";
-    EXPECT_EQ(b[0].NameRecord, 2);
-}
-
-TEST(ChartList, RelinkStopsOnCancelAndNeedsTwoNames) {
-    kori::test::TempRoot root;
-    Names(root, {"AAA", "BBB"});
-    ASSERT_TRUE(SaveListFromCodes(root.folder(), 'A', {"BBB"}).ok());
-    Names(root, {"BBB", "AAA"});
-    kori::platform::NullProgress progress;
-    progress.RequestCancel();
-    EXPECT_EQ(RelinkLists(root.folder(), progress), 0);
-    Names(root, {"BBB"});
-    progress.ResetCancel();
-    EXPECT_EQ(RelinkLists(root.folder(), progress), 0) << "one name record: nothing is done";
-}
-
 TEST(ChartList, TmpNamesFollowTheListAndSkipEntriesPastTheEnd) {
     kori::test::TempRoot root;
     Names(root, {"AAA", "BBB"});

@@ -7,6 +7,7 @@
 #include "gui/windows/chts.h"
 #include "gui/windows/main_window.h"
 #include "gui/windows/settings_windows.h"
+#include "store/name_file.h"
 
 #include <QApplication>
 #include <QMdiArea>
@@ -40,9 +41,11 @@ ChartWindows::ChartWindows(MainWindow& main) : QObject(&main), m_main(main) {
     });
     // Chart2: the chart on show is split at once; with none on show the next chart comes split.
     connect(&hub, &SettingsHub::SecondChart, this, [this](const QString& code, QChar period) {
-        const auto found = app::FindSecurity(m_main.session(), code.toStdString());
+        platform::Status why;
+        const auto found =
+            store::FindCode(m_main.session().folders.DataFolder, code.toStdString(), why);
         if (!found) return;
-        const app::SecondChart lower{found->second, period.toLatin1()};
+        const app::SecondChart lower{found->Record, period.toLatin1()};
         if (Chts* c = chts(); c && m_chartWindow->isVisible())
             c->ShowSplit(lower);
         else

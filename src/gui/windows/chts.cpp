@@ -6,6 +6,7 @@
 #include "app/window_rules.h"
 #include "chart/number_format.h"
 #include "chart/saved_chart.h"
+#include "chart/screen_player.h"
 #include "chart/swing.h"
 #include "gui/paint/qt_surface.h"
 #include "gui/services/qt_printer.h"
@@ -619,8 +620,13 @@ void Chts::SaveChartDialog() {
 
 bool Chts::DisplaySavedChart(const std::string& chosen) {
     if (chosen.empty()) return false;
+    // The stream is played whole: the oscillator panel lies inside the area as it was built;
+    // a stream from a taller area (another program's page) gets the height it reaches.
     const QSize size = AreaSize();
-    ImageSurface area(size.width(), size.height());
+    const chart::StreamReach reach =
+        chart::MeasureStream(platform::ResolvePath(platform::NormalisePath(chosen)));
+    const int height = std::max(size.height(), static_cast<int>(std::ceil(reach.Bottom)) + 1);
+    ImageSurface area(size.width(), height);
     const bool shown = chart::DisplaySavedChart(chosen, area, m_session.palette, m_session.fonts,
                                                 m_session.dialogs());
     const QImage& picture = area.Finish();

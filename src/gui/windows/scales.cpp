@@ -3,6 +3,7 @@
 #include "app/chart_service.h"
 #include "app/window_rules.h"
 #include "platform/text.h"
+#include "store/name_file.h"
 
 #include <QFormLayout>
 #include <QLabel>
@@ -31,17 +32,18 @@ Scales::Scales(app::Session& session, SettingsHub& hub, const std::string& code,
 
 bool Scales::Lookup() {
     const std::string code = platform::Upper(platform::Trim(S(m_code->text())));
-    const auto found = app::FindSecurity(m_session, code);
-    if (!found) {
+    platform::Status why;
+    const auto found = store::FindCode(m_session.folders.DataFolder, code, why);
+    if (!why || !found) {
         m_record = 0;
-        dialogs().MsgBox("No record on file for that code", "Change Scales");
+        dialogs().MsgBox(why ? "No record on file for that code" : why.message(), "Change Scales");
         return false;
     }
-    m_record = found->first;
+    m_record = found->RecordNumber;
     m_code->setText(Q(code));
-    m_base->setText(SingleText(found->second.Base));
-    m_top->setText(SingleText(found->second.Top));
-    m_pf->setText(SingleText(found->second.PFIncrement));
+    m_base->setText(SingleText(found->Record.Base));
+    m_top->setText(SingleText(found->Record.Top));
+    m_pf->setText(SingleText(found->Record.PFIncrement));
     return true;
 }
 

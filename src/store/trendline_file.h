@@ -2,6 +2,7 @@
 // <code>.TND: the trendlines of one security, fixed 27-byte records in the chart folder. A
 // deleted record stays in place with a blank period and is reused; packing drops them.
 #include "platform/status.h"
+#include "store/record_file.h"
 
 #include <array>
 #include <cstdint>
@@ -10,7 +11,7 @@
 #include <string_view>
 #include <vector>
 
-namespace kori::chart {
+namespace kori::store {
 
 struct TrendRecord {
     std::int16_t LineKind = 0;
@@ -27,11 +28,13 @@ struct TrendRecord {
     static TrendRecord Blank();
 };
 
-class TrendlineFile {
+class TrendlineFile : public RecordFile<TrendRecord> {
 public:
+    using RecordFile::RecordFile;
     // Path of the file of a code in the chart folder.
     static std::filesystem::path PathFor(std::string_view chartFolder, std::string_view code);
 
+    // Every record, deleted ones included; empty when the file is absent or cannot be read.
     static std::vector<TrendRecord> ReadAll(const std::filesystem::path& path);
     // Writes the record at the next free place: the first deleted record, else the end.
     // Returns the 1-based record number written.
@@ -47,4 +50,4 @@ public:
     static platform::Status Pack(const std::filesystem::path& path);
 };
 
-} // namespace kori::chart
+} // namespace kori::store

@@ -1,0 +1,47 @@
+#include "cli/run_kori.h"
+
+#include "cli/cli_context.h"
+
+#include <CLI/CLI.hpp>
+
+#include <ostream>
+
+namespace kori::cli {
+
+int RunKori(int argc, const char* const* argv, std::ostream& out, std::ostream& err) {
+    CLI::App app{"kori - KORI Charting from the command line"};
+    app.require_subcommand(1);
+    app.fallthrough(); // global options may follow the subcommand: kori names --root DIR
+    app.set_version_flag("--version", "kori 8.0");
+    CliContext ctx(out, err);
+    app.add_option("--root", ctx.root,
+                   "Install root (holds Kori.ini); default $KORI_ROOT or ~/.local/share/kori")
+        ->option_text("DIR");
+    app.add_option("--data", ctx.data, "Data folder to use instead of the one in Kori.ini")
+        ->option_text("DIR");
+
+    AddInitCommand(app, ctx);
+    AddNamesCommand(app, ctx);
+    AddBarsCommand(app, ctx);
+    AddListsCommand(app, ctx);
+    AddPlayCommand(app, ctx);
+    AddChartCommand(app, ctx);
+    AddScaleCommand(app, ctx);
+    AddIndicatorCommand(app, ctx);
+
+    try {
+        app.parse(argc, argv);
+    } catch (const CLI::ParseError& e) {
+        return app.exit(e, out, err);
+    } catch (const CliError& e) {
+        err << "kori: " << e.message << "\n";
+        return e.exitCode;
+    } catch (const std::exception& e) {
+        err << "kori: " << e.what() << "\n";
+        return 1;
+    }
+    out.flush();
+    return 0;
+}
+
+} // namespace kori::cli

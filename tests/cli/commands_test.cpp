@@ -1,0 +1,220 @@
+// The kori commands run in-process over one sample library: their output and exit status.
+#include "cli/kori_run.h"
+#include "support/temp_root.h"
+
+#include <gtest/gtest.h>
+#include <nlohmann/json.hpp>
+
+#include <fstream>
+
+namespace kori::test {
+namespace {
+
+using json = nlohmann::ordered_json;
+
+std::string ReadFile(const std::filesystem::path& p) {
+    std::ifstream in(p, std::ios::binary);
+    return {std::istreambuf_iterator<char>(in), {}};
+}
+
+int CountLinesStarting(const std::string& text, const std::string& prefix) {
+    int n = 0;
+    std::istringstream in(text);
+    for (std::string line; std::getline(in, line);)
+        if (line.rfind(prefix, 0) == 0) ++n;
+    return n;
+}
+
+std::vector<std::string> Keys(const json& object) {
+    std::vector<std::string> keys;
+    for (auto it = object.begin(); it != object.end(); ++it)
+        keys.push_back(it.key());
+    return keys;
+}
+
+class KoriCommands : public testing::Test {
+protected:
+    static void SetUpTestSuite() {
+        s_dir = new TempRoot;
+        const auto r = RunKoriWith({"init", "--sample", "--root", Root()});
+        ASSERT_EQ(r.status, 0) << r.err;
+        ASSERT_NE(r.out.find("Sample library: "), std::string::npos) << r.out;
+    }
+    static void TearDownTestSuite() {
+        delete s_dir;
+        s_dir = nullptr;
+    }
+    static std::string Root() { return (s_dir->path() / "k").string(); }
+    static std::string Out(const std::string& name) { return (s_dir->path() / name).string(); }
+
+    // The command with --root of the sample library.
+    static KoriResult Kori(std::vector<std::string> args) {
+        args.push_back("--root");
+        args.push_back(Root());
+        return RunKoriWith(std::move(args));
+    }
+    // The stream of one chart build, as --stream copies it.
+    static std::string Stream(std::vector<std::string> args) {
+        const auto path = Out("s.cht");
+        std::filesystem::remove(path);
+        args.insert(args.begin(), {"chart", "KRM", "--stream", path});
+        const auto r = Kori(args);
+        EXPECT_EQ(r.status, 0) << r.err;
+        return ReadFile(path);
+    }
+
+    static TempRoot* s_dir;
+};
+TempRoot* KoriCommands::s_dir = nullptr;
+
+TEST_F(KoriCommands, NamesInThreeFormats) {
+    const auto codes = Kori({"names", "--codes"});
+    ASSERT_EQ(codes.status, 0);
+    EXPECT_GE(std::count(codes.out.begin(), codes.out.end(), '\n'), 40);
+    const auto asJson = Kori({"names", "--json"});
+    ASSERT_EQ(asJson.status, 0);
+    const auto names = json::parse(asJson.out);
+    ASSERT_TRUE(names.is_array());
+    EXPECT_EQ(Keys(names.at(0)), (std::vector<std::string>{
+                                     "record", "status", "code", "type", "name", "other_details",
+                                     "base", "top", "pf_increment", "scale_step", "percent_band_up",
+                                     "percent_band_down", "bollinger_period", "bollinger_width",
+                                     "category", "id", "industry_class", "gics_sector"}));
+    bool xao = false;
+    for (const auto& n : names)
+        xao = xao || n.at("code") == "XAO";
+    EXPECT_TRUE(xao);
+    const auto table = Kori({"names"});
+    ASSERT_EQ(table.status, 0);
+    EXPECT_EQ(table.out.rfind("  Rec  Code   Type  Name", 0), 0u) << table.out;
+    EXPECT_NE(table.out.find(" securities in "), std::string::npos);
+}
+
+TEST_F(KoriCommands, BarsKeepTheirFieldsAndRefuseBadRanges) {
+    const auto r = Kori({"bars", "XAO", "--period", "W", "--first", "1500", "--json"});
+    ASSERT_EQ(r.status, 0) << r.err;
+    const auto bars = json::parse(r.out);
+    EXPECT_EQ(Keys(bars), (std::vector<std::string>{"code", "period", "first_record", "last_record",
+                                                    "last_bar", "highest_price", "lowest_price",
+                                                    "highest_volume", "lowest_volume",
+                                                    "average_volume", "volumes_present", "bars"}));
+    EXPECT_EQ(bars.at("bars").back().at("date").get<std::string>().substr(0, 7), "2026112");
+
+    const auto table = Kori({"bars", "krm", "--last", "3"});
+    ASSERT_EQ(table.status, 0);
+    EXPECT_NE(table.out.find("records 1 to 3, 3 bars"), std::string::npos) << table.out;
+
+    const auto unknown = Kori({"bars", "NOSUCH"});
+    EXPECT_EQ(unknown.status, 1);
+    EXPECT_EQ(unknown.err, "kori: No File For That Name: NOSUCH\n");
+    EXPECT_TRUE(unknown.out.empty());
+    EXPECT_NE(Kori({"bars", "KRM", "--first", "0"}).status, 0);
+}
+
+TEST_F(KoriCommands, ListsShowNamesAndCodes) {
+    const auto r = Kori({"lists"});
+    ASSERT_EQ(r.status, 0);
+    EXPECT_NE(r.out.find("A  Banks and Finance: HBK"), std::string::npos) << r.out;
+    const auto asJson = json::parse(Kori({"lists", "--json"}).out);
+    ASSERT_EQ(asJson.size(), 11u); // lists A to K
+    EXPECT_EQ(Keys(asJson.at(0)), (std::vector<std::string>{"list", "name", "codes"}));
+}
+
+TEST_F(KoriCommands, ScaleNeedsNoLibrary) {
+    const auto r = RunKoriWith({"scale", "--high", "12.34", "--low", "9.8", "--json"});
+    ASSERT_EQ(r.status, 0);
+    EXPECT_EQ(Keys(json::parse(r.out)),
+              (std::vector<std::string>{"chart_base", "chart_ceiling", "grid_step", "grid_count"}));
+    const auto text = RunKoriWith({"scale", "--high", "12.34", "--low", "9.8"});
+    EXPECT_EQ(text.out.rfind("Base ", 0), 0u);
+}
+
+TEST_F(KoriCommands, UsageErrorsAndMissingLibraries) {
+    const auto none = RunKoriWith({"names", "--root", Out("none")});
+    EXPECT_EQ(none.status, 1);
+    EXPECT_NE(none.err.find("kori init --sample --root"), std::string::npos) << none.err;
+    const auto noCommand = RunKoriWith({});
+    EXPECT_NE(noCommand.status, 0);
+    const auto badStyle = Kori({"chart", "KRM", "--style", "Z"});
+    EXPECT_NE(badStyle.status, 0);
+    EXPECT_FALSE(badStyle.err.empty());
+    const auto version = RunKoriWith({"--version"});
+    EXPECT_EQ(version.status, 0);
+    EXPECT_EQ(version.out, "kori 8.0\n");
+}
+
+TEST_F(KoriCommands, ChartWritesEveryOutputAndItsNumbers) {
+    const auto r = Kori({"chart", "krm", "--png", Out("a.png"), "--pdf", Out("a.pdf"), "--svg",
+                         Out("a.svg"), "--stream", Out("a.cht"), "--json"});
+    ASSERT_EQ(r.status, 0) << r.err;
+    EXPECT_EQ(Keys(json::parse(r.out)),
+              (std::vector<std::string>{"first_record", "last_record", "last_bar", "plot_left",
+                                        "plot_right", "plot_top", "plot_bottom", "chart_base",
+                                        "chart_ceiling", "grid_step", "grid_count", "max_high",
+                                        "min_low"}));
+    EXPECT_EQ(ReadFile(Out("a.png")).substr(1, 3), "PNG");
+    EXPECT_EQ(ReadFile(Out("a.pdf")).substr(0, 4), "%PDF");
+    EXPECT_NE(ReadFile(Out("a.svg")).find("<svg"), std::string::npos);
+    EXPECT_NE(ReadFile(Out("a.cht")).find("KRM"), std::string::npos);
+    EXPECT_EQ(RunKoriWith({"play", Out("a.cht"), "--png", Out("b.png")}).status, 0);
+
+    const auto daily = json::parse(Kori({"chart", "KRM", "--json"}).out);
+    const auto weekly = json::parse(Kori({"chart", "KRM", "--period", "W", "--json"}).out);
+    EXPECT_LT(weekly.at("last_bar").get<int>(), daily.at("last_bar").get<int>());
+    const auto unknown = Kori({"chart", "NOSUCH", "--json"});
+    EXPECT_EQ(unknown.status, 1);
+    EXPECT_TRUE(unknown.out.empty());
+}
+
+TEST_F(KoriCommands, OverlaysAddTheirLines) {
+    const int plain = CountLinesStarting(Stream({}), "L,");
+    const auto averages = Stream({"--ma1", "10", "--ma2", "30"});
+    EXPECT_GT(CountLinesStarting(averages, "L,"), plain + 300);
+    EXPECT_GT(CountLinesStarting(averages, "H,"), CountLinesStarting(Stream({}), "H,"));
+    const auto para = Stream({"--ma1", "10", "--para"});
+    EXPECT_EQ(CountLinesStarting(para, "L,"), plain) << "averages drawn under the parabolic";
+    EXPECT_GT(CountLinesStarting(para, "K,"), 0);
+    EXPECT_NE(para.find("Parabolic last stop : "), std::string::npos);
+    EXPECT_GT(CountLinesStarting(Stream({"--bands", "bollinger"}), "L,"), plain + 300);
+    EXPECT_GT(CountLinesStarting(Stream({"--mma"}), "L,"), plain + 3000);
+    EXPECT_NE(Stream({"--swing", "NORM"}).find("Daily Swing  -  Standard"), std::string::npos);
+    EXPECT_NE(Stream({"--swing", "XDay:5"}).find("Daily Swing 5 - DAY"), std::string::npos);
+    const auto refused = Kori({"chart", "KRM", "--swing", "XDay:31"});
+    EXPECT_NE(refused.status, 0);
+    EXPECT_NE(refused.err.find("Incorrect values entered"), std::string::npos) << refused.err;
+    const auto pf = Stream({"--style", "P", "--reversal", "3", "--box-value", "0.05"});
+    EXPECT_NE(pf.find("Box Value = 0.05"), std::string::npos);
+    EXPECT_GT(CountLinesStarting(pf, "X,"), 0);
+}
+
+TEST_F(KoriCommands, SplitChartHasBothTitlesAndRefusesWhatCannotSplit) {
+    const auto r = Kori(
+        {"chart", "alx", "--split", "krm:w", "--pdf", Out("s.pdf"), "--stream", Out("split.cht")});
+    ASSERT_EQ(r.status, 0) << r.err;
+    const auto stream = ReadFile(Out("split.cht"));
+    EXPECT_EQ(CountLinesStarting(stream, "T, 9.75, 20, 12,ALX,"), 1);
+    EXPECT_EQ(CountLinesStarting(stream, "T, 9.75, 20, 359,KRM,"), 1);
+    EXPECT_NE(stream.find("WEEKLY - "), std::string::npos);
+    for (const std::vector<std::string> bad : {std::vector<std::string>{"--split", "NOSUCH"},
+                                               {"--split", "KRM:X"},
+                                               {"--split", "KRM", "--style", "P"},
+                                               {"--split", "KRM", "--osc", "RSI"}}) {
+        std::vector<std::string> args{"chart", "ALX", "--json"};
+        args.insert(args.end(), bad.begin(), bad.end());
+        const auto refused = Kori(args);
+        EXPECT_NE(refused.status, 0) << bad[1];
+        EXPECT_TRUE(refused.out.empty()) << bad[1];
+    }
+}
+
+TEST_F(KoriCommands, IndicatorHeadersAndRefusals) {
+    const auto r = Kori({"indicator", "MACD", "KRM", "--first", "11", "--last", "260", "--csv"});
+    ASSERT_EQ(r.status, 0) << r.err;
+    EXPECT_EQ(r.out.substr(0, r.out.find('\n')), "index,date,ema1,ema2,macd,signal");
+    EXPECT_EQ(std::count(r.out.begin(), r.out.end(), '\n'), 251);
+    EXPECT_NE(Kori({"indicator", "RSI", "KRM", "--set", "NoSuchKey=1", "--csv"}).status, 0);
+    EXPECT_NE(Kori({"indicator", "RSI", "KRM"}).status, 0) << "no --csv";
+}
+
+} // namespace
+} // namespace kori::test
