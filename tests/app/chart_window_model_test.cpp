@@ -227,10 +227,10 @@ TEST_F(Model, AGarbagePriceFileTellsTheUserWhyNoChartShows) {
     const auto size = platform::FileSizeOr0(path);
     ASSERT_GT(size, 0u);
     {
-        // Garbage whose every float reads as infinity: no scale can be made from it.
+        // Garbage whose every float reads as the largest float there is: no scale spans it.
         std::string bytes;
         while (bytes.size() < size)
-            bytes += std::string("\x00\x00\x80\x7f", 4);
+            bytes += std::string("\xff\xff\x7f\x7f", 4);
         std::ofstream out(path, std::ios::binary | std::ios::trunc);
         out << bytes.substr(0, static_cast<std::size_t>(size));
     }

@@ -28,6 +28,7 @@
 #include <QLineEdit>
 #include <QMdiArea>
 #include <QMdiSubWindow>
+#include <QMenuBar>
 #include <QPointer>
 #include <QPrinter>
 #include <QScrollBar>
@@ -617,10 +618,10 @@ TEST_F(Road, AGarbagePriceFileSaysWhyTheChartAreaIsBlank) {
     const auto path = store::PriceFile::PathFor(s.session.folders.DataFolder, "KRM");
     const auto size = platform::FileSizeOr0(path);
     {
-        // Garbage whose every float reads as infinity: no scale can be made from it.
+        // Garbage whose every float reads as the largest float there is: no scale spans it.
         std::string bytes;
         while (bytes.size() < size)
-            bytes += std::string("\x00\x00\x80\x7f", 4);
+            bytes += std::string("\xff\xff\x7f\x7f", 4);
         std::ofstream out(path, std::ios::binary | std::ios::trunc);
         out << bytes.substr(0, static_cast<std::size_t>(size));
     }
@@ -735,4 +736,17 @@ TEST_F(Road, TheScreenShowsThePictureTheSharedBuildMakesForAFile) {
     chart::Chart c;
     ASSERT_TRUE(app::BuildChartWithPanel(s.session, job, c, file).Status.ok());
     EXPECT_TRUE(file.Finish() == shown) << "a PNG of the same size is the picture on screen";
+}
+
+TEST_F(Road, AMaximisedChartAddsNoSecondToolsMenu) {
+    TypeCode("krm");
+    auto* bar = chts()->findChild<QMenuBar*>();
+    ASSERT_NE(bar, nullptr);
+    QStringList titles;
+    for (QAction* a : bar->actions())
+        titles << a->text();
+    EXPECT_FALSE(titles.contains(QStringLiteral("&Tools"))) << titles.join(' ').toStdString();
+    EXPECT_TRUE(titles.contains(QStringLiteral("&Lines")));
+    // The tool lines menu still holds what it held.
+    EXPECT_NE(chts()->findChild<QAction*>(QStringLiteral("cmRemoveTrendlines")), nullptr);
 }

@@ -308,12 +308,15 @@ TEST_F(Lists, IndustryClassesAreCheckedCellByCellAndWrittenBackOnClose) {
     EXPECT_EQ(store::ClassNameOf(sys(), "990"), "Other");
     delete w;
 
-    // Display reads the file again and forgets edits.
+    // Display reads the file again, forgets edits, and says what it read.
     gui::IndClass again(s.session);
     Edit(again.grid(), 0, 1, "Changed");
+    again.statusLine()->clear();
     again.findChild<QAction*>("mnuDisplay")->trigger();
     EXPECT_EQ(Cell(again.grid(), 0, 1), "Base Metals");
     EXPECT_FALSE(again.changed());
+    EXPECT_EQ(again.statusLine()->text(),
+              QStringLiteral("%1 rows read from IndClass.dat").arg(again.grid()->rowCount()));
 
     const auto pdf = s.root.path() / "classes.pdf";
     QPrinter printer(QPrinter::HighResolution);
