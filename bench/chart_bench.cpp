@@ -38,7 +38,7 @@ void BM_DrawLoadedChart(benchmark::State& state) {
         if (!chart::DrawLoadedChart(c, in, g, s.dialogs, s.surface))
             state.SkipWithError("draw failed");
     }
-    c.Stream.Close();
+    (void)c.Stream.Close();
 }
 BENCHMARK(BM_DrawLoadedChart)->Unit(benchmark::kMicrosecond);
 
@@ -55,7 +55,7 @@ void BM_DrawLoadedChartNullSurface(benchmark::State& state) {
     for (auto _ : state)
         if (!chart::DrawLoadedChart(c, in, g, s.dialogs, surface))
             state.SkipWithError("draw failed");
-    c.Stream.Close();
+    (void)c.Stream.Close();
 }
 BENCHMARK(BM_DrawLoadedChartNullSurface)->Unit(benchmark::kMicrosecond);
 

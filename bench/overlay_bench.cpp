@@ -39,7 +39,8 @@ void BM_SwingChartBuild(benchmark::State& state) {
     Setup s;
     s.request.SwingOn = true;
     s.request.BarSpacing = 3;
-    s.request.SwingMethod = state.range(0) == 0 ? "NORM" : "XPointAuto";
+    s.request.SwingMethod =
+        state.range(0) == 0 ? chart::SwingMethod::Norm : chart::SwingMethod::XPointAuto;
     s.request.SwingPanel =
         state.range(0) == 0 ? chart::SidePanel::None : chart::SidePanel::XPointAuto;
     RunBuild(state, s);
@@ -70,7 +71,7 @@ void BM_Overlays(benchmark::State& state) {
         chart::DrawChartOverlays(p);
     }
     state.counters["calls"] = static_cast<double>(s.surface.calls().size());
-    c.Stream.Close();
+    (void)c.Stream.Close();
 }
 BENCHMARK(BM_Overlays)->Arg(0)->Arg(1)->Unit(benchmark::kMicrosecond);
 

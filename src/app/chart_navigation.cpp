@@ -1,8 +1,8 @@
 #include "app/chart_navigation.h"
 
-#include "chart/number_format.h"
 #include "platform/date_text.h"
 #include "platform/files.h"
+#include "platform/number_format.h"
 #include "platform/text.h"
 #include "store/classifications.h"
 #include "store/name_file.h"
@@ -142,12 +142,12 @@ int BarUnder(const chart::Chart& chart, double x) {
 
 std::string ReadoutPrice(double price) {
     if (price == 0) return {};
-    return platform::Trim(chart::FormatNumber(price, "#####.00#"));
+    return platform::Trim(platform::Format(price, "#####.00#", platform::ZeroSign::Dropped));
 }
 
 namespace {
 std::string Volume(double v) {
-    return platform::Trim(chart::FormatNumber(v, "###0"));
+    return platform::Trim(platform::Format(v, "###0", platform::ZeroSign::Dropped));
 }
 } // namespace
 

@@ -46,9 +46,7 @@ private:
 };
 
 // Record types 1 to 3 are close-only: they chart as lines whatever the style asked.
-inline bool IsCloseOnly(int recordType) {
-    return recordType >= 1 && recordType <= 3;
-}
+using store::IsCloseOnly;
 
 // The next-chart command: steps `ListPosition` by `delta` (+1 "fwd", -1 "rev", 0 "ref") with a
 // wrap at both ends and reads the record; nullopt when the list is empty. Close-only types are

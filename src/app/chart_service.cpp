@@ -16,6 +16,7 @@ std::filesystem::path TempFolder(const Session& session) {
 }
 
 std::filesystem::path ChartStreamPath(const Session& session) {
+    if (!session.chartStream.empty()) return session.chartStream;
     return TempFolder(session) / "TCht.Tmp";
 }
 

@@ -2,9 +2,9 @@
 
 #include "app/chart_window_tools.h"
 #include "chart/chart_tools.h"
-#include "chart/number_format.h"
 #include "platform/date_text.h"
 #include "platform/files.h"
+#include "platform/number_format.h"
 #include "platform/text.h"
 
 #include <algorithm>
@@ -276,7 +276,9 @@ ChartEffects ChartWindowModel::FibonacciClick(double x, double y) {
     m_clickStage = 0;
     const auto levels = chart::FibonacciLevels(m_fibStart, price);
     const double rise = price - m_fibStart;
-    const std::string riseText = "Rise   " + platform::Trim(chart::FormatNumber(rise, "#####.00#"));
+    const std::string riseText =
+        "Rise   " +
+        platform::Trim(platform::Format(rise, "#####.00#", platform::ZeroSign::Dropped));
     if (levels.empty()) {
         // A fall ends the tool with no lines; the panes say how to draw one.
         fx.Panes = std::vector<std::string>{"Start  " + ReadoutPrice(m_fibStart),

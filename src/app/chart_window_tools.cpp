@@ -19,7 +19,7 @@ void AppendShape(const std::filesystem::path& path, char letter, const chart::Se
     chart::StreamWriter w;
     if (!w.Open(path, true)) return;
     w.Shape(letter, s.x1, s.y1, s.x2, s.y2, colour);
-    w.Close();
+    (void)w.Close();
 }
 
 platform::Colour Entry(const Session& session, int entry) {

@@ -14,10 +14,25 @@ using platform::Status;
 
 namespace {
 
-// Palette numbers of the built-in role colours, entries 16 to 44 in turn.
-constexpr std::array<int, 29> kBuiltInRoles = {3,  0,  15, 14, 10, 12, 14, 2,  6,  13,
-                                               14, 7,  4,  12, 10, 11, 14, 2,  11, 8,
-                                               10, 11, 10, 11, 14, 14, 6,  12, 10};
+// Palette numbers of the built-in role colours, entries 16 to 48 in turn, by scheme. Black is
+// the table every install starts with (16 to 44 as given; 45 to 48, the oscillator lines, as
+// the starting palette has them). White and Blue keep each role in a colour that shows on their
+// background: dark inks on white, light ones on blue.
+using SchemeRoles = std::array<int, platform::kPaletteSize - kFirstRole>;
+constexpr SchemeRoles kBlackRoles = {3,  0,  15, 14, 10, 12, 14, 2,  6,  13, 14,
+                                     7,  4,  12, 10, 11, 14, 2,  11, 8,  10, 11,
+                                     10, 11, 14, 14, 6,  12, 10, 10, 14, 11, 13};
+constexpr SchemeRoles kWhiteRoles = {1, 15, 0, 6, 2, 4, 1, 5, 6, 8, 1, 0, 4, 12, 2, 3, 5,
+                                     9, 3,  7, 2, 3, 2, 3, 4, 5, 6, 4, 1, 1, 4,  2, 5};
+constexpr SchemeRoles kBlueRoles = {11, 1,  15, 14, 10, 12, 11, 14, 13, 8,  14,
+                                    15, 12, 12, 10, 11, 14, 13, 11, 8,  10, 11,
+                                    10, 11, 14, 14, 13, 12, 10, 10, 14, 11, 13};
+
+const SchemeRoles& BuiltInRoles(std::string_view fileName) {
+    if (fileName == "koriclr.WHT") return kWhiteRoles;
+    if (fileName == "koriclr.BLU") return kBlueRoles;
+    return kBlackRoles;
+}
 
 // A whole number that fits a colour value (negative values are kept as their 32-bit form).
 std::optional<platform::Colour> ColourNumber(const std::string& line) {
@@ -129,9 +144,10 @@ Status ApplyColourScheme(std::string_view scheme, const std::string& systemFolde
         palette[i] = platform::kStandardColours[i];
     const auto schemeFile = platform::ResolveIn(systemFolder, *name);
     if (!platform::FileExists(schemeFile) || !ReadColourFile(schemeFile.string(), palette)) {
-        for (std::size_t i = 0; i < kBuiltInRoles.size(); ++i)
+        const SchemeRoles& roles = BuiltInRoles(*name);
+        for (std::size_t i = 0; i < roles.size(); ++i)
             palette[kFirstRole + i] =
-                platform::kStandardColours[static_cast<std::size_t>(kBuiltInRoles[i])];
+                platform::kStandardColours[static_cast<std::size_t>(roles[i])];
     }
     return WriteColourFile(platform::ResolveIn(systemFolder, "koriclr.dat").string(), palette);
 }

@@ -34,8 +34,9 @@ platform::Status WriteColourFile(const std::string& path, const platform::Palett
 std::optional<std::string> SchemeFileName(std::string_view scheme);
 
 // Applies a scheme: the standard colours into 0 to 15, then the scheme file from the
-// SystemFolder when there is one, else the built-in role colours for 16 to 44; then writes
-// koriclr.dat. Entries the scheme does not give keep their values.
+// SystemFolder when there is one, else the scheme's built-in role colours for 16 to 48 (a
+// black, a white and a blue background); then writes koriclr.dat. Entries a scheme file does
+// not give keep their values.
 platform::Status ApplyColourScheme(std::string_view scheme, const std::string& systemFolder,
                                    platform::Palette& palette);
 // "SAVE DEFAULT COLOURS": the current table becomes the scheme's file.

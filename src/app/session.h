@@ -61,6 +61,9 @@ public:
     PrinterColours printer;
     CommandLineSwitches switches;
     bool pathsMissing = false; // set when the SystemFolder is blank, until paths are saved
+    // The stream the charts of this session write; empty: TCht.Tmp of the temporary folder, the
+    // desktop program's own. A command-line run sets a private one so runs never share it.
+    std::filesystem::path chartStream;
 
     // Reads the paths: the folder keys of Kori.ini (keys that read "unknown" take the defaults
     // below the install root), the [Download] keys, and for DataService 3 the data folders of

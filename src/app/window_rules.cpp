@@ -94,39 +94,26 @@ void SetStopLoss(chart::ChartDefaults& d, bool on, float percent) {
     d.StopPercentOn = percent > 0;
 }
 
-const std::array<std::string_view, 4>& SwingMethods() {
-    static constexpr std::array<std::string_view, 4> methods = {"NORM", "XDay", "XPoint",
-                                                                "XPointAuto"};
-    return methods;
-}
-
-float DefaultSwingValue(std::string_view method) {
-    return method == "XDay" ? 3.0f : 9.0f;
-}
-
 SwingSettings ReadSwingSettings(const platform::IniFile& ini) {
     SwingSettings s;
-    const std::string method = Trim(ini.Read("Charts", "SwingMethod"));
-    for (const auto m : SwingMethods())
-        if (platform::EqualsNoCase(method, m)) s.SwingMethod = std::string(m);
+    s.SwingMethod = chart::ParseSwingMethod(ini.Read("Charts", "SwingMethod"))
+                        .value_or(chart::SwingMethod::Norm);
     const std::string value = Trim(ini.Read("Charts", "SwingValue"));
     const float v = static_cast<float>(platform::Val(value));
-    s.SwingValue = (value == platform::kUnknown || !(v > 0)) ? DefaultSwingValue(s.SwingMethod) : v;
+    s.SwingValue = chart::SwingValueOf(s.SwingMethod, value == platform::kUnknown ? 0.0f : v);
     return s;
 }
 
 void WriteSwingSettings(platform::IniFile& ini, const SwingSettings& s) {
-    (void)ini.Write("Charts", "SwingMethod", s.SwingMethod);
+    (void)ini.Write("Charts", "SwingMethod", chart::SwingMethodName(s.SwingMethod));
     (void)ini.Write("Charts", "SwingValue", platform::FloatText(s.SwingValue));
 }
 
-std::optional<Refusal> SwingValueProblem(std::string_view method, std::string_view text) {
-    const Refusal refusal{"Incorrect values entered", "Swing"};
-    if (method == "NORM" || method == "XPointAuto") return std::nullopt; // no value is used
+std::optional<Refusal> SwingValueProblem(chart::SwingMethod method, std::string_view text) {
+    if (!chart::SwingMethodTakesValue(method)) return std::nullopt; // no value is used
     const auto v = TypedNumber(text);
-    if (!v || *v < 1) return refusal;
-    if (method == "XDay" && *v > 30) return refusal;
-    return std::nullopt;
+    if (v && chart::SwingValueValid(method, static_cast<float>(*v))) return std::nullopt;
+    return Refusal{std::string(chart::kSwingRefusal), std::string(chart::kSwingTitle)};
 }
 
 std::optional<Refusal> ScalesProblem(const ScaleFields& fields) {

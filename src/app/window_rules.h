@@ -5,6 +5,7 @@
 // multi-oscillator sets. The windows only show fields and pass them here.
 #include "app/session.h"
 #include "chart/chart_defaults.h"
+#include "chart/swing_method.h"
 #include "platform/dialogs.h"
 #include "platform/settings_store.h"
 
@@ -58,16 +59,13 @@ void SetStopLoss(chart::ChartDefaults& d, bool on, float percent);
 
 // The swing settings the swing window edits, kept in [Charts] "SwingMethod" and "SwingValue".
 struct SwingSettings {
-    std::string SwingMethod = "NORM"; // "NORM", "XDay", "XPoint", "XPointAuto"
-    float SwingValue = 3;             // days for "XDay", points for "XPoint"
+    chart::SwingMethod SwingMethod = chart::SwingMethod::Norm;
+    float SwingValue = 3; // days for "XDay", points for "XPoint"
 };
-const std::array<std::string_view, 4>& SwingMethods();
 SwingSettings ReadSwingSettings(const platform::IniFile& ini);
 void WriteSwingSettings(platform::IniFile& ini, const SwingSettings& s);
-// The value a method starts with when the user switches to it: 3 days, 9 points.
-float DefaultSwingValue(std::string_view method);
-// "Incorrect values entered" under "Swing": "XDay" below 1 or above 30, "XPoint" below 1.
-std::optional<Refusal> SwingValueProblem(std::string_view method, std::string_view text);
+// "Incorrect values entered" under "Swing" for a typed value the method refuses.
+std::optional<Refusal> SwingValueProblem(chart::SwingMethod method, std::string_view text);
 
 // Scales: the base, top and box value of a name record. Numbers of 0 or more; a base and top
 // both set must have the top above the base. Saving writes the record back with ScaleStep

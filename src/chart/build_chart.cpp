@@ -16,7 +16,7 @@ class BuildScope {
 public:
     BuildScope(platform::Dialogs& d, Chart& c) : m_d(d), m_c(c) { m_d.SetBusy(true); }
     ~BuildScope() {
-        m_c.Stream.Close();
+        (void)m_c.Stream.Close();
         m_d.SetBusy(false);
     }
     BuildScope(const BuildScope&) = delete;
@@ -99,7 +99,9 @@ platform::Status BuildOneChart(Chart& c, const ChartBuild& b, PriceSource& sourc
     if (b.DrawOverlays) b.DrawOverlays(c, b.Request, surface);
     if (b.Page && !b.Page->Known)
         WorkOutPrinterMargins(*b.Page, c.AreaWidth, c.AreaHeight, b.Defaults.PrintScale);
-    return platform::Status::Ok();
+    // A chart whose stream is torn cannot be printed, saved or played: the build failed.
+    if (c.RedrawOnly || b.StreamPath.empty()) return platform::Status::Ok();
+    return c.Stream.Close();
 }
 
 ChartBuild WithRequest(const ChartBuild& b, const ChartRequest& r, const ChartName& name) {

@@ -1,13 +1,12 @@
 #pragma once
 // The chart request: what chart selection asks for and what the chart window changes while a
 // chart is on show. The builder reads it; it never writes it except to finish a split.
+#include "chart/swing_method.h"
+
 #include <cstdint>
 #include <string>
 
 namespace kori::chart {
-
-// How a swing or point-and-figure panel shares the chart area with the bars.
-enum class SidePanel { None, XPointAuto, Other };
 
 struct ChartRequest {
     // Filled by chart selection (fields marked * are also changed by the chart window).
@@ -43,11 +42,11 @@ struct ChartRequest {
     std::string AverageName1 = "unknown";
     std::string AverageName2 = "unknown";
     // Overlays the chart window turns on and off.
-    bool MMAOn = false;               // twelve averages replace the two
-    bool PFAuto = false;              // point-and-figure box value follows the range on show
-    bool SwingOn = false;             // swing lines drawn with the bars
-    std::string SwingMethod = "NORM"; // "NORM", "XDay", "XPoint", "XPointAuto"
-    float SwingValue = 0;             // days (XDay) or points (XPoint); 0 takes 3 or 9
+    bool MMAOn = false;   // twelve averages replace the two
+    bool PFAuto = false;  // point-and-figure box value follows the range on show
+    bool SwingOn = false; // swing lines drawn with the bars
+    chart::SwingMethod SwingMethod = chart::SwingMethod::Norm;
+    float SwingValue = 0; // days (XDay) or points (XPoint); 0 takes 3 or 9
 };
 
 } // namespace kori::chart

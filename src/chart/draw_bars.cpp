@@ -1,9 +1,9 @@
 #include "chart/draw_bars.h"
 
 #include "chart/draw_date_axis.h"
-#include "chart/number_format.h"
 #include "chart/price_source.h"
 #include "chart/swing.h"
+#include "platform/number_format.h"
 #include "platform/text.h"
 
 #include <array>
@@ -53,7 +53,9 @@ struct StopLoss {
         } else if (Stop > 0) {
             const std::int16_t y = c.PriceToY(Stop);
             p.screen.Line(StopX, y, c.PlotRight, y, p.Col(pal::StopLine));
-            const std::string text = "Current Stop Loss : " + FormatNumber(Stop, "0.00#");
+            const std::string text =
+                "Current Stop Loss : " +
+                platform::FormatSingle(Stop, "0.00#", platform::ZeroSign::Dropped);
             p.ScreenText(c.PlotRight - p.Width(text, f), 30, text, pal::StopLine, f);
         }
     }

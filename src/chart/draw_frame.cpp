@@ -1,6 +1,6 @@
 #include "chart/draw_frame.h"
 
-#include "chart/number_format.h"
+#include "platform/number_format.h"
 #include "platform/text.h"
 
 #include <cmath>
@@ -52,7 +52,8 @@ void DrawVolumeScale(ChartPainter& p) {
         const double y = c.VolBottom - n * step;
         if (n > 0) p.Dotted(c.PlotRight, y, c.PlotRight + 2, y, pal::Notes);
         if (!c.Volumes.ready()) continue;
-        const std::string label = FormatNumber(c.Volumes.YToVolume(y), "0");
+        const std::string label =
+            platform::Format(c.Volumes.YToVolume(y), "0", platform::ZeroSign::Dropped);
         const double x = c.PlotRight + 30 - p.Width(label, f2);
         p.ScreenText(x, y - 4, label, pal::Labels, f2);
         p.stream.Text('S', f2.Size, x, y - 4, label, p.Col(pal::Labels));
@@ -133,9 +134,12 @@ std::string HeadingLine(const ChartRequest& r, const ChartName& name, bool logar
 }
 
 std::string PriceLabel(float value, float range, std::int16_t recordType) {
-    if (value >= 0 && value <= 0.2f) return FormatNumber(value, ".00#");
-    if (recordType == 5) return FormatNumber(value, "######");
-    return FormatNumber(value, range > 0.1f ? "###.00" : "###.00#");
+    if (value >= 0 && value <= 0.2f)
+        return platform::FormatSingle(value, ".00#", platform::ZeroSign::Dropped);
+    if (recordType == 5)
+        return platform::FormatSingle(value, "######", platform::ZeroSign::Dropped);
+    return platform::FormatSingle(value, range > 0.1f ? "###.00" : "###.00#",
+                                  platform::ZeroSign::Dropped);
 }
 
 bool LabelShows(int n, int gridCount, bool& skip) {

@@ -1,6 +1,6 @@
 #include "chart/draw_labels.h"
 
-#include "chart/number_format.h"
+#include "platform/number_format.h"
 
 namespace kori::chart {
 
@@ -14,8 +14,9 @@ std::string LastDateText(std::string_view d) {
 std::string ClosingPriceText(float close, float previous, std::int16_t recordType) {
     const bool decimals = recordType == 1 || recordType == 2 || recordType == 4;
     const char* pattern = decimals ? "#####.00#" : "#####";
-    return "Closing Price : " + FormatNumber(close, pattern) + "  (" +
-           FormatNumber(previous, pattern) + ")";
+    return "Closing Price : " +
+           platform::FormatSingle(close, pattern, platform::ZeroSign::Dropped) + "  (" +
+           platform::FormatSingle(previous, pattern, platform::ZeroSign::Dropped) + ")";
 }
 
 void DrawTrailingLabels(ChartPainter& p) {

@@ -1,4 +1,5 @@
 #include "chart/draw_price_chart.h"
+#include "store/name_record.h"
 
 #include "chart/draw_bars.h"
 #include "chart/draw_frame.h"
@@ -56,7 +57,7 @@ platform::Status TakeScale(Chart& c, const DrawInputs& in, platform::Dialogs& di
 } // namespace
 
 char EffectiveStyle(const ChartRequest& r, const ChartName& name) {
-    if (name.RecordType < 4) return 'L';
+    if (store::IsCloseOnly(name.RecordType)) return 'L';
     const char s = r.ChartStyle;
     if (s == 'b' || s == 'B') return 'B';
     if (s == 'c' || s == 'C') return 'C';

@@ -1,6 +1,6 @@
 #include "chart/parabolic.h"
 
-#include "chart/number_format.h"
+#include "platform/number_format.h"
 
 #include <algorithm>
 
@@ -130,7 +130,7 @@ std::vector<ParabolicPoint> ComputeParabolic(const std::vector<ParabolicBar>& ba
 }
 
 std::string ParabolicStopText(double stop) {
-    return FormatNumber(stop, stop < 0.2 ? "0.000" : "0.00");
+    return platform::Format(stop, stop < 0.2 ? "0.000" : "0.00", platform::ZeroSign::Dropped);
 }
 
 void DrawParabolic(ChartPainter& p, bool onAverage) {

@@ -3,10 +3,11 @@
 #include "chart/draw_date_axis.h"
 #include "chart/draw_frame.h"
 #include "chart/draw_price_chart.h"
-#include "chart/number_format.h"
 #include "chart/scale.h"
+#include "platform/number_format.h"
 #include "platform/text.h"
 
+#include <algorithm>
 #include <cmath>
 #include <cstdlib>
 
@@ -53,7 +54,8 @@ float AskBoxValue(platform::Dialogs& dialogs, float proposal) {
 }
 
 int PFColumns::RowOf(float price) const {
-    return static_cast<int>(std::nearbyint((price - m_base) / m_box));
+    const double row = std::nearbyint((static_cast<double>(price) - m_base) / m_box);
+    return static_cast<int>(std::clamp(row, -double{pf::MaxRows}, double{pf::MaxRows}));
 }
 
 void PFColumns::Add(bool rising) {
@@ -67,8 +69,11 @@ void PFColumns::Add(bool rising) {
 void PFColumns::Move(float close, int bar, bool rising) {
     const float sign = rising ? 1.0f : -1.0f;
     const char same = rising ? 'U' : 'D';
-    for (;;) {
+    // Bounded twice over: a step that no longer moves the float (a box below its precision at
+    // that price) ends the move, and no move adds more boxes than a chart has rows.
+    for (int boxes = 0; boxes <= pf::MaxRows; ++boxes) {
         const float next = m_lastBox + sign * m_box;
+        if (next == m_lastBox) return;
         if (rising ? !(close >= next) : !(close <= next)) return;
         if (m_stage == 1 || m_direction == same) {
             Add(rising);
@@ -90,7 +95,7 @@ void PFColumns::Move(float close, int bar, bool rising) {
 }
 
 void PFColumns::Close(float close, int bar) {
-    if (close == 0) return;
+    if (close == 0 || !std::isfinite(close)) return;
     if (m_stage == 0) {
         m_lastBox = close;
         m_column = 1;
@@ -115,10 +120,29 @@ std::vector<int> CountColumns(const std::vector<float>& closes, float chartBase,
     return starts;
 }
 
+std::optional<float> PFRangeProblem(const std::vector<float>& closes, float boxValue) {
+    float lo = 0, hi = 0;
+    bool any = false;
+    for (float close : closes) {
+        if (close == 0 || !std::isfinite(close)) continue;
+        lo = any ? std::min(lo, close) : close;
+        hi = any ? std::max(hi, close) : close;
+        any = true;
+    }
+    if (!any) return std::nullopt;
+    const float top = std::max(std::fabs(lo), std::fabs(hi));
+    const bool steps = std::nextafter(top, INFINITY) - top <= boxValue;
+    const bool fits = (static_cast<double>(hi) - lo) / boxValue <= pf::MaxRows;
+    if (boxValue > 0 && steps && fits) return std::nullopt;
+    return top;
+}
+
 std::string PFLabel(float value, std::int16_t recordType) {
-    if (value > 0 && value < 0.1f) return FormatNumber(value, ".00#");
-    if (recordType == 4) return FormatNumber(value, "####.00");
-    return FormatNumber(value, "######");
+    if (value > 0 && value < 0.1f)
+        return platform::FormatSingle(value, ".00#", platform::ZeroSign::Dropped);
+    if (recordType == 4)
+        return platform::FormatSingle(value, "####.00", platform::ZeroSign::Dropped);
+    return platform::FormatSingle(value, "######", platform::ZeroSign::Dropped);
 }
 
 namespace {
@@ -167,7 +191,7 @@ public:
         run.onBox = [this](const PFBox& b) { DrawBox(b); };
         const auto& bars = m_c.ChartBars();
         for (std::size_t i = static_cast<std::size_t>(firstBar); i < closes.size(); ++i) {
-            if (closes[i] == 0) continue;
+            if (closes[i] == 0 || !std::isfinite(closes[i])) continue;
             DateMark(bars[i].DateText());
             run.Close(closes[i], static_cast<int>(i));
         }
@@ -265,8 +289,32 @@ platform::Status DrawPointFigureChart(Chart& c, const DrawInputs& inputs, const 
         surface.Clear();
     }
     surface.SetLineWidth(1);
+    std::vector<float> closes;
+    const auto& bars = c.ChartBars();
+    for (int i = 0; i <= c.LastBar() && i < static_cast<int>(bars.size()); ++i)
+        closes.push_back(bars[static_cast<std::size_t>(i)].Close);
+
+    float box = SettleBoxValue(c, pfIn, dialogs, RowsOf(c));
+    if (const auto top = PFRangeProblem(closes, box)) {
+        // Boxes too small for the prices: the automatic value takes over when it can draw
+        // them; otherwise nothing is drawn. Either way the user is told.
+        const float automatic =
+            std::max(AutoBoxValue(c.ChartBase, c.ChartCeiling, RowsOf(c)), pf::MinimumBox);
+        const std::string why = "Box value " + platform::FloatText(box) +
+                                " is too small for prices up to " + platform::FloatText(*top);
+        if (PFRangeProblem(closes, automatic)) {
+            c.Failed = true;
+            const std::string text = why + ": " + platform::Trim(inputs.Name.Code) +
+                                     " cannot be drawn as point and figure.";
+            dialogs.MsgBox(text, pf::DialogTitle);
+            return platform::Status::Error(text);
+        }
+        dialogs.MsgBox(why + ": the box value " + platform::FloatText(automatic) +
+                           " is used instead.",
+                       pf::DialogTitle);
+        box = automatic;
+    }
     ChartPainter p(c, pfIn, surface);
-    const float box = SettleBoxValue(c, pfIn, dialogs, RowsOf(c));
     c.ChartCeiling = box; // the ceiling carries the box value from here on
     c.Map.PreparePointFigure(c.ChartBase, box, c.PlotBottom, pf::CellSize); // for the tools
     PFDrawing pfDraw(p, box);
@@ -274,10 +322,6 @@ platform::Status DrawPointFigureChart(Chart& c, const DrawInputs& inputs, const 
     pfDraw.FrameAndLabels();
     pfDraw.BoxValueText();
 
-    std::vector<float> closes;
-    const auto& bars = c.ChartBars();
-    for (int i = 0; i <= c.LastBar() && i < static_cast<int>(bars.size()); ++i)
-        closes.push_back(bars[static_cast<std::size_t>(i)].Close);
     const std::int16_t reversal = PFReversal(inputs.Request.BarSpacing);
     const std::vector<int> starts = CountColumns(closes, c.ChartBase, box, reversal);
     const int fit = (c.PlotRight - c.PlotLeft - defaults.BlankRight) / pf::CellSize;

@@ -21,6 +21,8 @@ inline constexpr std::int16_t CellSize = 2 * BoxHalf + 2;
 inline constexpr float MinimumBox = 0.003f;
 inline constexpr std::string_view DialogTitle = "Point and Figure";
 inline constexpr int Wipe = 17, MonthBox = 27, FallingBox = 28;
+// Rows a chart can hold in its 16-bit coordinates.
+inline constexpr int MaxRows = 32767 / CellSize;
 } // namespace pf
 
 // Boxes in a reversal from the request's spacing: 2 to 6, anything else 2.
@@ -75,6 +77,11 @@ private:
 // Bar index that opened each column (index 0 is column 1), by a counting pass.
 std::vector<int> CountColumns(const std::vector<float>& closes, float chartBase, float boxValue,
                               std::int16_t reversal);
+
+// Whether boxes of this value can step through the closes (zeros and non-numbers aside):
+// nothing when they can; otherwise the largest price, when a box is below the float's
+// precision there or the range needs more rows than a chart holds.
+std::optional<float> PFRangeProblem(const std::vector<float>& closes, float boxValue);
 
 // Label of a price line of the chart.
 std::string PFLabel(float value, std::int16_t recordType);

@@ -1,6 +1,6 @@
 #include "chart/scale.h"
 
-#include "chart/number_format.h"
+#include "platform/number_format.h"
 #include "platform/text.h"
 
 #include <cmath>
@@ -129,8 +129,8 @@ ScaleEnds AutoScaleEnds(float high, float low) {
 
 GridSteps ComputeGridStep(float chartBase, float chartCeiling) {
     // The range goes through the two-decimal label format and back.
-    float range =
-        static_cast<float>(platform::Val(FormatNumber(chartCeiling - chartBase, "#####0.00")));
+    float range = static_cast<float>(platform::Val(platform::FormatSingle(
+        chartCeiling - chartBase, "#####0.00", platform::ZeroSign::Dropped)));
     float step = 0;
     if (range > 100) {
         range = range < 1000 ? Floor(range / 10) * 10 : Floor(range / 100) * 100;

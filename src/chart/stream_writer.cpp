@@ -47,14 +47,31 @@ void AppendText(std::string& out, std::string_view text) {
 } // namespace
 
 platform::Status StreamWriter::Open(const std::filesystem::path& path, bool append) {
-    Close();
+    (void)Close();
+    if (!append) m_status = platform::Status::Ok();
+    m_path = path;
+    m_out.clear();
     m_out.open(path, std::ios::binary | (append ? std::ios::app : std::ios::trunc));
-    if (!m_out) return platform::Status::Error("Cannot open the chart stream " + path.string());
+    if (!m_out) {
+        Fail("Cannot open the chart stream ");
+        return m_status;
+    }
     return platform::Status::Ok();
 }
 
-void StreamWriter::Close() {
-    if (m_out.is_open()) m_out.close();
+void StreamWriter::Fail(const std::string& what) {
+    if (m_status) m_status = platform::Status::Error(what + m_path.string());
+}
+
+platform::Status StreamWriter::Close() {
+    if (m_out.is_open()) {
+        m_out.flush();
+        if (!m_out) Fail("Cannot write the chart stream ");
+        m_out.close();
+        if (!m_out) Fail("Cannot close the chart stream ");
+        m_out.clear();
+    }
+    return m_status;
 }
 
 std::string StreamWriter::Number(double v) {
@@ -74,6 +91,11 @@ void StreamWriter::WriteLine(const std::string& line) {
     if (RedrawOnly || !m_out.is_open()) return;
     m_out.write(line.data(), static_cast<std::streamsize>(line.size()));
     m_out.write("\r\n", 2);
+    if (!m_out) {
+        // The rest of the chart would only be a torn copy: stop writing it.
+        Fail("Cannot write the chart stream ");
+        m_out.close();
+    }
 }
 
 void StreamWriter::Shape(char letter, double x1, double y1, double x2, double y2,

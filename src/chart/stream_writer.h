@@ -19,8 +19,12 @@ public:
     // A new chart (ChartSlot below 2, not the second half of a split) overwrites the stream;
     // otherwise the stream is appended to so one stream carries every chart of a page.
     platform::Status Open(const std::filesystem::path& path, bool append);
-    void Close();
+    // Flushes and closes; a failed write or close since the stream was started is returned.
+    platform::Status Close();
     bool isOpen() const { return m_out.is_open(); }
+    // The first failure since the stream was started afresh (an append keeps it): a stream
+    // that failed once is incomplete, whatever later writes do.
+    const platform::Status& status() const { return m_status; }
 
     bool RedrawOnly = false;
 
@@ -37,7 +41,10 @@ public:
 
 private:
     void WriteLine(const std::string& line);
+    void Fail(const std::string& what);
     std::ofstream m_out;
+    std::filesystem::path m_path;
+    platform::Status m_status = platform::Status::Ok();
 };
 
 } // namespace kori::chart

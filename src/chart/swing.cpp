@@ -11,17 +11,6 @@ namespace {
 constexpr double kPriceSlack = 1e-6;
 } // namespace
 
-bool SwingValueValid(std::string_view method, float value) {
-    if (method == "XDay") return value >= 1 && value <= 30;
-    if (method == "XPoint") return value >= 1;
-    return true;
-}
-
-float SwingValueOf(std::string_view method, float value) {
-    if (value > 0) return value;
-    return method == "XDay" ? 3.0f : 9.0f;
-}
-
 void SwingSwitch::Set(ChartRequest& r, bool on) {
     if (on == r.SwingOn) return;
     r.SwingOn = on;
@@ -90,27 +79,26 @@ float AverageSwing(const std::vector<store::ChartBar>& bars, std::int16_t record
     return 5;
 }
 
-std::string SwingTitleText(char chartPeriod, std::string_view method, float value) {
+std::string SwingTitleText(char chartPeriod, SwingMethod method, float value) {
     std::string lead = chartPeriod == 'W'   ? "Weekly Swing "
                        : chartPeriod == 'M' ? "Monthly Swing "
                                             : "Daily Swing ";
     const std::string v = platform::FloatText(value);
-    if (method == "XDay") return lead + v + " - DAY";
-    if (method == "XPoint") return lead + v + " - POINT";
-    if (method == "XPointAuto") return lead + v + " - Point(Auto)";
+    if (method == SwingMethod::XDay) return lead + v + " - DAY";
+    if (method == SwingMethod::XPoint) return lead + v + " - POINT";
+    if (method == SwingMethod::XPointAuto) return lead + v + " - Point(Auto)";
     return lead + " -  Standard";
 }
 
 SwingChart::SwingChart(ChartPainter& p) : m_p(p) {
     const ChartRequest& r = p.in.Request;
     m_method = r.SwingMethod;
-    if (m_method != "XDay" && m_method != "XPoint" && m_method != "XPointAuto") m_method = "NORM";
     m_value = SwingValueOf(m_method, r.SwingValue);
     m_panel = p.chart.SidePanelLeft > 0;
 }
 
 void SwingChart::Title() {
-    if (m_method == "XPointAuto")
+    if (m_method == SwingMethod::XPointAuto)
         m_value = std::floor(
             std::floor(AverageSwing(m_p.chart.ChartBars(), m_p.in.Name.RecordType)) * 0.75f);
     const std::string text = SwingTitleText(m_p.in.Request.ChartPeriod, m_method, m_value);
@@ -307,9 +295,9 @@ void SwingChart::Bar(int index, double barX, const SwingBar& bar) {
         Start(bar);
         return;
     }
-    if (m_method == "NORM")
+    if (m_method == SwingMethod::Norm)
         Norm(bar);
-    else if (m_method == "XDay")
+    else if (m_method == SwingMethod::XDay)
         XDay(bar);
     else
         XPoint(bar);

@@ -4,6 +4,7 @@
 // swing), "XPoint" (a fall or rise of V cents or points) and "XPointAuto" (V from the mean
 // swing of the chart).
 #include "chart/draw_context.h"
+#include "chart/swing_method.h"
 
 #include <cstdint>
 #include <optional>
@@ -16,14 +17,6 @@ namespace kori::chart {
 namespace pal {
 inline constexpr int SwingUp = 20, SwingDown = 21, SwingTitle = 27;
 }
-
-inline constexpr std::string_view kSwingTitle = "Swing";
-inline constexpr std::string_view kSwingRefusal = "Incorrect values entered";
-
-// True when the value suits the method: "XDay" 1 to 30, "XPoint" 1 or more.
-bool SwingValueValid(std::string_view method, float value);
-// The value in force: 0 (never set) reads 3 for "XDay" and 9 for the point methods.
-float SwingValueOf(std::string_view method, float value);
 
 // Turning swing lines on forces bars at a spacing of at least 3; turning them off gives back
 // the spacing that was in force before.
@@ -40,7 +33,7 @@ private:
 float AverageSwing(const std::vector<store::ChartBar>& bars, std::int16_t recordType);
 
 // Title line of the swing chart.
-std::string SwingTitleText(char chartPeriod, std::string_view method, float value);
+std::string SwingTitleText(char chartPeriod, SwingMethod method, float value);
 
 // One bar as the swing routines see it: y of high, low and close, and the prices.
 struct SwingBar {
@@ -68,7 +61,7 @@ private:
     void Title();
 
     ChartPainter& m_p;
-    std::string m_method;
+    SwingMethod m_method = SwingMethod::Norm;
     float m_value = 0;
     bool m_panel = false;
     bool m_drawing = false;

@@ -18,8 +18,11 @@
 #include <CLI/CLI.hpp>
 #include <nlohmann/json.hpp>
 
+#include <cstdlib>
 #include <iostream>
 #include <memory>
+
+#include <unistd.h>
 
 namespace kori::cli {
 
@@ -48,22 +51,19 @@ struct ChartOptions {
 void ApplySwing(const std::string& text, app::ChartJob& job) {
     auto& r = job.Request;
     const auto colon = text.find(':');
-    const std::string method = text.substr(0, colon);
-    if (method != "NORM" && method != "XDay" && method != "XPoint" && method != "XPointAuto")
-        throw CliError{"--swing wants NORM, XDay:N, XPoint:N or XPointAuto"};
+    const auto method = chart::ParseSwingMethod(text.substr(0, colon));
+    if (!method) throw CliError{"--swing wants NORM, XDay:N, XPoint:N or XPointAuto"};
     float value = 0;
     if (colon != std::string::npos)
         value = static_cast<float>(platform::Val(text.substr(colon + 1)));
-    if ((method == "XDay" || method == "XPoint") && colon != std::string::npos &&
-        !chart::SwingValueValid(method, value))
+    if (chart::SwingMethodTakesValue(*method) && colon != std::string::npos &&
+        !chart::SwingValueValid(*method, value))
         throw CliError{std::string(chart::kSwingRefusal)};
     chart::SwingSwitch swing;
     swing.Set(r, true);
-    r.SwingMethod = method;
+    r.SwingMethod = *method;
     r.SwingValue = value;
-    r.SwingPanel = method == "NORM"         ? chart::SidePanel::None
-                   : method == "XPointAuto" ? chart::SidePanel::XPointAuto
-                                            : chart::SidePanel::Other;
+    r.SwingPanel = chart::SwingSidePanel(*method);
 }
 
 void ApplyOverlays(const ChartOptions& o, app::ChartJob& job) {
@@ -163,6 +163,33 @@ void PrintNumbers(std::ostream& to, const chart::Chart& c) {
     to << out.dump() << "\n";
 }
 
+// The stream of this run: a file of its own in the temporary folder, removed when the run
+// ends, so that two runs on one library (or a run beside the desktop program) never read or
+// overwrite each other's chart.
+class PrivateStream {
+public:
+    explicit PrivateStream(app::Session& session) : m_session(session) {
+        std::string name = (app::TempFolder(session) / "TCht-XXXXXX.Tmp").string();
+        const int fd = ::mkstemps(name.data(), 4);
+        if (fd < 0)
+            throw CliError{"Cannot make a chart stream in " + app::TempFolder(session).string()};
+        ::close(fd);
+        m_path = name;
+        m_session.chartStream = m_path;
+    }
+    ~PrivateStream() {
+        m_session.chartStream.clear();
+        std::error_code ec;
+        std::filesystem::remove(m_path, ec);
+    }
+    PrivateStream(const PrivateStream&) = delete;
+    PrivateStream& operator=(const PrivateStream&) = delete;
+
+private:
+    app::Session& m_session;
+    std::filesystem::path m_path;
+};
+
 void CopyStream(const app::Session& session, const std::string& to) {
     const auto content = platform::ReadWholeFile(app::ChartStreamPath(session));
     if (!content) throw CliError{"No chart stream was written"};
@@ -176,6 +203,7 @@ void Run(CliContext& ctx, const ChartOptions& o) {
     if (!why) throw CliError{why.message()};
     if (!found) throw CliError{"No File For That Name: " + platform::Trim(o.code)};
     const auto [w, h] = ParseArea(o.size);
+    const PrivateStream stream(session);
 
     app::ChartJob job;
     job.Name = found->Record;
@@ -189,7 +217,10 @@ void Run(CliContext& ctx, const ChartOptions& o) {
     if (!o.split.empty()) ApplySplit(session, o.split, o, job, split);
     const auto build = [&](chart::Chart& into, platform::Surface& area) {
         split.Apply(job.Request);
-        return BuildChartWithPanel(session, job, into, area, o.osc);
+        const platform::Status s = BuildChartWithPanel(session, job, into, area, o.osc);
+        // The panel is added to the stream after the price chart: a failed write there too
+        // leaves a torn stream.
+        return s ? into.Stream.status() : s;
     };
 
     chart::Chart c;
@@ -220,12 +251,14 @@ void Run(CliContext& ctx, const ChartOptions& o) {
         chart::PrintSettings settings = chart::LoadPrintSettings(session.ini());
         settings.PrintColour = session.printer.PrintColour;
         settings.PrintColourLines = session.printer.PrintColourLines;
-        gui::PdfPrinter printer(o.pdf);
+        gui::PdfPrinter printer;
         const chart::PaperJob paper{printer, session.palette, session.fonts, static_cast<double>(w),
                                     static_cast<double>(h)};
         if (chart::PrintChart(app::ChartStreamPath(session), paper, settings) !=
             chart::PlayOutcome::Played)
             throw CliError{"Cannot print the chart to " + o.pdf};
+        if (auto s = platform::WriteFileAtomic(o.pdf, printer.Document()); !s)
+            throw CliError{s.message()};
     }
     if (!o.stream.empty()) CopyStream(session, o.stream);
     if (o.json) PrintNumbers(ctx.out, c);

@@ -62,9 +62,8 @@ chart::PrintSettings PrintSettingsFor(const CliContext& ctx, bool landscape) {
     return s;
 }
 
-void Fail(const std::filesystem::path& output, const std::string& message) {
-    std::error_code ec;
-    std::filesystem::remove(output, ec);
+// Outputs are written whole or not at all, so a failure leaves whatever file was there.
+[[noreturn]] void Fail(const std::string& message) {
     throw CliError{message};
 }
 
@@ -93,15 +92,14 @@ void PlayToPaper(const CliContext& ctx, const PlayOptions& o, int w, int h) {
     const auto palette = BuiltInPalette();
     const platform::ChartFonts fonts;
     chart::PrintSettings settings = PrintSettingsFor(ctx, o.landscape);
-    chart::PlayOutcome outcome;
-    {
-        gui::PdfPrinter printer(o.pdf);
-        const chart::PaperJob job{printer, palette, fonts, static_cast<double>(w),
-                                  static_cast<double>(h)};
-        outcome = chart::PrintChart(o.source, job, settings);
-    }
-    if (outcome == chart::PlayOutcome::PrinterFailed) Fail(o.pdf, "Cannot write " + o.pdf);
-    if (outcome != chart::PlayOutcome::Played) Fail(o.pdf, chart::kFormatInvalidText);
+    gui::PdfPrinter printer;
+    const chart::PaperJob job{printer, palette, fonts, static_cast<double>(w),
+                              static_cast<double>(h)};
+    const chart::PlayOutcome outcome = chart::PrintChart(o.source, job, settings);
+    if (outcome == chart::PlayOutcome::PrinterFailed) Fail("Cannot write " + o.pdf);
+    if (outcome != chart::PlayOutcome::Played) Fail(chart::kFormatInvalidText);
+    // Only a page played whole replaces the file.
+    if (auto s = platform::WriteFileAtomic(o.pdf, printer.Document()); !s) Fail(s.message());
 }
 
 } // namespace

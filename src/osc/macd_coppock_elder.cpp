@@ -1,4 +1,5 @@
 #include "osc/macd_coppock_elder.h"
+#include "store/name_record.h"
 
 namespace kori::osc {
 
@@ -108,7 +109,7 @@ ElderRayResult ComputeElderRay(const store::ChartSeries& series, std::int16_t pe
     for (int i = n - 1; i < count; ++i) {
         const auto u = static_cast<std::size_t>(i);
         const store::ChartBar& b = series.ChartBars[u];
-        const bool closeOnly = recordType >= 1 && recordType <= 3;
+        const bool closeOnly = store::IsCloseOnly(recordType);
         r.bull[u] = (closeOnly ? b.Close : b.High) - ave[u];
         r.bear[u] = (closeOnly ? b.Close : b.Low) - ave[u];
     }

@@ -1,6 +1,5 @@
 #include "osc/osc_draw.h"
 
-#include "chart/number_format.h"
 #include "osc/atr_volatility_obv.h"
 #include "osc/compare_osc.h"
 #include "osc/directional.h"
@@ -11,6 +10,7 @@
 #include "osc/rsi.h"
 #include "osc/stoch_fx.h"
 #include "osc/williams_holy_grail.h"
+#include "platform/number_format.h"
 #include "platform/text.h"
 
 #include <algorithm>
@@ -314,7 +314,7 @@ void OscMACD(chart::Chart& c, const OscDef& d, char period, const OscDrawInputs&
     pt.Line('L', panel.OscRight + (30 - zeroWidth) + 2, mid, panel.OscRight, mid, oscpal::Frame);
     for (double v : {double(hiH), 0.5 * hiH, double(loH), 0.5 * loH}) {
         const double y = (panel.OscBottom - 10) - (v - loH) / per;
-        ReferenceLine(pt, panel, y, chart::FormatNumber(v, "####.00"));
+        ReferenceLine(pt, panel, y, platform::Format(v, "####.00", platform::ZeroSign::Dropped));
     }
 
     const bool classic =
@@ -512,7 +512,8 @@ void OscATR(chart::Chart& c, const OscDef& d, char period, const OscDrawInputs& 
         const double y = span / 5 * k + panel.OscTop + 10;
         pt.Line('L', k == 1 ? panel.OscLeft + titleWidth + 10 : panel.OscLeft, y, panel.OscRight, y,
                 oscpal::Frame);
-        const std::string label = chart::FormatNumber(hi - step * k, pattern);
+        const std::string label =
+            platform::Format(hi - step * k, pattern, platform::ZeroSign::Dropped);
         pt.Text(c.PlotRight + 5 + (40 - pt.Width(label)), y - 6, label, oscpal::Text);
     }
     double lastAtr = 0;
@@ -607,7 +608,8 @@ void OscOBV(chart::Chart& c, const OscDrawInputs& in, platform::Surface& s, bool
         else
             pt.Line('L', x1, y, panel.OscRight, y, oscpal::Frame);
         const double figure = (lo + (100 - g) / 100.0 * (hi - lo)) / 10 / 1000;
-        const std::string label = chart::FormatNumber(figure, "##.#") + "k";
+        const std::string label =
+            platform::Format(figure, "##.#", platform::ZeroSign::Dropped) + "k";
         pt.Text(panel.OscRight + (30 - pt.Width(label)), y - 6, label, oscpal::Text);
     }
     const double rows = Round(panel.OscBottom - panel.OscTop - 2 * margin);
@@ -735,8 +737,8 @@ void OscHolyGrail(chart::Chart& c, const OscDef& d, char period, const OscDrawIn
         }
     const MarginScale m = MakeMarginScale(panel, hi, lo);
     if (m.Per == 0) return;
-    MarginReferenceLines(pt, panel, m, chart::FormatNumber(hi, "0.000"),
-                         chart::FormatNumber(lo, "0.000"), "0");
+    MarginReferenceLines(pt, panel, m, platform::Format(hi, "0.000", platform::ZeroSign::Dropped),
+                         platform::Format(lo, "0.000", platform::ZeroSign::Dropped), "0");
     Pen one, two;
     for (int i = p + 1; i <= c.LastBar(); ++i) {
         const double x = BarX(c, panel, i);
@@ -869,7 +871,8 @@ void OscRMX(chart::Chart& c, const OscDef& d, char period, const OscDrawInputs& 
     // Frame and title come last on this panel.
     DrawFrameAndTitle(pt, panel,
                       titleStart + "           CenterLine = " +
-                          chart::FormatNumber(lastValue, "0.00") + "  (" + Str(centerValue) + ")");
+                          platform::Format(lastValue, "0.00", platform::ZeroSign::Dropped) + "  (" +
+                          Str(centerValue) + ")");
 }
 
 // ---- Dispatch ----
@@ -935,11 +938,11 @@ OscOutcome ShowOscillator(chart::Chart& chart, std::string_view oscName, char ch
         else if (name == "OBV")
             OscOBV(chart, in, panel, false);
     } catch (const std::bad_alloc&) {
-        chart.Stream.Close();
+        (void)chart.Stream.Close();
         ShowOscFailure(in.Dialogs, 480, "");
         return OscOutcome::Failed;
     } catch (const std::exception& e) {
-        chart.Stream.Close();
+        (void)chart.Stream.Close();
         ShowOscFailure(in.Dialogs, 5, e.what());
         return OscOutcome::Failed;
     }

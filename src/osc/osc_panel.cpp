@@ -13,9 +13,9 @@ std::string TitleNumber(double v) {
 OscPainter::OscPainter(chart::Chart& c, const OscDrawInputs& in, platform::Surface& surface)
     : chart(c), screen(surface), m_in(in) {
     // The panel's instructions follow the price chart's in the same stream.
-    chart.Stream.Close();
+    (void)chart.Stream.Close();
     if (!chart.RedrawOnly && !in.StreamPath.empty()) {
-        if (!chart.Stream.Open(in.StreamPath, true)) chart.Stream.Close();
+        (void)chart.Stream.Open(in.StreamPath, true);
     }
     if (!in.Fonts.Font1.empty()) screen.SetFontName(in.Fonts.Font1);
     screen.SetFontSize(8.25);
@@ -24,7 +24,7 @@ OscPainter::OscPainter(chart::Chart& c, const OscDrawInputs& in, platform::Surfa
 }
 
 OscPainter::~OscPainter() {
-    chart.Stream.Close();
+    (void)chart.Stream.Close();
 }
 
 platform::Colour OscPainter::Col(int entry) const {

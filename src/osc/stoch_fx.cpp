@@ -1,4 +1,5 @@
 #include "osc/stoch_fx.h"
+#include "store/name_record.h"
 
 #include <algorithm>
 
@@ -18,11 +19,12 @@ Extremes WindowExtremes(const store::ChartSeries& s, int n, int width, std::int1
     std::vector<float> loC(static_cast<std::size_t>(n), 100000.0f);
     for (std::size_t j = 0; j < hiC.size(); ++j) {
         const store::ChartBar& b = s.ChartBars[j];
-        if (b.High != 0 && recordType > 3)
+        const bool closeOnly = store::IsCloseOnly(recordType);
+        if (b.High != 0 && !closeOnly)
             hiC[j] = b.High;
         else if (b.Close != 0)
             hiC[j] = b.Close;
-        if (b.Low != 0 && recordType > 3)
+        if (b.Low != 0 && !closeOnly)
             loC[j] = b.Low;
         else if (b.Close != 0)
             loC[j] = b.Close;

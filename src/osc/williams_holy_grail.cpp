@@ -1,4 +1,5 @@
 #include "osc/williams_holy_grail.h"
+#include "store/name_record.h"
 
 namespace kori::osc {
 
@@ -10,7 +11,7 @@ WilliamsResult ComputeWilliams(const store::ChartSeries& series, std::int16_t pe
     if (period <= 0 || n <= period) return result;
 
     // Zeros are skipped: a bar without a figure stands as the starting value, which never wins.
-    const bool closeOnly = recordType >= 1 && recordType <= 3;
+    const bool closeOnly = store::IsCloseOnly(recordType);
     std::vector<float> hiC(static_cast<std::size_t>(n), -100000.0f);
     std::vector<float> loC(static_cast<std::size_t>(n), 100000.0f);
     for (std::size_t j = 0; j < hiC.size(); ++j) {

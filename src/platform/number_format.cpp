@@ -296,7 +296,7 @@ std::string GeneralNumber(double value, int significant) {
     return out;
 }
 
-std::string FormatWith(double value, std::string_view pattern, int significant) {
+std::string FormatWith(double value, std::string_view pattern, int significant, ZeroSign zeroSign) {
     if (pattern.empty() || EqualsNoCase(pattern, "General Number"))
         return GeneralNumber(value, significant);
     const auto sections = SplitSections(pattern);
@@ -305,9 +305,10 @@ std::string FormatWith(double value, std::string_view pattern, int significant) 
         return FormatSection(0.0, sections[2], significant);
     if (negative && sections.size() >= 2 && !sections[1].empty())
         return FormatSection(-value, sections[1], significant);
-    std::string out = negative ? "-" : "";
-    out += FormatSection(std::fabs(value), sections[0], significant);
-    return out;
+    const std::string body = FormatSection(std::fabs(value), sections[0], significant);
+    const bool shownAsZero = body.find_first_of("123456789") == std::string::npos;
+    if (!negative || (zeroSign == ZeroSign::Dropped && shownAsZero)) return body;
+    return "-" + body;
 }
 
 // ---- dates ----------------------------------------------------------------------------------
@@ -358,12 +359,12 @@ std::string YearField(CivilDate d, std::size_t run) {
 
 } // namespace
 
-std::string Format(double value, std::string_view pattern) {
-    return FormatWith(value, pattern, 15);
+std::string Format(double value, std::string_view pattern, ZeroSign zeroSign) {
+    return FormatWith(value, pattern, 15, zeroSign);
 }
 
-std::string FormatSingle(float value, std::string_view pattern) {
-    return FormatWith(static_cast<double>(value), pattern, 7);
+std::string FormatSingle(float value, std::string_view pattern, ZeroSign zeroSign) {
+    return FormatWith(static_cast<double>(value), pattern, 7, zeroSign);
 }
 
 std::string FormatDate(std::string_view yyyymmdd, std::string_view pattern) {

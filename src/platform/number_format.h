@@ -23,10 +23,15 @@
 
 namespace kori::platform {
 
-std::string Format(double value, std::string_view pattern);
+// Whether a negative value that shows as zero keeps its sign ("-0.00", the classic rule) or
+// drops it ("0.00"). Chart labels drop it: their values come out of float arithmetic, where a
+// line at zero may be computed a hair below it.
+enum class ZeroSign { Kept, Dropped };
+
+std::string Format(double value, std::string_view pattern, ZeroSign zeroSign = ZeroSign::Kept);
 // For 32-bit float values: the digits are those of the single (7 significant), so a float
 // 0.145 formats as "0.15" with "0.00", not from its longer double expansion.
-std::string FormatSingle(float value, std::string_view pattern);
+std::string FormatSingle(float value, std::string_view pattern, ZeroSign zeroSign = ZeroSign::Kept);
 
 // `yyyymmdd` is the 8-character date text of the files. A text that is not a calendar date
 // gives an empty result.

@@ -60,7 +60,7 @@ void SaveSLNames(platform::SettingsStore& store, const std::array<std::string, 1
 }
 
 Status SaveListFromCodes(std::string_view dataFolder, char letter,
-                         const std::vector<std::string>& codes) {
+                         const std::vector<std::string>& codes, std::vector<std::string>* dropped) {
     std::vector<NameRecord> names;
     NameFile nf(NameFile::PathIn(dataFolder));
     if (auto s = nf.Open(); !s) return s;
@@ -69,12 +69,14 @@ Status SaveListFromCodes(std::string_view dataFolder, char letter,
     for (const auto& line : codes) {
         const std::string code = platform::Trim(line);
         if (code.empty()) continue;
-        for (std::size_t i = 0; i < names.size(); ++i) {
+        bool found = false;
+        for (std::size_t i = 0; i < names.size() && !found; ++i) {
             if (platform::Trim(names[i].Code) == code) {
                 entries.push_back({static_cast<std::int16_t>(i + 1), code});
-                break;
+                found = true;
             }
         }
+        if (!found && dropped) dropped->push_back(code);
     }
     return WriteList(ListPath(dataFolder, letter), entries);
 }
@@ -129,23 +131,43 @@ std::vector<std::string> StockList(std::string_view dataFolder) {
     return codes;
 }
 
-std::optional<std::vector<std::string>> ReadImportCodes(const std::filesystem::path& file) {
+std::optional<ImportedCodes> ReadImportFile(const std::filesystem::path& file) {
     const auto content = platform::ReadWholeFile(file);
     if (!content) return std::nullopt;
-    std::vector<std::string> codes;
+    ImportedCodes out;
     std::size_t start = 0;
     while (start < content->size()) {
         std::size_t end = content->find_first_of("\r\n", start);
         if (end == std::string::npos) end = content->size();
         const std::string_view line(content->data() + start, end - start);
-        if (IsImportableCode(line)) codes.emplace_back(line);
+        const std::string code = platform::Upper(platform::Trim(line));
+        if (IsImportableCode(code))
+            out.Codes.push_back(code);
+        else if (!code.empty())
+            out.Refused.emplace_back(line);
         // A line ends at CR, LF or CR LF.
         start = end + 1;
         if (end < content->size() && (*content)[end] == '\r' && start < content->size() &&
             (*content)[start] == '\n')
             ++start;
     }
-    return codes;
+    return out;
+}
+
+std::optional<std::vector<std::string>> ReadImportCodes(const std::filesystem::path& file) {
+    auto read = ReadImportFile(file);
+    if (!read) return std::nullopt;
+    return std::move(read->Codes);
+}
+
+std::string RefusedCodesMessage(std::string_view heading, const std::vector<std::string>& refused) {
+    constexpr std::size_t kShown = 20; // a long list is cut: the box must fit the screen
+    std::string text(heading);
+    for (std::size_t i = 0; i < refused.size() && i < kShown; ++i)
+        text += "\n" + refused[i];
+    if (refused.size() > kShown)
+        text += "\n... and " + std::to_string(refused.size() - kShown) + " more";
+    return text;
 }
 
 std::vector<std::string> ListChoices(const platform::SettingsStore& store, bool withZ) {
@@ -169,10 +191,16 @@ Status ChartListBox::Load(std::string_view dataFolder, char letter) {
     return ShowList(dataFolder, letter, m_codes);
 }
 
-Status ChartListBox::Save(std::string_view dataFolder) {
+Status ChartListBox::Save(std::string_view dataFolder, std::vector<std::string>* dropped) {
     if (m_letter == 0) return Status::Error("No chart list is displayed");
-    if (auto s = SaveListFromCodes(dataFolder, m_letter, m_codes); !s) return s;
+    if (auto s = SaveListFromCodes(dataFolder, m_letter, m_codes, dropped); !s) return s;
     return Load(dataFolder, m_letter);
+}
+
+bool ChartListBox::AddIfAbsent(std::string_view code) {
+    const std::string c = platform::Trim(code);
+    if (std::find(m_codes.begin(), m_codes.end(), c) != m_codes.end()) return false;
+    return Add(c);
 }
 
 bool ChartListBox::Insert(std::size_t index, std::string_view code) {

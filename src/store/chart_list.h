@@ -40,9 +40,11 @@ std::array<std::string, 10> GetSubLists(const platform::SettingsStore& store);
 void SaveSLNames(platform::SettingsStore& store, const std::array<std::string, 10>& names);
 
 // Saves a list from a box of codes: each non-blank line found in Names.dat (trimmed compare,
-// first match) becomes an entry; codes not found are dropped in silence.
+// first match) becomes an entry; codes not found are dropped, and given in `dropped` for the
+// window to tell the user.
 platform::Status SaveListFromCodes(std::string_view dataFolder, char letter,
-                                   const std::vector<std::string>& codes);
+                                   const std::vector<std::string>& codes,
+                                   std::vector<std::string>* dropped = nullptr);
 
 // A line of an imported text file is a code when it has 1 to 6 letters or digits only.
 bool IsImportableCode(std::string_view line);
@@ -57,9 +59,23 @@ platform::Status ShowList(std::string_view dataFolder, char letter,
                           std::vector<std::string>& codes);
 // `StockList`: every trimmed code of Names.dat in file order (empty when there is no file).
 std::vector<std::string> StockList(std::string_view dataFolder);
-// The codes of a text file to import: each whole line (its line end dropped) that passes
-// IsImportableCode, in file order. Nullopt when the file cannot be read.
+// The lines of a text file to import. Each line, its line end dropped, is trimmed and
+// upper-cased (codes are upper case in the name file) before IsImportableCode; the lines that
+// pass are the codes in file order, the other non-blank lines are refused, as read.
+struct ImportedCodes {
+    std::vector<std::string> Codes;
+    std::vector<std::string> Refused;
+};
+// Nullopt when the file cannot be read.
+std::optional<ImportedCodes> ReadImportFile(const std::filesystem::path& file);
+// The codes alone.
 std::optional<std::vector<std::string>> ReadImportCodes(const std::filesystem::path& file);
+// The message that lists refused lines or codes to the user, under `heading`.
+std::string RefusedCodesMessage(std::string_view heading, const std::vector<std::string>& refused);
+inline constexpr std::string_view kImportRefusedHeading =
+    "These lines are not codes (1 to 6 letters or digits) and were not imported:";
+inline constexpr std::string_view kSaveDroppedHeading =
+    "These codes are not in the name file and were left out of the list:";
 
 // Display names of the lists a chooser offers: the ten user lists, and "Chart List Z" after
 // them when `withZ` (the utilities may show the scan list).
@@ -73,8 +89,9 @@ int ChoiceOfMode(int listMode);
 class ChartListBox {
 public:
     platform::Status Load(std::string_view dataFolder, char letter);
-    // SaveSubList: codes not in Names.dat are dropped; the box then shows the list as saved.
-    platform::Status Save(std::string_view dataFolder);
+    // SaveSubList: codes not in Names.dat are dropped (and given in `dropped`); the box then
+    // shows the list as saved.
+    platform::Status Save(std::string_view dataFolder, std::vector<std::string>* dropped = nullptr);
 
     char letter() const { return m_letter; }
     bool changed() const { return m_changed; }
@@ -83,6 +100,8 @@ public:
     // Inserts at `index` (appends when out of range); the code is trimmed, blanks are refused.
     bool Insert(std::size_t index, std::string_view code);
     bool Add(std::string_view code) { return Insert(m_codes.size(), code); }
+    // Appends a code the box does not hold yet (a copy from another list); false otherwise.
+    bool AddIfAbsent(std::string_view code);
     bool Remove(std::size_t index);
     void Clear();
     // Moves one code to another place; false when either index is out of range.

@@ -1,4 +1,5 @@
 #include "store/load_chart_series.h"
+#include "store/name_record.h"
 
 #include "store/price_file.h"
 #include "store/record_codec.h"
@@ -116,7 +117,7 @@ struct Loader {
             bar.Volume = r.volume;
         }
         previousClose = bar.Close;
-        if (r.high == 0 && req.RecordType > 3) bar.Open = bar.High = bar.Low = bar.Close;
+        if (r.high == 0 && !IsCloseOnly(req.RecordType)) bar.Open = bar.High = bar.Low = bar.Close;
         const bool closeOnly = req.RecordType == 3;
         res.HighestPrice =
             std::max(res.HighestPrice, (r.high == 0 || closeOnly) ? r.close : r.high);
@@ -131,8 +132,9 @@ struct Loader {
     void Accumulate(const Raw& r, int recordNumber) {
         if (weekday == 1 || pOpen == 0) pOpen = r.open;
         pDate = r.date;
-        const float hi = req.RecordType > 3 ? r.high : r.close;
-        const float lo = req.RecordType > 3 ? r.low : r.close;
+        const bool closeOnly = IsCloseOnly(req.RecordType);
+        const float hi = closeOnly ? r.close : r.high;
+        const float lo = closeOnly ? r.close : r.low;
         if (hi > pHigh) pHigh = hi;
         if (lo != 0 && lo < pLow) pLow = lo;
         pClose = r.close;

@@ -6,6 +6,12 @@
 
 namespace kori::store {
 
+// Types 1 to 3 carry a close only: they chart as lines and their highs and lows stand in
+// from the close. Bars need a type of 4 or more, so any other type counts as closes only too.
+constexpr bool IsCloseOnly(int recordType) {
+    return recordType < 4;
+}
+
 struct NameRecord {
     static constexpr std::size_t kSize = 96;
 

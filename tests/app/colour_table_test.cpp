@@ -45,8 +45,9 @@ TEST(ColourTable, BuiltInSchemeFillsTheRolesAndWritesTheFile) {
     EXPECT_EQ(p[16], kStandardColours[3]); // first built-in number
     EXPECT_EQ(p[17], kStandardColours[0]);
     EXPECT_EQ(p[18], kStandardColours[15]);
-    EXPECT_EQ(p[44], kStandardColours[10]); // last built-in number
-    EXPECT_EQ(p[45], 0x123456u);            // not given by the scheme
+    EXPECT_EQ(p[44], kStandardColours[10]); // last of the given numbers
+    EXPECT_EQ(p[45], kStandardColours[10]); // the oscillator lines, as a new install has them
+    EXPECT_EQ(p[48], kStandardColours[13]);
 
     Palette back = Filled(0);
     EXPECT_EQ(ReadColourFile(root.folder() + "koriclr.dat", back), 49);

@@ -1,8 +1,8 @@
 #include "app/chart_service.h"
 #include "app/split_chart.h"
-#include "chart/number_format.h"
 #include "chart/stream_reader.h"
 #include "platform/files.h"
+#include "platform/number_format.h"
 #include "platform/text.h"
 #include "store/name_file.h"
 #include "store/price_file.h"
@@ -132,8 +132,8 @@ TEST_F(Split, LowerHalfIsTheSecondSecurityAtItsPeriodInTheSameStream) {
     const float krm = LastClose("KRM", 'W');
     {
         std::ofstream t(std::filesystem::path(s.session.folders.SystemFolder) / "Targets.txt");
-        t << "ALX," << chart::FormatNumber(alx, "0.00#") << ",U\r\n"
-          << "KRM," << chart::FormatNumber(krm, "0.00#") << ",D\r\n";
+        t << "ALX," << platform::FormatSingle(alx, "0.00#") << ",U\r\n"
+          << "KRM," << platform::FormatSingle(krm, "0.00#") << ",D\r\n";
     }
     app::ChartJob job = Job("ALX", 'A');
     app::SplitChart split;

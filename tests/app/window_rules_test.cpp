@@ -7,6 +7,7 @@
 
 using namespace kori::app;
 using kori::test::TempRoot;
+namespace chart = kori::chart;
 
 TEST(WindowRules, LogoStandsCentredAcrossAndJustAboveTheMiddle) {
     // 1920 x 1080 screen, 420 x 220 logo: (1920-420)/2 = 750; 0.97*1080/2 - 110 = 413.8 -> 414.
@@ -67,30 +68,32 @@ TEST(WindowRules, StopLossPercentOfZeroMeansNoPercentStop) {
 }
 
 TEST(WindowRules, SwingValuesByMethod) {
-    EXPECT_FALSE(SwingValueProblem("XDay", "1"));
-    EXPECT_FALSE(SwingValueProblem("XDay", "30"));
-    ASSERT_TRUE(SwingValueProblem("XDay", "31"));
-    EXPECT_EQ(SwingValueProblem("XDay", "31")->text, "Incorrect values entered");
-    EXPECT_EQ(SwingValueProblem("XDay", "0")->title, "Swing");
-    EXPECT_FALSE(SwingValueProblem("XPoint", "250")); // points have no upper bound
-    EXPECT_TRUE(SwingValueProblem("XPoint", "0.5"));
-    EXPECT_FALSE(SwingValueProblem("NORM", "")); // the standard swing takes no value
+    EXPECT_FALSE(SwingValueProblem(chart::SwingMethod::XDay, "1"));
+    EXPECT_FALSE(SwingValueProblem(chart::SwingMethod::XDay, "30"));
+    ASSERT_TRUE(SwingValueProblem(chart::SwingMethod::XDay, "31"));
+    EXPECT_EQ(SwingValueProblem(chart::SwingMethod::XDay, "31")->text, "Incorrect values entered");
+    EXPECT_EQ(SwingValueProblem(chart::SwingMethod::XDay, "0")->title, "Swing");
+    EXPECT_FALSE(
+        SwingValueProblem(chart::SwingMethod::XPoint, "250")); // points have no upper bound
+    EXPECT_TRUE(SwingValueProblem(chart::SwingMethod::XPoint, "0.5"));
+    EXPECT_FALSE(
+        SwingValueProblem(chart::SwingMethod::Norm, "")); // the standard swing takes no value
 }
 
 TEST(WindowRules, SwingSettingsRoundTripAndDefaultByMethod) {
     TempRoot root;
     kori::platform::IniFile ini(root.path() / "Kori.ini");
     auto s = ReadSwingSettings(ini);
-    EXPECT_EQ(s.SwingMethod, "NORM");
+    EXPECT_EQ(s.SwingMethod, chart::SwingMethod::Norm);
     EXPECT_FLOAT_EQ(s.SwingValue, 9.0f);
-    WriteSwingSettings(ini, {"XDay", 5});
+    WriteSwingSettings(ini, {chart::SwingMethod::XDay, 5});
     s = ReadSwingSettings(ini);
-    EXPECT_EQ(s.SwingMethod, "XDay");
+    EXPECT_EQ(s.SwingMethod, chart::SwingMethod::XDay);
     EXPECT_FLOAT_EQ(s.SwingValue, 5.0f);
     (void)ini.Write("Charts", "SwingMethod", "xpoint");
     (void)ini.Write("Charts", "SwingValue", "junk");
     s = ReadSwingSettings(ini);
-    EXPECT_EQ(s.SwingMethod, "XPoint");
+    EXPECT_EQ(s.SwingMethod, chart::SwingMethod::XPoint);
     EXPECT_FLOAT_EQ(s.SwingValue, 9.0f);
 }
 

@@ -1,6 +1,8 @@
 #include "chart/point_figure.h"
 #include "chart_test_rig.h"
 
+#include <limits>
+
 using namespace kori::chart;
 using kori::test::ChartRig;
 using kori::test::HasRun;
@@ -204,4 +206,65 @@ TEST(PointFigureChart, ColumnsReachingTheRightEdgeWipeAndStartAgain) {
     // Nothing was drawn beyond the edge.
     for (const auto& l : Starting(lines, "X,"))
         EXPECT_LT(std::stoi(l.substr(3)), 354 - 8) << l;
+}
+
+// Every loop that steps by a box is bounded: a box below the float's precision at the price
+// ends the move, a not-a-number close is skipped like a zero close.
+TEST(PointFigureColumns, StepsThatCannotMoveEndTheMove) {
+    PFColumns pf(0, 0.005f, 3);
+    int boxes = 0;
+    pf.onBox = [&boxes](const PFBox&) { ++boxes; };
+    pf.Close(1e7f, 0);
+    pf.Close(1e7f + 1.0f, 1); // 0.005 does not change a float of 1e7
+    pf.Close(std::numeric_limits<float>::quiet_NaN(), 2);
+    EXPECT_EQ(boxes, 1);
+    EXPECT_FLOAT_EQ(pf.LastBox(), 1e7f);
+    // A move longer than a chart has rows stops at that many boxes.
+    PFColumns tall(0, 1, 3);
+    boxes = 0;
+    tall.onBox = [&boxes](const PFBox&) { ++boxes; };
+    tall.Close(1, 0);
+    tall.Close(1e6f, 1);
+    EXPECT_EQ(boxes, 1 + pf::MaxRows + 1);
+}
+
+TEST(PointFigureColumns, RangeProblems) {
+    EXPECT_FALSE(PFRangeProblem({1.5f, 2.5f, 0, 3}, 0.01f));
+    EXPECT_FALSE(PFRangeProblem({0, std::numeric_limits<float>::quiet_NaN()}, 0.01f));
+    EXPECT_EQ(PFRangeProblem({1.86f, 1e7f}, 0.053f), 1e7f); // too many rows
+    EXPECT_EQ(PFRangeProblem({1e7f, 1e7f + 1}, 100.0f), std::nullopt);
+    EXPECT_EQ(PFRangeProblem({1e7f, 1e7f + 2}, 0.5f), 1e7f + 2); // below the precision
+    EXPECT_EQ(PFRangeProblem({-4, 4}, 0), 4.0f);
+}
+
+// One huge close among small prices used to step box by box for ever: now the chart is
+// refused at once with a message naming the box value and the price.
+TEST(PointFigureChart, BoxesTooSmallForThePricesAreRefused) {
+    ChartRig r;
+    PointFigureRig(r);
+    r.dialogs.QueueInput(std::string("0.05"));
+    r.Add("20240301", 2, 2, 2, 2);
+    r.Add("20240302", 2, 2, 2, 1e7f);
+    r.Add("20240303", 2, 2, 2, 2.1f);
+    EXPECT_FALSE(r.Build().ok());
+    EXPECT_TRUE(r.chart.Failed);
+    ASSERT_EQ(r.dialogs.messages().size(), 1u);
+    EXPECT_EQ(r.dialogs.messages()[0],
+              "Box value 0.05 is too small for prices up to 1e+07: BHP cannot be drawn as "
+              "point and figure.");
+    EXPECT_TRUE(Starting(r.Lines(), "B, 9,").empty());
+}
+
+// A box value typed too small for the range gives way to the automatic one, with a message.
+TEST(PointFigureChart, TooSmallATypedBoxTakesTheAutomaticValue) {
+    ChartRig r;
+    PointFigureRig(r);
+    r.dialogs.QueueInput(std::string("0.001"));
+    r.Add("20240301", 50, 51, 49, 50);
+    r.Add("20240302", 50, 601, 49, 600);
+    ASSERT_TRUE(r.Build().ok());
+    ASSERT_EQ(r.dialogs.messages().size(), 1u);
+    EXPECT_NE(r.dialogs.messages()[0].find("Box value 0.003 is too small for prices up to 600"),
+              std::string::npos);
+    EXPECT_GT(r.chart.ChartCeiling, 0.003f);
 }

@@ -102,7 +102,7 @@ TEST(StreamReader, ReadsBackWhatTheWriterWrote) {
     w.Dot('K', 0, 7, 0xFFFFFF);
     w.Text('T', 8.25, 1.5, 2, "Close  12, up", 255);
     w.Text('S', 9.75, 3, 4, "Two  words", 65535);
-    w.Close();
+    ASSERT_TRUE(w.Close().ok());
 
     StreamReader::Result last{};
     const auto all = ReadAll(*platform::ReadWholeFile(path), last);

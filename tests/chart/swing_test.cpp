@@ -22,7 +22,7 @@ void AddBars(ChartRig& r, const std::vector<std::pair<float, float>>& hl) {
 
 void SwingRig(ChartRig& r, const char* method, float value = 0) {
     r.request.SwingOn = true;
-    r.request.SwingMethod = method;
+    r.request.SwingMethod = ParseSwingMethod(method).value();
     r.request.SwingValue = value;
 }
 
@@ -107,18 +107,41 @@ TEST(Swing, AverageSwingAndTitles) {
     EXPECT_FLOAT_EQ(AverageSwing(bars, 4), 300);
     EXPECT_FLOAT_EQ(AverageSwing(bars, 1), 5);
     EXPECT_FLOAT_EQ(AverageSwing({bar(10, 8), bar(10, 8)}, 5), 5);
-    EXPECT_EQ(SwingTitleText('W', "XPoint", 9), "Weekly Swing 9 - POINT");
-    EXPECT_EQ(SwingTitleText('M', "XPointAuto", 12), "Monthly Swing 12 - Point(Auto)");
+    EXPECT_EQ(SwingTitleText('W', SwingMethod::XPoint, 9), "Weekly Swing 9 - POINT");
+    EXPECT_EQ(SwingTitleText('M', SwingMethod::XPointAuto, 12), "Monthly Swing 12 - Point(Auto)");
+}
+
+// One home for the method: its name both ways, whether it takes a value, and its panel.
+TEST(Swing, MethodsByName) {
+    for (SwingMethod m : SwingMethods())
+        EXPECT_EQ(ParseSwingMethod(SwingMethodName(m)), m);
+    EXPECT_EQ(ParseSwingMethod(" xday "), SwingMethod::XDay);
+    EXPECT_EQ(ParseSwingMethod("xpointauto"), SwingMethod::XPointAuto);
+    EXPECT_FALSE(ParseSwingMethod("XWeek"));
+    EXPECT_FALSE(ParseSwingMethod(""));
+    EXPECT_EQ(SwingMethods().size(), 4u);
+    EXPECT_EQ(SwingMethods().front(), SwingMethod::Norm);
+    EXPECT_TRUE(SwingMethodTakesValue(SwingMethod::XDay));
+    EXPECT_TRUE(SwingMethodTakesValue(SwingMethod::XPoint));
+    EXPECT_FALSE(SwingMethodTakesValue(SwingMethod::XPointAuto));
+    EXPECT_FALSE(SwingMethodTakesValue(SwingMethod::Norm));
+    EXPECT_EQ(SwingSidePanel(SwingMethod::Norm), SidePanel::None);
+    EXPECT_EQ(SwingSidePanel(SwingMethod::XPointAuto), SidePanel::XPointAuto);
+    EXPECT_EQ(SwingSidePanel(SwingMethod::XDay), SidePanel::Other);
+    EXPECT_EQ(SwingSidePanel(SwingMethod::XPoint), SidePanel::Other);
+    EXPECT_TRUE(SwingValueValid(SwingMethod::Norm, -1)); // takes no value
+    EXPECT_EQ(SwingValueOf(SwingMethod::XDay, 5), 5);
+    EXPECT_EQ(SwingValueOf(SwingMethod::XPointAuto, -2), 9);
 }
 
 TEST(Swing, ValuesAndTheSwitch) {
-    EXPECT_TRUE(SwingValueValid("XDay", 30));
-    EXPECT_FALSE(SwingValueValid("XDay", 31));
-    EXPECT_FALSE(SwingValueValid("XDay", 0.5f));
-    EXPECT_FALSE(SwingValueValid("XPoint", 0.5f));
-    EXPECT_TRUE(SwingValueValid("XPoint", 500));
-    EXPECT_EQ(SwingValueOf("XDay", 0), 3);
-    EXPECT_EQ(SwingValueOf("XPoint", 0), 9);
+    EXPECT_TRUE(SwingValueValid(SwingMethod::XDay, 30));
+    EXPECT_FALSE(SwingValueValid(SwingMethod::XDay, 31));
+    EXPECT_FALSE(SwingValueValid(SwingMethod::XDay, 0.5f));
+    EXPECT_FALSE(SwingValueValid(SwingMethod::XPoint, 0.5f));
+    EXPECT_TRUE(SwingValueValid(SwingMethod::XPoint, 500));
+    EXPECT_EQ(SwingValueOf(SwingMethod::XDay, 0), 3);
+    EXPECT_EQ(SwingValueOf(SwingMethod::XPoint, 0), 9);
 
     ChartRequest req;
     req.ChartStyle = 'C';

@@ -216,5 +216,22 @@ TEST_F(KoriCommands, IndicatorHeadersAndRefusals) {
     EXPECT_NE(Kori({"indicator", "RSI", "KRM"}).status, 0) << "no --csv";
 }
 
+TEST_F(KoriCommands, EachRunBuildsIntoItsOwnStreamAndRemovesIt) {
+    // The desktop program's stream is left alone, and no stream of a run stays behind.
+    const auto temp = std::filesystem::path(Root()) / "temp";
+    std::filesystem::create_directories(temp);
+    {
+        std::ofstream window(temp / "TCht.Tmp", std::ios::binary | std::ios::trunc);
+        window << "the chart window's own stream\r\n";
+    }
+    const auto r = Kori({"chart", "HBK", "--pdf", Out("own.pdf"), "--stream", Out("own.cht")});
+    ASSERT_EQ(r.status, 0) << r.err;
+    EXPECT_EQ(ReadFile(temp / "TCht.Tmp"), "the chart window's own stream\r\n");
+    EXPECT_EQ(ReadFile(Out("own.cht")).find("the chart window"), std::string::npos);
+    EXPECT_NE(ReadFile(Out("own.cht")).find("HBK"), std::string::npos);
+    for (const auto& e : std::filesystem::directory_iterator(temp))
+        EXPECT_EQ(e.path().filename(), "TCht.Tmp") << "left behind: " << e.path();
+}
+
 } // namespace
 } // namespace kori::test

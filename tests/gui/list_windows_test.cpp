@@ -200,10 +200,22 @@ TEST_F(Lists, UtilitiesRefuseTheSameListAndCopyOnlyBetweenTwoShownLists) {
     right.chooser()->setCurrentIndex(10);
     EXPECT_TRUE(right.displayed());
     EXPECT_TRUE(std::filesystem::exists(store::ListPath(data(), 'Z'))) << "created by opening";
+    right.box().Add("KRM");
+    right.Refresh();
+    QString count;
+    for (auto* label : right.findChildren<QLabel*>())
+        if (label->objectName().startsWith(QStringLiteral("lblCount"))) count = label->text();
+    EXPECT_EQ(count, "1 chart");
+    right.box().Clear();
+    right.Refresh();
 
     Select(left.list(), {0, 5});
     Click(w, "cmdCopyRight");
     EXPECT_EQ(Shown(right.list()), (std::vector<std::string>{"KRM", "ZNC"}));
+    Select(left.list(), {0, 1, 5});
+    Click(w, "cmdCopyRight");
+    EXPECT_EQ(Shown(right.list()), (std::vector<std::string>{"KRM", "ZNC", "ALX"}))
+        << "a second copy adds no duplicates";
     EXPECT_EQ(left.list()->count(), 8) << "copying leaves the source whole";
 
     s.dialogs.QueueAnswer(Answer::No);
@@ -215,32 +227,37 @@ TEST_F(Lists, UtilitiesRefuseTheSameListAndCopyOnlyBetweenTwoShownLists) {
     w.reject();
     EXPECT_EQ(LastMsg().text, "Chart List Z has changed. SAVE Changes?");
     EXPECT_EQ(LastMsg().title, "Chart Lists");
-    EXPECT_EQ(OnDisk('Z'), (std::vector<std::string>{"KRM:4", "ZNC:30"}));
+    EXPECT_EQ(OnDisk('Z'), (std::vector<std::string>{"KRM:4", "ZNC:30", "ALX:5"}));
     Shot(w, "SubList2");
 }
 
-TEST_F(Lists, TextImportTakesCodeLinesAndDropsUnknownCodesOnSave) {
+TEST_F(Lists, TextImportTakesCodeLinesAndListsWhatItRefuses) {
     std::filesystem::create_directories(s.root.path() / "imports");
-    const auto file = s.root.Write("imports/codes.txt",
-                                   "BHP\r\nhbk\r\nKST\r\nWES.AX\r\n MRW\r\nMRW\r\nTOOLONG\r\nDLT");
+    const auto file =
+        s.root.Write("imports/codes.txt", "BHP\r\nhbk\r\nKST\r\nWES.AX\r\n mrw \r\nTOOLONG\r\nDLT");
     gui::SubList3 w(s.session, hub());
     EXPECT_EQ(w.windowTitle(), "Import Text to Chart Lists");
     EXPECT_EQ(w.folder(), sys()) << "no folder kept yet";
     ASSERT_TRUE(w.LoadFile(file));
-    EXPECT_EQ(Shown(w.fileBox()), (std::vector<std::string>{"BHP", "hbk", "KST", "MRW", "DLT"}));
+    EXPECT_EQ(Shown(w.fileBox()), (std::vector<std::string>{"BHP", "HBK", "KST", "MRW", "DLT"}))
+        << "lower case and blanks around a code do not lose it";
+    EXPECT_EQ(LastMsg().text, std::string(store::kImportRefusedHeading) + "\nWES.AX\nTOOLONG");
+    EXPECT_EQ(LastMsg().title, "Chart Lists");
     EXPECT_EQ(s.settings.Get("SL3TXT", ""), (s.root.path() / "imports").string() + "/");
 
+    s.dialogs.clear();
     w.panel().chooser()->setCurrentIndex(3); // list D, absent until now
     Select(w.fileBox(), {2});
     Click(w, "cmdMove");
     Click(w, "cmdMoveAll");
     EXPECT_EQ(w.fileBox()->count(), 0);
     EXPECT_EQ(Shown(w.panel().list()),
-              (std::vector<std::string>{"KST", "BHP", "hbk", "MRW", "DLT"}));
+              (std::vector<std::string>{"KST", "BHP", "HBK", "MRW", "DLT"}));
     Click(w, "cmdSave");
-    EXPECT_EQ(OnDisk('D'), (std::vector<std::string>{"KST:15", "MRW:17", "DLT:8"}))
-        << "codes the name file does not hold are dropped in silence";
-    EXPECT_TRUE(s.dialogs.messages().empty());
+    EXPECT_EQ(OnDisk('D'), (std::vector<std::string>{"KST:15", "HBK:12", "MRW:17", "DLT:8"}));
+    ASSERT_EQ(s.dialogs.messages().size(), 1u);
+    EXPECT_EQ(s.dialogs.messages().back(), std::string(store::kSaveDroppedHeading) + "\nBHP")
+        << "a code the name file does not hold is told, not dropped in silence";
 
     EXPECT_FALSE(w.LoadFile(s.root.path() / "imports" / "missing.txt"));
     gui::SubList3 again(s.session, hub());

@@ -221,17 +221,21 @@ TEST_F(SampleRoot, ColoursClickAColourThenItemsAndSave) {
     EXPECT_EQ(dialogs.shown().back().kind, "beep");
 
     QTest::mouseClick(w.colourSwatch(12), Qt::LeftButton); // light red
-    QTest::mouseClick(w.roleSwatch(0), Qt::LeftButton);    // Background, entry 16
-    QTest::mouseClick(w.roleSwatch(31), Qt::LeftButton);   // End of year marker, entry 47
-    EXPECT_EQ(w.table()[16], platform::kStandardColours[12]);
-    EXPECT_EQ(w.table()[47], platform::kStandardColours[12]);
-    EXPECT_NE(session.palette[16], platform::kStandardColours[12]); // nothing kept until saved
+    const platform::Colour frame = w.table()[16];
+    QTest::mouseClick(w.roleSwatch(0), Qt::LeftButton);  // Background: the cleared plot, 17
+    QTest::mouseClick(w.roleSwatch(31), Qt::LeftButton); // End of year marker: year lines, 34
+    EXPECT_EQ(w.table()[17], platform::kStandardColours[12]);
+    EXPECT_EQ(w.table()[34], platform::kStandardColours[12]);
+    EXPECT_EQ(w.table()[16], frame) << "the frame is not the background";
+    EXPECT_NE(session.palette[17], platform::kStandardColours[12]); // nothing kept until saved
+    // The swatch shows the colour the chart takes.
+    EXPECT_TRUE(w.roleSwatch(0)->styleSheet().contains(QStringLiteral("#ff0000")));
 
     Click(w, "cmdSave");
     platform::Palette read{};
     ASSERT_EQ(app::ReadColourFile(session.folders.SystemFolder + "koriclr.dat", read), 49);
-    EXPECT_EQ(read[16], platform::kStandardColours[12]);
-    EXPECT_EQ(session.palette[47], platform::kStandardColours[12]);
+    EXPECT_EQ(read[17], platform::kStandardColours[12]);
+    EXPECT_EQ(session.palette[34], platform::kStandardColours[12]);
 }
 
 TEST_F(SampleRoot, ColourSchemesApplyAndSaveAsDefault) {
@@ -240,18 +244,23 @@ TEST_F(SampleRoot, ColourSchemesApplyAndSaveAsDefault) {
     ASSERT_EQ(buttons.size(), 3);
     EXPECT_EQ(buttons[1]->text(), "Default WHITE");
     QTest::mouseClick(buttons[1], Qt::LeftButton);
-    // The built-in scheme: entry 16 takes palette 3, entry 17 palette 0.
-    EXPECT_EQ(w.table()[16], platform::kStandardColours[3]);
-    EXPECT_EQ(w.table()[17], platform::kStandardColours[0]);
+    // The built-in white scheme: a white plot with black bars, and the chart on show takes it.
+    EXPECT_EQ(w.table()[17], platform::kStandardColours[15]);
+    EXPECT_EQ(w.table()[18], platform::kStandardColours[0]);
+    EXPECT_EQ(session.palette[17], platform::kStandardColours[15]);
+    EXPECT_TRUE(w.roleSwatch(0)->styleSheet().contains(QStringLiteral("#ffffff")));
+    QTest::mouseClick(buttons[2], Qt::LeftButton);
+    EXPECT_EQ(session.palette[17], platform::kStandardColours[1]) << "Default BLUE";
 
-    QTest::mouseClick(w.colourSwatch(15), Qt::LeftButton);
+    QTest::mouseClick(buttons[1], Qt::LeftButton);
+    QTest::mouseClick(w.colourSwatch(14), Qt::LeftButton);
     QTest::mouseClick(w.roleSwatch(0), Qt::LeftButton);
     dialogs.QueueAnswer(Answer::Yes);
     Click(w, "cmdSaveDefault");
     EXPECT_EQ(LastTitle(), "Colours");
     platform::Palette scheme{};
     ASSERT_TRUE(app::ReadColourFile(session.folders.SystemFolder + "koriclr.WHT", scheme));
-    EXPECT_EQ(scheme[16], platform::kStandardColours[15]);
+    EXPECT_EQ(scheme[17], platform::kStandardColours[14]);
 }
 
 TEST_F(SampleRoot, FontsNeedBothAndAreWrittenUnderBothSections) {

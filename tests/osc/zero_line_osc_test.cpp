@@ -124,4 +124,6 @@ TEST(ElderRayCompute, BullAndBearPower) {
     EXPECT_FLOAT_EQ(*c.bull[2], 1.0f);
     EXPECT_FLOAT_EQ(*c.bear[3], 1.5f);
     EXPECT_EQ(Computed(ComputeElderRay(bars, 5, 4).bull), 0);
+    // A type below 4 that is not 1 to 3 has no highs and lows either: closes, as for type 3.
+    EXPECT_FLOAT_EQ(*ComputeElderRay(bars, 3, 0).bear[3], 1.5f);
 }

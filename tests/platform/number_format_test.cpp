@@ -5,6 +5,7 @@
 using kori::platform::Format;
 using kori::platform::FormatDate;
 using kori::platform::FormatSingle;
+using kori::platform::ZeroSign;
 
 namespace {
 
@@ -103,6 +104,21 @@ TEST(Format, SinglesUseTheirOwnSevenDigits) {
     EXPECT_EQ(FormatSingle(0.145f, "0.00"), "0.15");
     EXPECT_EQ(Format(static_cast<double>(0.145f), "0.00"), "0.14");
     EXPECT_EQ(FormatSingle(1.1f, "#####.00#"), "1.10");
+}
+
+// Chart labels drop the sign of a negative that shows as zero; a figure that shows digits
+// keeps it, and so does everything else by default.
+TEST(Format, ZeroSignDroppedOnRequest) {
+    constexpr auto dropped = ZeroSign::Dropped;
+    EXPECT_EQ(Format(-0.001, "0.00", dropped), "0.00");
+    EXPECT_EQ(Format(-0.04, "##.#", dropped), ".");
+    EXPECT_EQ(Format(-0.3, "######", dropped), "");
+    EXPECT_EQ(Format(-0.0001, "0.0000", dropped), "-0.0001");
+    EXPECT_EQ(Format(-3.456, "0.00", dropped), "-3.46");
+    EXPECT_EQ(FormatSingle(-1e-7f, ".00#", dropped), ".00");
+    EXPECT_EQ(FormatSingle(-2.675f, "#####0.00", dropped), "-2.68");
+    EXPECT_EQ(Format(-0.001, "0.00"), "-0.00");
+    EXPECT_EQ(FormatSingle(-1e-7f, ".00#"), "-.00");
 }
 
 TEST(Format, DatePatterns) {

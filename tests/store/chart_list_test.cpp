@@ -80,15 +80,27 @@ TEST(ChartList, ShowListCreatesAnAbsentListAndStockListFollowsTheNameFile) {
     EXPECT_EQ(codes, (std::vector<std::string>{"C1", "AAA", "C1"}));
 }
 
-TEST(ChartList, ImportKeepsWholeLinesOfOneToSixLettersOrDigits) {
+TEST(ChartList, ImportTrimsAndUpperCasesLinesThenKeepsOneToSixLettersOrDigits) {
     kori::test::TempRoot root;
     EXPECT_FALSE(ReadImportCodes(root.path() / "none.txt").has_value());
-    // CR LF, bare LF and a last line without its end; a blank, a padded code, a long one and
-    // punctuation are skipped.
-    root.Write("codes.txt", "BHP\r\nanz\r\n\r\n CBA\r\nABCDEFG\nWES.AX\nQ1W2E3\rNAB");
-    const auto codes = ReadImportCodes(root.path() / "codes.txt");
-    ASSERT_TRUE(codes.has_value());
-    EXPECT_EQ(*codes, (std::vector<std::string>{"BHP", "anz", "Q1W2E3", "NAB"}));
+    // CR LF, bare LF and a last line without its end; lower case and blanks around a code are
+    // no reason to lose it; a long one and punctuation are refused, a blank line is nothing.
+    root.Write("codes.txt", "BHP\r\nanz\r\n\r\n CBA \r\nABCDEFG\nWES.AX\nQ1W2E3\rnab\t");
+    const auto read = ReadImportFile(root.path() / "codes.txt");
+    ASSERT_TRUE(read.has_value());
+    EXPECT_EQ(read->Codes, (std::vector<std::string>{"BHP", "ANZ", "CBA", "Q1W2E3", "NAB"}));
+    EXPECT_EQ(read->Refused, (std::vector<std::string>{"ABCDEFG", "WES.AX"}));
+    EXPECT_EQ(ReadImportCodes(root.path() / "codes.txt"), read->Codes);
+    EXPECT_EQ(RefusedCodesMessage("Not codes:", read->Refused), "Not codes:\nABCDEFG\nWES.AX");
+}
+
+TEST(ChartList, CopiesAddOnlyCodesTheBoxDoesNotHold) {
+    ChartListBox box;
+    EXPECT_TRUE(box.Add("KRM"));
+    EXPECT_TRUE(box.AddIfAbsent("ALX"));
+    EXPECT_FALSE(box.AddIfAbsent("KRM"));
+    EXPECT_FALSE(box.AddIfAbsent(" ALX "));
+    EXPECT_EQ(box.codes(), (std::vector<std::string>{"KRM", "ALX"}));
 }
 
 TEST(ChartList, ChoosersMapRowsToModesWithZAfterTheTen) {

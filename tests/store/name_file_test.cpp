@@ -29,6 +29,15 @@ TEST(NameRecord, FieldsSitAtTheirOffsets) {
     EXPECT_EQ(PadCode("prn"), "PRNX  ");
 }
 
+// The one test of "closes only" that charts, oscillators and the series loader share: types
+// 1 to 3, and any type a bar chart cannot take (below 4).
+TEST(NameRecord, CloseOnlyTypes) {
+    for (int type : {-1, 0, 1, 2, 3})
+        EXPECT_TRUE(kori::store::IsCloseOnly(type)) << type;
+    for (int type : {4, 5})
+        EXPECT_FALSE(kori::store::IsCloseOnly(type)) << type;
+}
+
 TEST(NameFile, FindsCodesExactlyWhateverTheCaseOfTheRequest) {
     kori::test::TempRoot root;
     NameFile f(NameFile::PathIn(root.folder()));

@@ -14,8 +14,8 @@ QPageLayout::Orientation ToQt(int orientation) {
 } // namespace
 
 PdfPrinter::PdfPrinter(const std::filesystem::path& path, int dotsPerInch)
-    : m_path(path), m_partPath(path.string() + ".kori-new"), m_dpi(dotsPerInch),
-      m_writer(QString::fromStdString(m_partPath.string())) {
+    : m_path(path), m_dpi(dotsPerInch), m_writer(&m_buffer) {
+    if (!m_buffer.open(QIODevice::WriteOnly)) m_failed = true;
     m_writer.setResolution(m_dpi);
     m_writer.setPageSize(QPageSize(QPageSize::A4));
     m_writer.setPageMargins(QMarginsF(0, 0, 0, 0));
@@ -25,8 +25,6 @@ PdfPrinter::PdfPrinter(const std::filesystem::path& path, int dotsPerInch)
 
 PdfPrinter::~PdfPrinter() {
     if (m_painter.isActive()) m_painter.end();
-    std::error_code ec;
-    if (!m_ended) std::filesystem::remove(m_partPath, ec);
 }
 
 // Before the first drawing this shapes the first page; afterwards, the next one.
@@ -71,20 +69,21 @@ void PdfPrinter::NewPage() {
 
 platform::Status PdfPrinter::EndDoc() {
     Page(); // an empty document is still one blank page
-    if (m_ended) return platform::Status::Ok();
-    if (m_painter.isActive()) m_painter.end();
+    if (m_ended) return m_result;
     m_ended = true;
-    std::error_code ec;
-    if (m_failed || !platform::FileHasData(m_partPath)) {
-        std::filesystem::remove(m_partPath, ec);
-        return platform::Status::Error("Cannot write " + m_path.string());
+    bool ok = !m_failed;
+    // The painter writes the last objects and the cross-reference table at its end.
+    if (m_painter.isActive() && !m_painter.end()) ok = false;
+    m_buffer.close();
+    if (!ok || m_bytes.isEmpty()) {
+        m_result = platform::Status::Error("Cannot write " + m_path.string());
+        return m_result;
     }
-    std::filesystem::rename(m_partPath, m_path, ec);
-    if (ec) {
-        std::filesystem::remove(m_partPath, ec);
-        return platform::Status::Error("Cannot write " + m_path.string());
-    }
-    return platform::Status::Ok();
+    if (m_path.empty()) return m_result;
+    m_result = platform::WriteFileAtomic(
+        m_path, std::string_view(m_bytes.constData(), static_cast<std::size_t>(m_bytes.size())));
+    if (!m_result) m_result = platform::Status::Error("Cannot write " + m_path.string());
+    return m_result;
 }
 
 void PdfPrinter::Clear() {

@@ -1,10 +1,13 @@
 #pragma once
 // The printed page as a PDF document: A4, portrait or landscape, at 600 dots an inch. Printer
 // units are those dots, so a dot is 2.4 twips; the page starts on the first drawing call. The
-// document is written beside the target and takes its name only when it is complete.
+// document is made in memory and goes to disk through the safe write at the end, so the target
+// takes it only whole: a painter that fails to end or a failed write leaves the old file.
 #include "gui/paint/qt_surface.h"
 #include "platform/printer.h"
 
+#include <QBuffer>
+#include <QByteArray>
 #include <QPainter>
 #include <QPdfWriter>
 
@@ -16,6 +19,8 @@ namespace kori::gui {
 class PdfPrinter : public platform::Printer {
 public:
     explicit PdfPrinter(const std::filesystem::path& path, int dotsPerInch = 600);
+    // A document kept in memory only: EndDoc finishes it, the caller decides whether to keep it.
+    PdfPrinter() : PdfPrinter(std::filesystem::path()) {}
     ~PdfPrinter() override;
     PdfPrinter(const PdfPrinter&) = delete;
     PdfPrinter& operator=(const PdfPrinter&) = delete;
@@ -29,6 +34,10 @@ public:
     double TwipsPerPixelY() const override { return 1440.0 / m_dpi; }
     void NewPage() override;
     platform::Status EndDoc() override;
+    // The finished document (after EndDoc).
+    std::string_view Document() const {
+        return {m_bytes.constData(), static_cast<std::size_t>(m_bytes.size())};
+    }
 
     void Clear() override;
     void SetBackColour(platform::Colour c) override;
@@ -53,7 +62,8 @@ private:
     void ApplyOrigin();
 
     std::filesystem::path m_path;
-    std::filesystem::path m_partPath; // written beside, renamed over the target at the end
+    QByteArray m_bytes;
+    QBuffer m_buffer{&m_bytes};
     int m_dpi;
     int m_orientation = platform::kPortrait;
     double m_originLeft = 0, m_originTop = 0;
@@ -62,6 +72,7 @@ private:
     std::optional<QtSurface> m_page;
     bool m_failed = false;
     bool m_ended = false;
+    platform::Status m_result = platform::Status::Ok();
 };
 
 } // namespace kori::gui

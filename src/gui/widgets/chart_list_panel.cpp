@@ -68,11 +68,15 @@ bool ChartListPanel::Display(int mode) {
 }
 
 bool ChartListPanel::Save() {
-    if (auto s = m_box.Save(m_session.folders.DataFolder); !s) {
+    std::vector<std::string> dropped;
+    if (auto s = m_box.Save(m_session.folders.DataFolder, &dropped); !s) {
         m_session.dialogs().MsgBox(s.message(), "Chart Lists");
         return false;
     }
     Refresh();
+    if (!dropped.empty())
+        m_session.dialogs().MsgBox(store::RefusedCodesMessage(store::kSaveDroppedHeading, dropped),
+                                   "Chart Lists");
     return true;
 }
 

@@ -4,7 +4,6 @@
 #include "app/chart_window_tools.h"
 #include "app/colour_table.h"
 #include "app/window_rules.h"
-#include "chart/number_format.h"
 #include "chart/saved_chart.h"
 #include "chart/screen_player.h"
 #include "chart/swing.h"
@@ -15,6 +14,7 @@
 #include "osc/osc_identifiers.h"
 #include "platform/date_text.h"
 #include "platform/files.h"
+#include "platform/number_format.h"
 #include "platform/text.h"
 #include "store/price_file.h"
 
@@ -349,9 +349,7 @@ void Chts::SetSwing(bool on) {
         const app::SwingSettings settings = app::ReadSwingSettings(m_session.ini());
         r.SwingMethod = settings.SwingMethod;
         r.SwingValue = settings.SwingValue;
-        r.SwingPanel = r.SwingMethod == "NORM"         ? chart::SidePanel::None
-                       : r.SwingMethod == "XPointAuto" ? chart::SidePanel::XPointAuto
-                                                       : chart::SidePanel::Other;
+        r.SwingPanel = chart::SwingSidePanel(r.SwingMethod);
     } else {
         r.SwingPanel = chart::SidePanel::None;
     }

@@ -28,7 +28,7 @@ void Paint(QPushButton* swatch, platform::Colour c, bool selected = false) {
 
 ColNew::ColNew(app::Session& session, SettingsHub& hub, QWidget* parent)
     : SettingsDialog(session, hub, "ColNew", QStringLiteral("Change Chart Colours"), parent),
-      m_table(session.palette),
+      m_form(session.palette),
       m_hint(new QLabel(QStringLiteral("Click colour then click items that you want to change to "
                                        "that colour"),
                         this)) {
@@ -46,14 +46,19 @@ ColNew::ColNew(app::Session& session, SettingsHub& hub, QWidget* parent)
     auto* rolesGrid = new QGridLayout(rolesBox);
     rolesGrid->setHorizontalSpacing(10);
     rolesGrid->setVerticalSpacing(3);
-    const auto& names = app::ColourRoleNames();
-    constexpr int kRows = app::kRoleCount / 2;
-    for (int i = 0; i < app::kRoleCount; ++i) {
+    const auto& items = app::ColourItems();
+    const int count = static_cast<int>(items.size());
+    const int kRows = (count + 1) / 2;
+    for (int i = 0; i < count; ++i) {
+        const auto& item = items[static_cast<std::size_t>(i)];
         auto* swatch = Button(QString(), "cmdItem");
         swatch->setFixedSize(40, 18);
-        swatch->setToolTip(QStringLiteral("Entry %1").arg(app::kFirstRole + i));
+        swatch->setToolTip(
+            item.Drawn
+                ? QStringLiteral("Entry %1").arg(item.Entries.front())
+                : QStringLiteral("Entry %1: no chart draws in it yet").arg(item.Entries.front()));
         connect(swatch, &QPushButton::clicked, this, [this, i] { PaintItem(i); });
-        const auto& n = names[static_cast<std::size_t>(i)];
+        const auto& n = item.Name;
         const int col = (i / kRows) * 2;
         rolesGrid->addWidget(swatch, i % kRows, col);
         rolesGrid->addWidget(
@@ -94,55 +99,54 @@ ColNew::ColNew(app::Session& session, SettingsHub& hub, QWidget* parent)
 
 void ColNew::Refresh() {
     for (std::size_t i = 0; i < m_colours.size(); ++i)
-        Paint(m_colours[i], m_table[i], static_cast<int>(i) == m_selected);
+        Paint(m_colours[i], m_form.table()[i], static_cast<int>(i) == m_form.selected());
     for (std::size_t i = 0; i < m_roles.size(); ++i)
-        Paint(m_roles[i], m_table[app::kFirstRole + i]);
+        Paint(m_roles[i], m_form.ItemColour(i));
 }
 
 void ColNew::PickColour(int i) {
-    m_selected = i;
+    m_form.PickColour(i);
     Refresh();
 }
 
-void ColNew::PaintItem(int role) {
-    if (m_selected < 0) {
+void ColNew::PaintItem(int item) {
+    if (!m_form.PaintItem(static_cast<std::size_t>(item))) {
         dialogs().Beep(); // no colour clicked yet
         return;
     }
-    m_table[static_cast<std::size_t>(app::kFirstRole + role)] =
-        m_table[static_cast<std::size_t>(m_selected)];
     Refresh();
 }
 
 void ColNew::ApplyScheme(const char* scheme) {
-    m_scheme = scheme;
     // Applying a scheme writes koriclr.dat, as it does at start-up.
-    if (auto s = app::ApplyColourScheme(scheme, m_session.folders.SystemFolder, m_table); !s)
+    if (auto s = m_form.ApplyScheme(scheme, m_session.folders.SystemFolder); !s)
         dialogs().MsgBox(s.message(), "Colours");
-    m_session.palette = m_table;
+    m_session.palette = m_form.table();
     Refresh();
     m_hub.ColoursChanged();
 }
 
 void ColNew::SaveColours() {
     const std::string file = m_session.folders.SystemFolder + "koriclr.dat";
-    if (auto s = app::WriteColourFile(file, m_table); !s) {
+    if (auto s = app::WriteColourFile(file, m_form.table()); !s) {
         dialogs().MsgBox(s.message(), "Colours");
         return;
     }
-    m_session.palette = m_table;
+    m_session.palette = m_form.table();
     m_hub.ColoursChanged();
     m_hub.RebuildChart();
     accept();
 }
 
 void ColNew::SaveDefaultColours() {
-    const std::string question =
-        "Save the current colours as the default " + platform::Upper(m_scheme) + " colours ?";
+    const std::string question = "Save the current colours as the default " +
+                                 platform::Upper(m_form.scheme()) + " colours ?";
     if (dialogs().MsgBox(question, "Colours", platform::Buttons::YesNo, platform::Icon::Question) !=
         platform::Answer::Yes)
         return;
-    if (auto s = app::SaveColourScheme(m_scheme, m_session.folders.SystemFolder, m_table); !s)
+    if (auto s =
+            app::SaveColourScheme(m_form.scheme(), m_session.folders.SystemFolder, m_form.table());
+        !s)
         dialogs().MsgBox(s.message(), "Colours");
 }
 

@@ -1,5 +1,6 @@
 #pragma once
 // ColNew ("Change Chart Colours"): click a colour, then the items that are to take it.
+#include "app/colour_form.h"
 #include "gui/widgets/settings_dialog.h"
 #include "platform/palette.h"
 
@@ -16,8 +17,8 @@ class ColNew : public SettingsDialog {
 public:
     ColNew(app::Session& session, SettingsHub& hub, QWidget* parent = nullptr);
 
-    const platform::Palette& table() const { return m_table; }
-    // The sixteen palette swatches and the role swatches (entry 16 + i), for clicks.
+    const platform::Palette& table() const { return m_form.table(); }
+    // The sixteen palette swatches and the item swatches, in the window's order, for clicks.
     QPushButton* colourSwatch(int i) const { return m_colours[static_cast<std::size_t>(i)]; }
     QPushButton* roleSwatch(int i) const { return m_roles[static_cast<std::size_t>(i)]; }
 
@@ -29,9 +30,7 @@ private:
     void SaveDefaultColours();
     void Refresh();
 
-    platform::Palette m_table;
-    int m_selected = -1;
-    std::string m_scheme = "Black"; // the scheme "SAVE DEFAULT COLOURS" writes
+    app::ColourForm m_form;
     std::vector<QPushButton*> m_colours;
     std::vector<QPushButton*> m_roles;
     QLabel* m_hint;

@@ -80,8 +80,9 @@ bool SubList2::CopyAcross(int fromSide) {
         return false;
     }
     const auto rows = from.SelectedRows();
+    // A code the other list already holds is not added again.
     for (std::size_t row : rows)
-        to.box().Add(from.box().codes()[row]);
+        to.box().AddIfAbsent(from.box().codes()[row]);
     to.Refresh();
     return !rows.empty();
 }

@@ -72,17 +72,20 @@ void SubList3::ChooseFile() {
 }
 
 bool SubList3::LoadFile(const std::filesystem::path& file) {
-    const auto codes = store::ReadImportCodes(file);
-    if (!codes) {
+    const auto read = store::ReadImportFile(file);
+    if (!read) {
         dialogs().MsgBox("Cannot read " + file.string(), kTitle);
         return false;
     }
     m_file->clear();
-    for (const auto& code : *codes)
+    for (const auto& code : read->Codes)
         m_file->addItem(Q(code));
     const std::string dir = platform::FolderWithSlash(file.parent_path().string());
     m_session.services().settings.Save(kFolderKey, dir);
     m_folder->setText(Q(dir));
+    if (!read->Refused.empty())
+        dialogs().MsgBox(store::RefusedCodesMessage(store::kImportRefusedHeading, read->Refused),
+                         kTitle);
     return true;
 }
 

@@ -20,8 +20,8 @@ SwingSet::SwingSet(app::Session& session, SettingsHub& hub, QWidget* parent)
                               "Points, automatic"};
     for (std::size_t i = 0; i < m_methods.size(); ++i) {
         auto* r = new QRadioButton(QString::fromLatin1(captions[i]), box);
-        r->setObjectName(Q("opt" + std::string(app::SwingMethods()[i])));
-        r->setChecked(app::SwingMethods()[i] == s.SwingMethod);
+        r->setObjectName(Q("opt" + std::string(chart::SwingMethodName(chart::SwingMethods()[i]))));
+        r->setChecked(chart::SwingMethods()[i] == s.SwingMethod);
         l->addWidget(r);
         m_methods[i] = r;
     }
@@ -32,25 +32,24 @@ SwingSet::SwingSet(app::Session& session, SettingsHub& hub, QWidget* parent)
     m_layout->addLayout(form);
     for (std::size_t i = 0; i < m_methods.size(); ++i) {
         connect(m_methods[i], &QRadioButton::toggled, this, [this, i](bool on) {
-            const auto method = app::SwingMethods()[i];
-            m_value->setEnabled(method == "XDay" || method == "XPoint");
+            const auto method = chart::SwingMethods()[i];
+            m_value->setEnabled(chart::SwingMethodTakesValue(method));
             if (on && m_value->isEnabled())
-                m_value->setText(SingleText(app::DefaultSwingValue(method)));
+                m_value->setText(SingleText(chart::DefaultSwingValue(method)));
         });
     }
-    const auto method = s.SwingMethod;
-    m_value->setEnabled(method == "XDay" || method == "XPoint");
+    m_value->setEnabled(chart::SwingMethodTakesValue(s.SwingMethod));
     AddButtons();
 }
 
 bool SwingSet::Ok() {
     app::SwingSettings s;
     for (std::size_t i = 0; i < m_methods.size(); ++i)
-        if (m_methods[i]->isChecked()) s.SwingMethod = std::string(app::SwingMethods()[i]);
+        if (m_methods[i]->isChecked()) s.SwingMethod = chart::SwingMethods()[i];
     const std::string t = S(m_value->text());
     if (!app::Accept(app::SwingValueProblem(s.SwingMethod, t), dialogs())) return false;
     const auto v = app::TypedNumber(t);
-    s.SwingValue = v ? static_cast<float>(*v) : app::DefaultSwingValue(s.SwingMethod);
+    s.SwingValue = v ? static_cast<float>(*v) : chart::DefaultSwingValue(s.SwingMethod);
     app::WriteSwingSettings(m_session.ini(), s);
     m_hub.RebuildChart();
     return true;
