@@ -7,6 +7,7 @@
 #include "app/osc_service.h"
 #include "osc/osc_panel.h"
 #include "platform/sub_surface.h"
+#include "store/name_file.h"
 #include "support/sample_session.h"
 
 #include <gtest/gtest.h>
@@ -29,7 +30,8 @@ struct Colours : ::testing::Test {
                                    const std::string& oscName = "", bool mma = false) {
         s.session.palette = palette;
         app::ChartJob job;
-        job.Name = app::FindSecurity(s.session, "KRM")->second;
+        platform::Status why;
+        job.Name = store::FindCode(s.session.folders.DataFolder, "KRM", why)->Record;
         job.Defaults = chart::LoadChartDefaults(s.session.ini());
         job.Defaults.ShowPriceGrid = true;
         job.Request.ChartStyle = style;
