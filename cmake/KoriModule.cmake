@@ -3,7 +3,8 @@
 set(KORI_CORE_MODULES "")
 
 # -Wno-restrict: GCC 12 reports false overlaps in std::string concatenation at -O3.
-set(KORI_CORE_WARNINGS -Wall -Wextra -Wpedantic -Wshadow -Wconversion -Wno-restrict)
+set(KORI_CORE_WARNINGS -Wall -Wextra -Wpedantic -Wshadow -Wconversion
+    $<$<CXX_COMPILER_ID:GNU>:-Wno-restrict>)
 
 function(kori_core_module name)
     file(GLOB_RECURSE sources CONFIGURE_DEPENDS

@@ -67,7 +67,7 @@ void ChartWindowModel::LeaveChart() {
 bool ChartWindowModel::NextChart(int delta) {
     LeaveChart();
     if (!m_walk.Open(m_state.Request)) {
-        m_session.dialogs().MsgBox("The name file cannot be read", "Chart Display");
+        m_session.dialogs().MsgBox(m_walk.status().message(), "Chart Display");
         return false;
     }
     const bool classWalk = (m_state.ClassWalk || m_state.GicsWalk) && m_state.Request.ListMode == 1;

@@ -6,6 +6,7 @@
 #include "chart/swing.h"
 #include "cli/cli_context.h"
 #include "cli/gui_app.h"
+#include "cli/json_out.h"
 #include "cli/osc_chart.h"
 #include "gui/paint/pdf_printer.h"
 #include "gui/paint/qt_surface.h"
@@ -25,8 +26,6 @@
 #include <unistd.h>
 
 namespace kori::cli {
-
-using json = nlohmann::ordered_json;
 
 namespace {
 
@@ -122,10 +121,6 @@ std::pair<int, int> ParseArea(const std::string& text) {
         throw CliError{
             "--size wants WIDTHxHEIGHT in chart units from 100 to 16000, such as 1000x700"};
     return {w, h};
-}
-
-json FloatJson(float v) {
-    return json::parse(platform::FloatText(v));
 }
 
 void ApplyOptions(const ChartOptions& o, app::ChartJob& job) {

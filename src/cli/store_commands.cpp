@@ -1,5 +1,6 @@
 // kori names, kori bars, kori lists: the library as text and JSON.
 #include "cli/cli_context.h"
+#include "cli/json_out.h"
 
 #include "platform/files.h"
 #include "platform/text.h"
@@ -17,7 +18,6 @@
 
 namespace kori::cli {
 
-using json = nlohmann::ordered_json;
 using platform::Trim;
 
 namespace {
@@ -29,11 +29,6 @@ std::vector<store::NameRecord> ReadNames(app::Session& session) {
     std::vector<store::NameRecord> names;
     if (auto st = nf.ReadAll(names); !st) throw CliError{st.message()};
     return names;
-}
-
-// A float as a JSON number that reads back to the same 32-bit value.
-json FloatJson(float v) {
-    return json::parse(platform::FloatText(v));
 }
 
 } // namespace
@@ -58,10 +53,10 @@ void AddNamesCommand(CLI::App& app, CliContext& ctx) {
             for (const auto& n : names) {
                 out.push_back({{"record", ++rec},
                                {"status", n.Status},
-                               {"code", Trim(n.Code)},
+                               {"code", TextJson(n.Code)},
                                {"type", n.RecordType},
-                               {"name", Trim(n.Name)},
-                               {"other_details", Trim(n.OtherDetails)},
+                               {"name", TextJson(n.Name)},
+                               {"other_details", TextJson(n.OtherDetails)},
                                {"base", FloatJson(n.Base)},
                                {"top", FloatJson(n.Top)},
                                {"pf_increment", FloatJson(n.PFIncrement)},
@@ -71,9 +66,9 @@ void AddNamesCommand(CLI::App& app, CliContext& ctx) {
                                {"bollinger_period", n.BollingerPeriod},
                                {"bollinger_width", n.BollingerWidth},
                                {"category", n.Category},
-                               {"id", Trim(n.Id)},
-                               {"industry_class", Trim(n.IndustryClass)},
-                               {"gics_sector", Trim(n.GicsSector)}});
+                               {"id", TextJson(n.Id)},
+                               {"industry_class", TextJson(n.IndustryClass)},
+                               {"gics_sector", TextJson(n.GicsSector)}});
             }
             ctx.out << out.dump(2) << "\n";
             return;
@@ -109,27 +104,20 @@ void AddBarsCommand(CLI::App& app, CliContext& ctx) {
     cmd->add_flag("--json", o->json, "JSON output");
     cmd->callback([&ctx, o] {
         auto& session = ctx.OpenSession();
-        const auto names = ReadNames(session);
-        const std::string wanted = store::PadCode(o->code);
-        const store::NameRecord* rec = nullptr;
-        for (const auto& n : names)
-            if (n.Code == wanted) {
-                rec = &n;
-                break;
-            }
-        if (!rec) throw CliError{"No File For That Name: " + Trim(o->code)};
+        (void)ReadNames(session); // no name file: say so
+        platform::Status why;
+        const auto found = store::FindCode(session.folders.DataFolder, o->code, why);
+        if (!why) throw CliError{why.message()};
+        if (!found) throw CliError{"No File For That Name: " + Trim(o->code)};
+        const store::NameRecord* rec = &found->Record;
         const auto path = store::PriceFile::PathFor(session.folders.DataFolder, rec->Code);
         store::PriceFile pf(path);
-        if (!platform::FileExists(path)) throw CliError{"No Data for " + path.filename().string()};
-        if (auto st = pf.Open(); !st) throw CliError{st.message()};
-        if (pf.Count() < 1) throw CliError{"No Data for " + path.filename().string()};
+        if (auto st = pf.OpenWithData(); !st) throw CliError{st.message()};
         store::SeriesRequest q;
-        q.FirstRecord = static_cast<std::int16_t>(o->first);
-        q.LastRecord = static_cast<std::int16_t>(o->last > 0 ? o->last : pf.Count());
-        if (o->first < 1 || q.LastRecord > pf.Count() || q.LastRecord < q.FirstRecord)
-            throw CliError{"Records " + std::to_string(o->first) + " to " +
-                           std::to_string(q.LastRecord) + " are not in " +
-                           path.filename().string() + " (1 to " + std::to_string(pf.Count()) + ")"};
+        if (auto st = store::SetRecordRange(q, o->first, o->last > 0 ? o->last : 0, pf.Count(),
+                                            path.filename().string());
+            !st)
+            throw CliError{st.message()};
         q.Period = o->period[0];
         q.WantVolume = !o->noVolume;
         q.RecordType = rec->RecordType;
@@ -141,7 +129,7 @@ void AddBarsCommand(CLI::App& app, CliContext& ctx) {
             json bars = json::array();
             for (int i = 0; i <= s.LastBar; ++i) {
                 const auto& b = s.ChartBars[static_cast<std::size_t>(i)];
-                bars.push_back({{"date", std::string(b.DateText())},
+                bars.push_back({{"date", TextJson(b.DateText())},
                                 {"open", FloatJson(b.Open)},
                                 {"high", FloatJson(b.High)},
                                 {"low", FloatJson(b.Low)},
@@ -149,7 +137,7 @@ void AddBarsCommand(CLI::App& app, CliContext& ctx) {
                                 {"volume", b.Volume},
                                 {"note", b.Note}});
             }
-            json out = {{"code", Trim(rec->Code)},
+            json out = {{"code", TextJson(rec->Code)},
                         {"period", o->period},
                         {"first_record", q.FirstRecord},
                         {"last_record", q.LastRecord},
@@ -188,24 +176,36 @@ void AddListsCommand(CLI::App& app, CliContext& ctx) {
         auto& session = ctx.OpenSession();
         const auto display = store::GetSubLists(session.services().settings);
         json out = json::array();
+        std::vector<std::string> unreadable;
         for (std::size_t i = 0; i < store::kListLetters.size(); ++i) {
             const char letter = store::kListLetters[i];
             const auto path = store::ListPath(session.folders.DataFolder, letter);
             std::vector<store::ChartListEntry> entries;
-            if (platform::FileExists(path)) (void)store::ReadList(path, entries);
+            if (platform::FileExists(path))
+                if (auto st = store::ReadList(path, entries); !st)
+                    unreadable.push_back(st.message());
             json codes = json::array();
             for (const auto& e : entries)
-                codes.push_back(Trim(e.Code));
+                codes.push_back(TextJson(e.Code));
             const std::string name = i < display.size() ? display[i] : "Chart List Z";
-            out.push_back({{"list", std::string(1, letter)}, {"name", name}, {"codes", codes}});
+            out.push_back({{"list", std::string(1, letter)},
+                           {"name", platform::Latin1ToUtf8(name)},
+                           {"codes", codes}});
             if (!*asJson && !entries.empty()) {
                 ctx.out << letter << "  " << name << ":";
-                for (const auto& c : codes)
-                    ctx.out << " " << c.get<std::string>();
+                for (const auto& e : entries)
+                    ctx.out << " " << Trim(e.Code);
                 ctx.out << "\n";
             }
         }
         if (*asJson) ctx.out << out.dump(2) << "\n";
+        // A list the format cannot hold is named, not passed over in silence.
+        if (!unreadable.empty()) {
+            std::string text = unreadable.front();
+            for (std::size_t i = 1; i < unreadable.size(); ++i)
+                text += "\n" + unreadable[i];
+            throw CliError{text};
+        }
     });
 }
 

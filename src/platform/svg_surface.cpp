@@ -1,6 +1,7 @@
 #include "platform/svg_surface.h"
 
 #include "platform/files.h"
+#include "platform/text.h"
 
 #include <algorithm>
 #include <cmath>
@@ -59,12 +60,7 @@ std::string XmlText(std::string_view text) {
             break;
         }
         if (u < 0x20) continue;
-        if (u < 0x80) {
-            r += ch;
-        } else {
-            r += static_cast<char>(0xC0 | (u >> 6));
-            r += static_cast<char>(0x80 | (u & 0x3F));
-        }
+        AppendLatin1AsUtf8(r, ch);
     }
     return r;
 }

@@ -68,6 +68,24 @@ std::string TrimRight(std::string_view s) {
     return std::string(s.substr(0, e));
 }
 
+void AppendLatin1AsUtf8(std::string& out, char ch) {
+    const auto u = static_cast<unsigned char>(ch);
+    if (u < 0x80) {
+        out += ch;
+        return;
+    }
+    out += static_cast<char>(0xC0 | (u >> 6));
+    out += static_cast<char>(0x80 | (u & 0x3F));
+}
+
+std::string Latin1ToUtf8(std::string_view text) {
+    std::string r;
+    r.reserve(text.size());
+    for (char ch : text)
+        AppendLatin1AsUtf8(r, ch);
+    return r;
+}
+
 std::string Trim(std::string_view s) {
     return TrimLeft(TrimRight(s));
 }

@@ -13,6 +13,10 @@ std::string Upper(std::string_view s);
 std::string Lower(std::string_view s);
 bool EqualsNoCase(std::string_view a, std::string_view b);
 
+// The files' single-byte text (Latin-1) as UTF-8, for outputs that must be UTF-8.
+std::string Latin1ToUtf8(std::string_view text);
+void AppendLatin1AsUtf8(std::string& out, char ch);
+
 // Left-justified, blank-padded, cut to exactly `width` characters.
 std::string PadRight(std::string_view s, std::size_t width);
 

@@ -30,8 +30,7 @@ struct Colours : ::testing::Test {
                                    const std::string& oscName = "", bool mma = false) {
         s.session.palette = palette;
         app::ChartJob job;
-        platform::Status why;
-        job.Name = store::FindCode(s.session.folders.DataFolder, "KRM", why)->Record;
+        job.Name = s.Name("KRM");
         job.Defaults = chart::LoadChartDefaults(s.session.ini());
         job.Defaults.ShowPriceGrid = true;
         job.Request.ChartStyle = style;

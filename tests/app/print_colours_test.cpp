@@ -8,7 +8,6 @@
 #include "osc/osc_panel.h"
 #include "platform/printer.h"
 #include "platform/sub_surface.h"
-#include "store/name_file.h"
 #include "support/sample_session.h"
 
 #include <gtest/gtest.h>
@@ -24,10 +23,7 @@ struct PrintedChart : ::testing::Test {
 
     app::ChartJob Job(std::string_view code, char style) {
         app::ChartJob job;
-        platform::Status why;
-        const auto found = store::FindCode(s.session.folders.DataFolder, code, why);
-        EXPECT_TRUE(found);
-        if (found) job.Name = found->Record;
+        job.Name = s.Name(code);
         job.Defaults = chart::LoadChartDefaults(s.session.ini());
         job.Request.ChartStyle = style;
         job.Request.ChartPeriod = 'A';

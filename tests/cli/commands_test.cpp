@@ -1,11 +1,13 @@
 // The kori commands run in-process over one sample library: their output and exit status.
 #include "cli/kori_run.h"
+#include "store/name_file.h"
 #include "support/temp_root.h"
 
 #include <gtest/gtest.h>
 #include <nlohmann/json.hpp>
 
 #include <fstream>
+#include <limits>
 
 namespace kori::test {
 namespace {
@@ -231,6 +233,36 @@ TEST_F(KoriCommands, EachRunBuildsIntoItsOwnStreamAndRemovesIt) {
     EXPECT_NE(ReadFile(Out("own.cht")).find("HBK"), std::string::npos);
     for (const auto& e : std::filesystem::directory_iterator(temp))
         EXPECT_EQ(e.path().filename(), "TCht.Tmp") << "left behind: " << e.path();
+}
+
+TEST_F(KoriCommands, JsonExportsCarryOddValuesAsUtf8TextAndNull) {
+    // A copy of the library whose first security has a Latin-1 name and a base that is not a
+    // number: normal bytes for these files, and no reason to lose the whole export.
+    const auto root = s_dir->path() / "odd";
+    std::filesystem::copy(Root(), root, std::filesystem::copy_options::recursive);
+    const auto names = json::parse(Kori({"names", "--json"}).out);
+    store::NameFile file(store::NameFile::PathIn((root / "data").string() + "/"));
+    ASSERT_TRUE(file.Open().ok());
+    store::NameRecord rec;
+    ASSERT_TRUE(file.Read(1, rec).ok());
+    rec.Name = "Soci\xE9t\xE9 G\xE9n\xE9rale";
+    rec.Base = std::numeric_limits<float>::quiet_NaN();
+    rec.Top = std::numeric_limits<float>::infinity();
+    ASSERT_TRUE(file.Write(1, rec).ok());
+
+    const auto r = RunKoriWith(
+        {"names", "--json", "--root", root.string(), "--data", (root / "data").string()});
+    ASSERT_EQ(r.status, 0) << r.err;
+    const auto odd = json::parse(r.out);
+    ASSERT_EQ(odd.size(), names.size());
+    EXPECT_EQ(odd.at(0).at("name"), "Soci\u00e9t\u00e9 G\u00e9n\u00e9rale");
+    EXPECT_TRUE(odd.at(0).at("base").is_null());
+    EXPECT_TRUE(odd.at(0).at("top").is_null());
+    EXPECT_EQ(odd.at(1), names.at(1));
+
+    const auto scale = RunKoriWith({"scale", "--high", "nan", "--low", "1", "--json"});
+    EXPECT_EQ(scale.status, 0) << scale.err;
+    EXPECT_EQ(Keys(json::parse(scale.out)).size(), 4u);
 }
 
 } // namespace

@@ -8,6 +8,7 @@
 #include "platform/dialogs.h"
 #include "platform/progress.h"
 #include "platform/settings_store.h"
+#include "store/name_file.h"
 #include "support/temp_root.h"
 
 #include <gtest/gtest.h>
@@ -31,6 +32,14 @@ struct SampleSession {
                                               session.folders.DataFolder, settings, summary);
         EXPECT_TRUE(s.ok()) << s.message();
         dialogs.clear();
+    }
+
+    // The name record of a sample code; a failed test when the library lacks it.
+    store::NameRecord Name(std::string_view code) const {
+        platform::Status why;
+        const auto found = store::FindCode(session.folders.DataFolder, code, why);
+        EXPECT_TRUE(found) << code << ": " << why.message();
+        return found ? found->Record : store::NameRecord{};
     }
 };
 

@@ -6,7 +6,12 @@
 #include <QFontMetricsF>
 
 #include <algorithm>
+#include <csetjmp>
+#include <vector>
+
 #include <cmath>
+#include <png.h>
+#include <zlib.h>
 
 namespace kori::gui {
 
@@ -140,11 +145,72 @@ const QImage& ImageSurface::Finish() {
     return m_canvas->image;
 }
 
-platform::Status SavePng(const QImage& image, const std::filesystem::path& path) {
-    QByteArray bytes;
+namespace {
+
+void AppendToBytes(png_structp png, png_bytep data, png_size_t length) {
+    auto* bytes = static_cast<QByteArray*>(png_get_io_ptr(png));
+    bytes->append(reinterpret_cast<const char*>(data), static_cast<qsizetype>(length));
+}
+
+void FlushNothing(png_structp) {}
+
+// Opaque pictures, the charts, straight through libpng: one cheap filter (each row less the
+// row above, which flat areas and grids turn into runs of zeros) and run-length compression.
+// The general writer tries every filter on every row at a higher level, for a file a third
+// smaller at three times the cost. The pixels are the same.
+bool EncodeOpaquePng(const QImage& image, QByteArray& bytes) {
+    png_structp png = png_create_write_struct(PNG_LIBPNG_VER_STRING, nullptr, nullptr, nullptr);
+    if (!png) return false;
+    png_infop info = png_create_info_struct(png);
+    if (!info) {
+        png_destroy_write_struct(&png, nullptr);
+        return false;
+    }
+    const int width = image.width();
+    const int height = image.height();
+    std::vector<png_byte> row(static_cast<std::size_t>(width) * 3);
+    if (setjmp(png_jmpbuf(png))) {
+        png_destroy_write_struct(&png, &info);
+        return false;
+    }
+    png_set_write_fn(png, &bytes, AppendToBytes, FlushNothing);
+    png_set_IHDR(png, info, static_cast<png_uint_32>(width), static_cast<png_uint_32>(height), 8,
+                 PNG_COLOR_TYPE_RGB, PNG_INTERLACE_NONE, PNG_COMPRESSION_TYPE_DEFAULT,
+                 PNG_FILTER_TYPE_DEFAULT);
+    png_set_pHYs(png, info, static_cast<png_uint_32>(image.dotsPerMeterX()),
+                 static_cast<png_uint_32>(image.dotsPerMeterY()), PNG_RESOLUTION_METER);
+    png_set_filter(png, PNG_FILTER_TYPE_BASE, PNG_FILTER_UP);
+    png_set_compression_level(png, 1);
+    png_set_compression_strategy(png, Z_RLE);
+    png_write_info(png, info);
+    for (int y = 0; y < height; ++y) {
+        const auto* pixels = reinterpret_cast<const QRgb*>(image.constScanLine(y));
+        png_byte* out = row.data();
+        for (int x = 0; x < width; ++x) {
+            *out++ = static_cast<png_byte>(qRed(pixels[x]));
+            *out++ = static_cast<png_byte>(qGreen(pixels[x]));
+            *out++ = static_cast<png_byte>(qBlue(pixels[x]));
+        }
+        png_write_row(png, row.data());
+    }
+    png_write_end(png, info);
+    png_destroy_write_struct(&png, &info);
+    return true;
+}
+
+} // namespace
+
+bool EncodePng(const QImage& image, QByteArray& bytes) {
+    bytes.clear();
+    if (image.format() == QImage::Format_RGB32) return EncodeOpaquePng(image, bytes);
     QBuffer buffer(&bytes);
     buffer.open(QIODevice::WriteOnly);
-    if (!image.save(&buffer, "PNG"))
+    return image.save(&buffer, "PNG");
+}
+
+platform::Status SavePng(const QImage& image, const std::filesystem::path& path) {
+    QByteArray bytes;
+    if (!EncodePng(image, bytes))
         return platform::Status::Error("Cannot make a picture for " + path.string());
     return platform::WriteFileAtomic(
         path, std::string_view(bytes.constData(), static_cast<std::size_t>(bytes.size())));

@@ -80,6 +80,8 @@ private:
     std::unique_ptr<Canvas> m_canvas;
 };
 
+// The picture as PNG bytes, as SavePng writes it.
+bool EncodePng(const QImage& image, QByteArray& bytes);
 platform::Status SavePng(const QImage& image, const std::filesystem::path& path);
 
 // Stream text is single-byte.

@@ -226,7 +226,7 @@ void Chts::BuildToolBar() {
     });
     m_oscBox->setObjectName(QStringLiteral("cboOsc"));
     for (const auto& row : app::OscChoices())
-        m_oscBox->addItem(QString::fromLatin1(row.Caption));
+        m_oscBox->addItem(QString::fromLatin1(row.Caption.c_str()));
     m_oscBox->setToolTip(QStringLiteral("Oscillator"));
     connect(m_oscBox, &QComboBox::activated, this, [this](int i) {
         const auto& row = app::OscChoices()[static_cast<std::size_t>(i)];
