@@ -162,9 +162,14 @@ std::vector<std::string> CursorReadout(const chart::Chart& chart, double x, bool
     const int i = BarUnder(chart, x);
     if (i < 0) return {};
     const auto& b = chart.ChartBars()[static_cast<std::size_t>(i)];
-    if (closeOnly) return {"Close  " + ReadoutPrice(b.Close), "Vol  " + Volume(b.Volume)};
-    return {"Open  " + ReadoutPrice(b.Open), "High  " + ReadoutPrice(b.High),
-            "Low  " + ReadoutPrice(b.Low), "Close  " + ReadoutPrice(b.Close),
+    // The prices are no use without the day they belong to.
+    const std::string date = "Date  " + platform::DateTextToDisplay(b.DateText());
+    if (closeOnly) return {date, "Close  " + ReadoutPrice(b.Close), "Vol  " + Volume(b.Volume)};
+    return {date,
+            "Open  " + ReadoutPrice(b.Open),
+            "High  " + ReadoutPrice(b.High),
+            "Low  " + ReadoutPrice(b.Low),
+            "Close  " + ReadoutPrice(b.Close),
             "Vol  " + Volume(b.Volume)};
 }
 

@@ -64,8 +64,9 @@ std::optional<store::NameRecord> StepClassChart(ChartWalk& walk, chart::ChartReq
                                                 int delta, std::string_view classCode, bool gics,
                                                 platform::Dialogs& dialogs);
 
-// Status-bar panes for the bar under x: "Open  ", "High  ", "Low  ", "Close  ", "Vol  " with
-// their values, or "Close  " and "Vol  " for a close-only security. Empty off the bars.
+// Status-bar panes for the bar under x: "Date  " (dd/mm/yyyy), then "Open  ", "High  ",
+// "Low  ", "Close  ", "Vol  " with their values, or "Close  " and "Vol  " for a close-only
+// security. Empty off the bars.
 std::vector<std::string> CursorReadout(const chart::Chart& chart, double x, bool closeOnly);
 // While the left button is held: from the bar under `xDown` to the bar under x, "Rise  " (the
 // highest high above the first close), "Fall  " (the first close above the lowest low),

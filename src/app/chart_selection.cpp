@@ -147,6 +147,10 @@ void ChartSelection::Activate() {
         m_form.PeriodIndex = PeriodIndexOf(r.ChartPeriod);
         m_form.StyleIndex = StyleIndexOf(r.ChartStyle);
         m_form.Spacing = r.BarSpacing;
+        // The chooser rules follow the style in hand, whatever style the window was left in.
+        m_form.ChoosersEnabled = r.ChartStyle != 'P';
+        m_form.OscIndex = OscChoiceOf(r);
+        m_form.BandIndex = std::clamp<int>(r.ChartBands, 0, 2);
         ShowAverages();
         if (r.ListPosition >= 1 && r.ListPosition <= m_walk.Count()) ShowRecord(r.ListPosition);
         return;
@@ -190,6 +194,13 @@ void ChartSelection::ShowRecord(int position) {
 void ChartSelection::ForceSpacing() {
     if (m_form.Spacing < 1 || m_form.Spacing > 20) m_form.Spacing = 2;
     m_state.Request.BarSpacing = static_cast<std::int16_t>(m_form.Spacing);
+}
+
+bool ChartSelection::TakeTypedCode(std::string_view typed) {
+    const std::string t = platform::Upper(platform::Trim(typed));
+    if (t.empty() || t == platform::Upper(m_form.Code)) return true;
+    TypeCode(t);
+    return platform::Upper(m_form.Code) == t;
 }
 
 bool ChartSelection::TypeCode(std::string_view typed) {

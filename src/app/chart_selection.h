@@ -86,6 +86,10 @@ public:
 
     // Enter in the code field. True when the code was found and "SHOW CHART" is to be pressed.
     bool TypeCode(std::string_view typed);
+    // The code field reads `typed` while the form shows another security (typed, Enter not
+    // pressed): the typed one is taken as Enter would, so that a question about "this
+    // security" (the band values) is about the one the user typed. True when it is shown.
+    bool TakeTypedCode(std::string_view typed);
     // The scroll bar moved to `value`; beyond the count wraps to 1 with a beep.
     void ScrollTo(int value);
     // The up-down control: one step with the wraps 0 -> 10 and 11 -> 1.

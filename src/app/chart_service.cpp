@@ -34,24 +34,38 @@ chart::ChartName ChartNameOf(const store::NameRecord& r) {
     return n;
 }
 
-platform::Status BuildSecurityChart(Session& session, ChartJob& job, chart::Chart& chart,
+ChartContext ChartContext::Of(Session& session, bool writeStream, platform::Dialogs* dialogs) {
+    return ChartContext{session.palette,
+                        session.fonts,
+                        dialogs ? *dialogs : session.dialogs(),
+                        session.folders.DataFolder,
+                        std::filesystem::path(session.folders.SystemFolder),
+                        writeStream ? ChartStreamPath(session) : std::filesystem::path(),
+                        session.download.VolumeDivisor};
+}
+
+platform::Status BuildSecurityChart(Session& session, const ChartJob& job, chart::Chart& chart,
                                     platform::Surface& surface) {
-    chart::FilePriceSource source(
-        store::PriceFile::PathFor(session.folders.DataFolder, job.Name.Code));
+    return BuildSecurityChart(ChartContext::Of(session, job.WriteStream), job, chart, surface);
+}
+
+platform::Status BuildSecurityChart(const ChartContext& context, const ChartJob& job,
+                                    chart::Chart& chart, platform::Surface& surface) {
+    chart::FilePriceSource source(store::PriceFile::PathFor(context.DataFolder, job.Name.Code));
     if (auto s = source.Open(); !s) {
-        session.dialogs().MsgBox(s.message(), "Chart Display");
+        context.Dialogs.MsgBox(s.message(), "Chart Display");
         return s;
     }
     const chart::ChartName name = ChartNameOf(job.Name);
     const bool split = job.Request.SplitMode && job.Lower.has_value();
     const std::string lowerCode = split ? platform::Trim(job.Lower->Name.Code) : std::string();
     chart::FilePriceSource lowerSource(
-        store::PriceFile::PathFor(session.folders.DataFolder, split ? lowerCode : job.Name.Code));
+        store::PriceFile::PathFor(context.DataFolder, split ? lowerCode : job.Name.Code));
     chart::ChartName lowerName;
     chart::SplitLowerHalf lower;
     if (split) {
         if (auto s = lowerSource.Open(); !s) {
-            session.dialogs().MsgBox(s.message(), "Chart Display");
+            context.Dialogs.MsgBox(s.message(), "Chart Display");
             return s;
         }
         lowerName = ChartNameOf(job.Lower->Name);
@@ -60,25 +74,26 @@ platform::Status BuildSecurityChart(Session& session, ChartJob& job, chart::Char
     chart::ChartBuild build{job.Request,
                             job.Defaults,
                             name,
-                            session.palette,
-                            session.fonts,
-                            session.dialogs(),
-                            job.WriteStream ? ChartStreamPath(session) : std::filesystem::path(),
+                            context.Palette,
+                            context.Fonts,
+                            context.Dialogs,
+                            job.WriteStream ? context.StreamPath : std::filesystem::path(),
                             false, // no setting holds the bold-print option yet
-                            session.download.VolumeDivisor,
+                            context.VolumeDivisor,
                             job.Page,
                             {}};
     if (split) build.Lower = &lower;
     // Target lines go on last, while the stream is still open; each half has its security's.
-    const auto targetsFile = std::filesystem::path(session.folders.SystemFolder) / "Targets.txt";
+    const auto targetsFile = context.SystemFolder / "Targets.txt";
     const std::vector<float> targets = chart::ReadTargetPrices(targetsFile, name.Code);
     const std::vector<float> lowerTargets =
         split ? chart::ReadTargetPrices(targetsFile, lowerCode) : std::vector<float>();
-    build.DrawOverlays = [&job, &session, &targets, &lowerTargets](chart::Chart& c,
+    build.DrawOverlays = [&job, &context, &targets, &lowerTargets](chart::Chart& c,
+                                                                   const chart::ChartRequest& half,
                                                                    platform::Surface& s) {
-        const bool lowerHalf = job.Request.SplitMode && job.Request.SplitHalf == 2;
-        chart::DrawTargetLines(c, s, session.palette, lowerHalf ? lowerTargets : targets);
-        if (job.DrawOverlays) job.DrawOverlays(c, s);
+        const bool lowerHalf = half.SplitMode && half.SplitHalf == 2;
+        chart::DrawTargetLines(c, s, context.Palette, lowerHalf ? lowerTargets : targets);
+        if (job.DrawOverlays) job.DrawOverlays(c, half, s);
     };
     return chart::BuildChart(chart, build, source, surface);
 }

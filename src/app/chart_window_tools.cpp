@@ -194,7 +194,10 @@ int DrawTextNotes(const Session& session, chart::Chart& chart, const chart::Char
         if (!line.empty() && line.back() == '\r') line.pop_back();
         chart::StreamFields f;
         if (line.empty() || !chart::SplitStreamLine(line, f)) continue;
-        const double x = chart::DateToX(frame, platform::Trim(f[2]));
+        // A note dated before the first bar has no place on this chart (as a trendline).
+        const std::string date = platform::Trim(f[2]);
+        if (chart.LastBar() < 0 || date < std::string(chart.ChartBars()[0].DateText())) continue;
+        const double x = chart::DateToX(frame, date);
         if (x == 0) continue;
         const double y = chart.PriceToY(platform::Val(f[3]));
         platform::Colour colour = Entry(session, kTextNoteEntry);

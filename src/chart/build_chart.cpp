@@ -96,7 +96,7 @@ platform::Status BuildOneChart(Chart& c, const ChartBuild& b, PriceSource& sourc
         ChartPainter painter(c, in, surface);
         DrawChartOverlays(painter);
     }
-    if (b.DrawOverlays) b.DrawOverlays(c, surface);
+    if (b.DrawOverlays) b.DrawOverlays(c, b.Request, surface);
     if (b.Page && !b.Page->Known)
         WorkOutPrinterMargins(*b.Page, c.AreaWidth, c.AreaHeight, b.Defaults.PrintScale);
     // A chart whose stream is torn cannot be printed, saved or played: the build failed.
@@ -104,19 +104,10 @@ platform::Status BuildOneChart(Chart& c, const ChartBuild& b, PriceSource& sourc
     return c.Stream.Close();
 }
 
-// The request carries the lower security's period for this half only; the upper half's stays
-// in force for the chart window.
-platform::Status BuildLowerHalf(Chart& c, const ChartBuild& b, const SplitLowerHalf& lower,
-                                platform::Surface& surface) {
-    ChartRequest& r = b.Request;
-    const char period = r.ChartPeriod;
-    r.ChartPeriod = lower.ChartPeriod;
-    const ChartBuild half{
-        r,           b.Defaults,      *lower.Name, b.Palette,      b.Fonts, b.Dialogs, b.StreamPath,
-        b.PrintBold, b.VolumeDivisor, b.Page,      b.DrawOverlays, nullptr};
-    const platform::Status s = BuildOneChart(c, half, *lower.Source, surface);
-    r.ChartPeriod = period;
-    return s;
+ChartBuild WithRequest(const ChartBuild& b, const ChartRequest& r, const ChartName& name) {
+    return ChartBuild{
+        r,           b.Defaults,      name,   b.Palette,      b.Fonts, b.Dialogs, b.StreamPath,
+        b.PrintBold, b.VolumeDivisor, b.Page, b.DrawOverlays, nullptr};
 }
 
 } // namespace
@@ -137,24 +128,20 @@ void WorkOutPrinterMargins(PrinterPage& page, double areaWidth, double areaHeigh
 
 platform::Status BuildChart(Chart& chart, const ChartBuild& build, PriceSource& source,
                             platform::Surface& surface) {
-    ChartRequest& r = build.Request;
+    const ChartRequest& r = build.Request;
+    if (!r.SplitMode || r.SplitHalf != 1) return BuildOneChart(chart, build, source, surface);
+    // The halves are built from copies that say which half is in hand; the lower one carries
+    // the lower security's period. The caller's request is never touched.
     platform::Status s = BuildOneChart(chart, build, source, surface);
-    if (!s || !r.SplitMode || r.SplitHalf != 1) {
-        if (r.SplitMode && r.SplitHalf == 2) {
-            r.SplitMode = false;
-            r.SplitHalf = 1;
-        }
-        return s;
-    }
-    r.SplitHalf = 2;
+    if (!s) return s;
+    ChartRequest half = r;
+    half.SplitHalf = 2;
     if (build.Lower && build.Lower->Name && build.Lower->Source) {
-        s = BuildLowerHalf(chart, build, *build.Lower, surface);
-    } else {
-        s = BuildOneChart(chart, build, source, surface);
+        half.ChartPeriod = build.Lower->ChartPeriod;
+        return BuildOneChart(chart, WithRequest(build, half, *build.Lower->Name),
+                             *build.Lower->Source, surface);
     }
-    r.SplitMode = false;
-    r.SplitHalf = 1;
-    return s;
+    return BuildOneChart(chart, WithRequest(build, half, build.Name), source, surface);
 }
 
 } // namespace kori::chart

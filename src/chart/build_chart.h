@@ -35,7 +35,7 @@ struct SplitLowerHalf {
 };
 
 struct ChartBuild {
-    ChartRequest& Request; // the split flags are cleared when a split is done
+    const ChartRequest& Request; // read only: a split's halves work on their own copies
     const ChartDefaults& Defaults;
     const ChartName& Name;
     const platform::Palette& Palette;
@@ -46,8 +46,8 @@ struct ChartBuild {
     std::int32_t VolumeDivisor = 1;
     PrinterPage* Page = nullptr;
     // Overlays, trendlines and target lines go on after the trailing labels, into the same
-    // stream while it is still open.
-    std::function<void(Chart&, platform::Surface&)> DrawOverlays;
+    // stream while it is still open. The request is the one of the half in hand.
+    std::function<void(Chart&, const ChartRequest&, platform::Surface&)> DrawOverlays;
     const SplitLowerHalf* Lower = nullptr; // read only while SplitMode is set
 };
 

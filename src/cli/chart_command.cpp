@@ -208,10 +208,8 @@ void Run(CliContext& ctx, const ChartOptions& o) {
     ApplyOverlays(o, job);
     chart::PrinterPage page;
     job.Page = &page;
-    PreparePanelPage(job, h, o.osc);
     app::SplitChart split;
     if (!o.split.empty()) ApplySplit(session, o.split, o, job, split);
-    // The builder clears the split flags when a split is done: each build sets them again.
     const auto build = [&](chart::Chart& into, platform::Surface& area) {
         split.Apply(job.Request);
         const platform::Status s = BuildChartWithPanel(session, job, into, area, o.osc);

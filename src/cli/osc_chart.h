@@ -18,15 +18,12 @@ struct OscChartOptions {
     std::vector<std::string> sets; // KEY=VALUE overrides of section OscDef for this run
 };
 
-// Builds the chart of `job` on `area`, with the panel when `o.osc` is set. Throws CliError
-// for an identifier the panel cannot draw.
+// Builds the chart of `job` on `area` through the shared chart-with-panel build, with the panel
+// when `o.osc` is set. Throws CliError for an identifier the panel cannot draw.
 platform::Status BuildChartWithPanel(app::Session& session, app::ChartJob& job, chart::Chart& c,
                                      platform::Surface& area, const OscChartOptions& o);
 
 // "KEY=VALUE" overrides of section OscDef; throws CliError for a key it does not have.
 void ApplyOscSets(osc::OscDef& def, const std::vector<std::string>& sets);
-
-// The page height the printer centres: with a panel, the price chart and the panel.
-void PreparePanelPage(app::ChartJob& job, double areaHeight, const OscChartOptions& o);
 
 } // namespace kori::cli

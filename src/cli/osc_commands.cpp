@@ -1,5 +1,6 @@
 // kori chart --osc (the panel under the price chart) and kori indicator (an oscillator's
 // values as CSV, one row a bar).
+#include "app/chart_build.h"
 #include "app/colour_table.h"
 #include "app/osc_service.h"
 #include "cli/cli_context.h"
@@ -51,49 +52,27 @@ void ApplyOscSets(osc::OscDef& def, const std::vector<std::string>& sets) {
     }
 }
 
-void PreparePanelPage(app::ChartJob& job, double areaHeight, const OscChartOptions& o) {
-    if (o.osc.empty() || job.Page == nullptr) return;
-    job.Page->SecondPanelHeight = osc::SplitChartArea(static_cast<int>(areaHeight)).PanelHeight;
-}
-
 platform::Status BuildChartWithPanel(app::Session& session, app::ChartJob& job, chart::Chart& c,
                                      platform::Surface& area, const OscChartOptions& o) {
-    if (o.osc.empty()) return app::BuildSecurityChart(session, job, c, area);
-    const std::string name = CheckedOscName(o.osc);
-    const osc::PanelSplit split = osc::SplitChartArea(static_cast<int>(area.ScaleHeight()));
-    platform::SubSurface priceArea(area, 0, split.PriceHeight);
-    platform::SubSurface panelArea(area, split.PriceHeight, split.PanelHeight);
-    job.Request.SecondPanelShowing = true;
-    job.Request.AutoOsc = true;
-    job.Request.AutoOscCode = name;
-    job.Request.AutoOscSlow = o.slow;
-    auto built = app::BuildSecurityChart(session, job, c, priceArea);
-    if (!built) return built;
-    // The panel shows empty, as the chart window's does, when its routine draws nothing.
-    panelArea.SetBackColour(session.palette[osc::oscpal::Background]);
-    panelArea.Clear();
-    app::OscPanelJob panel;
-    panel.OscName = name;
-    panel.SlowStochastic = o.slow;
-    panel.PanelOffset = split.PriceHeight;
-    panel.PriceSurface = &priceArea;
-    if (!o.sets.empty()) {
-        osc::OscDef def = osc::ReadOscSettings(session.ini());
-        ApplyOscSets(def, o.sets);
-        panel.Settings = def;
+    app::PanelOptions panel;
+    if (!o.osc.empty()) {
+        const std::string name = CheckedOscName(o.osc);
+        job.Request.AutoOsc = true;
+        job.Request.AutoOscCode = name;
+        job.Request.AutoOscSlow = o.slow;
+        if (!o.sets.empty()) {
+            osc::OscDef def = osc::ReadOscSettings(session.ini());
+            ApplyOscSets(def, o.sets);
+            panel.Settings = def;
+        }
     }
-    const osc::OscOutcome outcome = app::DrawSecurityOscillator(session, job, c, panel, panelArea);
-    if (outcome == osc::OscOutcome::NotValid)
-        return platform::Status::Error(name + " Oscillator values not valid");
-    if (outcome == osc::OscOutcome::NotSet)
-        std::cerr << "kori: the period of " << name
+    const app::ChartOutcome out = app::BuildChartWithPanel(session, job, c, area, panel);
+    if (out.Panel == osc::OscOutcome::NotValid)
+        return platform::Status::Error(job.Request.AutoOscCode + " Oscillator values not valid");
+    if (out.Panel == osc::OscOutcome::NotSet)
+        std::cerr << "kori: the period of " << job.Request.AutoOscCode
                   << " is 0 in section OscDef of Kori.ini: no panel drawn\n";
-    if (outcome == osc::OscOutcome::DailyOnly) {
-        // As the chart window does: the price chart goes back to the full area.
-        job.Request.SecondPanelShowing = false;
-        return app::BuildSecurityChart(session, job, c, area);
-    }
-    return built;
+    return out.Status;
 }
 
 namespace {

@@ -16,6 +16,7 @@
 
 #include <QApplication>
 #include <QCommandLineParser>
+#include <QStatusBar>
 #include <QTimer>
 
 #include <memory>
@@ -49,11 +50,12 @@ int main(int argc, char** argv) {
     kori::platform::CreateFolderPath(root);
 
     kori::gui::QtDialogs dialogs;
-    kori::platform::NullProgress startupProgress;
+    // The real progress comes first, so every walk of the session shows its bar and Cancel; its
+    // status bar goes to the main window when that stands.
+    kori::gui::QtProgress progress(new QStatusBar);
     kori::platform::SettingsStore settings(root / "settings.ini");
     kori::platform::SystemClock clock;
-    kori::app::Session session(root,
-                               kori::platform::Services{dialogs, startupProgress, settings, clock});
+    kori::app::Session session(root, kori::platform::Services{dialogs, progress, settings, clock});
 
     std::unique_ptr<kori::app::InstanceLock> instance;
     if (!kori::app::CheckSingleInstance(root, dialogs, instance)) return 0;
@@ -68,7 +70,7 @@ int main(int argc, char** argv) {
     QApplication::restoreOverrideCursor();
     QApplication::processEvents();
 
-    kori::gui::MainWindow main(session);
+    kori::gui::MainWindow main(session, &progress);
     dialogs.SetParent(&main);
     main.SetHideDownloadProgram(session.switches.A);
     kori::gui::RegisterWindows(main);

@@ -64,10 +64,10 @@ TEST(CursorReadout, NamesTheBarUnderTheCursor) {
                             Bar("20240104", 1.25f, 1.255f, 0.8f, 1.25f, 12345)});
     // Bars sit at 50, 54, 58; x = 59 is nearest the third. "#####.00#" has no leading zero.
     EXPECT_EQ(app::CursorReadout(c, 59, false),
-              (std::vector<std::string>{"Open  1.25", "High  1.255", "Low  .80", "Close  1.25",
-                                        "Vol  12345"}));
+              (std::vector<std::string>{"Date  04/01/2024", "Open  1.25", "High  1.255", "Low  .80",
+                                        "Close  1.25", "Vol  12345"}));
     EXPECT_EQ(app::CursorReadout(c, 51, true),
-              (std::vector<std::string>{"Close  1.00", "Vol  1000"}));
+              (std::vector<std::string>{"Date  02/01/2024", "Close  1.00", "Vol  1000"}));
     EXPECT_TRUE(app::CursorReadout(c, 30, false).empty());
     EXPECT_TRUE(app::CursorReadout(c, 70, false).empty());
     EXPECT_EQ(app::ReadoutPrice(0), "");

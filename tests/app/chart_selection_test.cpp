@@ -299,3 +299,36 @@ TEST_F(Selection, TheChartWindowsClassStepWrapsBothWays) {
     EXPECT_EQ(s.dialogs.messages().back(),
               "No records on file for that Industry classification or group");
 }
+
+TEST_F(Selection, BackFromTheChartWindowTheChoosersFollowTheStyleItLeft) {
+    ASSERT_TRUE(sel.Load());
+    sel.ChooseStyle(3); // point and figure
+    EXPECT_FALSE(sel.form().ChoosersEnabled);
+    sel.ShowChart();
+    // "Bar" in the chart window's toolbar, then back to the selection.
+    state.Request.ChartStyle = 'B';
+    state.Request.AutoOsc = true;
+    state.Request.AutoOscCode = "RSI";
+    sel.Activate();
+    EXPECT_EQ(sel.form().StyleIndex, 0);
+    EXPECT_TRUE(sel.form().ChoosersEnabled);
+    EXPECT_EQ(sel.form().OscIndex, app::OscChoiceOf(state.Request));
+    // And the other way: a chart left as point and figure disables them again.
+    state.Request.ChartStyle = 'P';
+    sel.Activate();
+    EXPECT_FALSE(sel.form().ChoosersEnabled);
+}
+
+TEST_F(Selection, TheBandValuesAreAskedAboutTheCodeTypedNotTheOneShown) {
+    ASSERT_TRUE(sel.Load());
+    const std::string shown = sel.form().Code;
+    ASSERT_NE(shown, "KRM");
+    EXPECT_TRUE(sel.TakeTypedCode(shown)) << "the code shown needs nothing";
+    EXPECT_EQ(sel.form().Code, shown);
+    EXPECT_TRUE(sel.TakeTypedCode(" krm "));
+    ASSERT_TRUE(sel.Current());
+    EXPECT_EQ(sel.Current()->TrimmedCode(), "KRM");
+    ASSERT_TRUE(sel.ChooseBands(1, std::pair{4, 6}));
+    platform::Status why;
+    EXPECT_EQ(store::FindCode(s.session.folders.DataFolder, "KRM", why)->Record.PercentBandUp, 4);
+}

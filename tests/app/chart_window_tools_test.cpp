@@ -29,7 +29,8 @@ struct Tools : ::testing::Test {
         job.Request.ChartPeriod = period;
         job.Request.BarSpacing = 4;
         const std::string c(code);
-        job.DrawOverlays = [this, c](chart::Chart& ch, platform::Surface& surface) {
+        job.DrawOverlays = [this, c](chart::Chart& ch, const chart::ChartRequest&,
+                                     platform::Surface& surface) {
             ends = app::DrawChartLines(s.session, ch, job.Request, c, surface);
             notes = app::DrawTextNotes(s.session, ch, job.Request, c, surface);
         };

@@ -7,6 +7,7 @@
 #include "app/osc_service.h"
 #include "osc/osc_panel.h"
 #include "platform/sub_surface.h"
+#include "store/name_file.h"
 #include "support/sample_session.h"
 
 #include <gtest/gtest.h>

@@ -142,7 +142,8 @@ TEST_F(Split, LowerHalfIsTheSecondSecurityAtItsPeriodInTheSameStream) {
     job.Lower = split.Lower();
     chart::Chart c;
     ASSERT_TRUE(app::BuildSecurityChart(s.session, job, c, area).ok());
-    EXPECT_FALSE(job.Request.SplitMode);
+    EXPECT_TRUE(job.Request.SplitMode) << "the job is read, not changed";
+    EXPECT_EQ(job.Request.SplitHalf, 1);
     EXPECT_EQ(job.Request.ChartPeriod, 'A');
 
     const auto lines = Lines();

@@ -130,7 +130,7 @@ TEST(BuildChart, SplitBuildsBothHalvesIntoOneStream) {
     r.request.SplitHalf = 1;
     r.Add("20240304", 15, 20, 12.5f, 17);
     ASSERT_TRUE(r.Build().ok());
-    EXPECT_FALSE(r.request.SplitMode);
+    EXPECT_TRUE(r.request.SplitMode) << "the caller's request is read, not changed";
     EXPECT_EQ(r.request.SplitHalf, 1);
     const auto titles = Starting(r.Lines(), "T, 9.75,");
     // Upper half from 10, lower half from 1000 x 51% = 510; the code at 4 x PlotLeft.
@@ -181,7 +181,7 @@ TEST(BuildChart, OverlaysFollowTheTrailingLabelsInTheSameStream) {
                        false,
                        1,
                        nullptr,
-                       [](Chart& c, kori::platform::Surface&) {
+                       [](Chart& c, const ChartRequest&, kori::platform::Surface&) {
                            c.Stream.Shape('L', 5, c.PriceToY(15), 354, c.PriceToY(15), 20);
                        }};
     ASSERT_TRUE(BuildChart(r.chart, b, r.source, r.surface).ok());
@@ -209,7 +209,7 @@ TEST(BuildChart, SplitLowerHalfShowsItsOwnSecurityAndPeriod) {
     EXPECT_EQ(r.source.LastLoad.Period, 'A');
     EXPECT_EQ(lowerSource.LastLoad.Period, 'W');
     EXPECT_EQ(r.request.ChartPeriod, 'A') << "the period in hand comes back after the split";
-    EXPECT_FALSE(r.request.SplitMode);
+    EXPECT_TRUE(r.request.SplitMode) << "the caller's request is read, not changed";
     const auto lines = r.Lines();
     EXPECT_EQ(Starting(lines, "T, 9.75,"),
               (std::vector<std::string>{"T, 9.75, 20, 12,BHP, 26", "T, 9.75, 20, 512,RIO, 26"}));
@@ -227,7 +227,7 @@ TEST(BuildChart, SplitLowerHalfShowsItsOwnSecurityAndPeriod) {
     r.request.SplitMode = true;
     EXPECT_FALSE(BuildChart(r.chart, b, r.source, r.surface).ok());
     EXPECT_EQ(r.dialogs.messages().back(), "No Data for RIO.WDT");
-    EXPECT_FALSE(r.request.SplitMode);
+    EXPECT_TRUE(r.request.SplitMode) << "the caller's request is read, not changed";
     EXPECT_EQ(r.request.SplitHalf, 1);
     EXPECT_EQ(r.request.ChartPeriod, 'A');
     // Without a lower half of its own, the split repeats the security in hand.

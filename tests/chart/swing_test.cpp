@@ -170,18 +170,19 @@ TEST(TargetLines, FirstTwoLinesOfTheCodeWithinThePlot) {
     ChartRig r;
     AddBars(r, {{50, 40}});
     const auto prices = ReadTargetPrices(file, "BHP");
-    const ChartBuild b{
-        r.request,
-        r.defaults,
-        r.name,
-        r.palette,
-        r.fonts,
-        r.dialogs,
-        r.streamPath,
-        r.printBold,
-        r.volumeDivisor,
-        nullptr,
-        [&](Chart& c, kori::platform::Surface& s) { DrawTargetLines(c, s, r.palette, prices); }};
+    const ChartBuild b{r.request,
+                       r.defaults,
+                       r.name,
+                       r.palette,
+                       r.fonts,
+                       r.dialogs,
+                       r.streamPath,
+                       r.printBold,
+                       r.volumeDivisor,
+                       nullptr,
+                       [&](Chart& c, const ChartRequest&, kori::platform::Surface& s) {
+                           DrawTargetLines(c, s, r.palette, prices);
+                       }};
     ASSERT_TRUE(BuildChart(r.chart, b, r.source, r.surface).ok());
     // 55.5 is y 495; 95 lies above the plot (y 100) and is left out.
     const auto lines = Starting(r.Lines(), "L, 5, ");

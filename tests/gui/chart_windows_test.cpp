@@ -2,8 +2,11 @@
 // toolbar, a trendline drawn with the mouse, printing to a PDF file, saving and showing again.
 #include "desktop_fixture.h"
 
+#include "app/chart_build.h"
+#include "app/chart_navigation.h"
 #include "app/chart_service.h"
 #include "app/chart_window_tools.h"
+#include "gui/paint/qt_surface.h"
 #include "gui/widgets/chart_view.h"
 #include "gui/windows/chart_windows.h"
 #include "gui/windows/cht_sel.h"
@@ -12,22 +15,27 @@
 #include "gui/windows/register_windows.h"
 #include "gui/windows/search.h"
 #include "gui/windows/settings_hub.h"
+#include "platform/date_text.h"
 #include "platform/files.h"
 #include "store/price_file.h"
 #include "store/trendline_file.h"
 
 #include <QAction>
 #include <QApplication>
+#include <QComboBox>
 #include <QDialog>
 #include <QLabel>
 #include <QLineEdit>
 #include <QMdiArea>
 #include <QMdiSubWindow>
+#include <QMenuBar>
 #include <QPointer>
 #include <QPrinter>
 #include <QScrollBar>
 #include <QTest>
+#include <QTimer>
 #include <QToolBar>
+#include <QWheelEvent>
 #include <gtest/gtest.h>
 
 #include <cstdlib>
@@ -133,7 +141,7 @@ TEST_F(Road, ToolbarStyleAndPeriodRebuildTheChart) {
 TEST_F(Road, ATrendlineDrawnWithTheMouseComesBackOnItsPeriodOnly) {
     TypeCode("krm");
     Key("tline");
-    EXPECT_EQ(chts()->toolMode(), gui::kToolTrendline);
+    EXPECT_EQ(chts()->tool(), app::ChartTool::Trendline);
     const auto& c = chts()->chart();
     const int last = c.LastBar();
     const int x1 = c.PlotLeft + (last - 60) * c.BarSpacing,
@@ -179,9 +187,18 @@ TEST_F(Road, CursorReadoutAndFibonacciInTheStatusBar) {
     const auto& bar = c.ChartBars()[static_cast<std::size_t>(last)];
     chts()->MouseMove(c.PlotLeft + last * c.BarSpacing, 100, Qt::NoButton);
     const auto panes = chts()->StatusPanes();
-    EXPECT_EQ(panes[0], "Open  " + app::ReadoutPrice(bar.Open));
-    EXPECT_EQ(panes[3], "Close  " + app::ReadoutPrice(bar.Close));
-    EXPECT_EQ(panes[4].rfind("Vol  ", 0), 0u);
+    EXPECT_EQ(panes[0], "Date  " + platform::DateTextToDisplay(bar.DateText()));
+    EXPECT_EQ(panes[1], "Open  " + app::ReadoutPrice(bar.Open));
+    EXPECT_EQ(panes[4], "Close  " + app::ReadoutPrice(bar.Close));
+    EXPECT_EQ(panes[5].rfind("Vol  ", 0), 0u);
+    // With no tool a crosshair follows the cursor over the bars.
+    ASSERT_TRUE(chts()->picture1()->crosshair());
+    EXPECT_EQ(chts()->picture1()->crosshair()->x(), c.PlotLeft + last * c.BarSpacing);
+    // The next chart does not keep the prices of this one in the status bar.
+    Key("fwd");
+    for (const auto& pane : chts()->StatusPanes())
+        EXPECT_EQ(pane, "");
+    Key("rev");
 
     Key("fib");
     const double low = c.PriceToY(c.MinLow), high = c.PriceToY(c.MaxHigh);
@@ -231,10 +248,10 @@ TEST_F(Road, ZoomOnlyOnBarsAndCandlesticks) {
     s.dialogs.clear();
     Key("sZoom");
     EXPECT_EQ(s.dialogs.messages().back(), "Zoom only available on Bar & Candlestick charts");
-    EXPECT_EQ(chts()->toolMode(), gui::kToolNone);
+    EXPECT_EQ(chts()->tool(), app::ChartTool::None);
     Key("bar");
     Key("sZoom");
-    EXPECT_EQ(chts()->toolMode(), gui::kToolZoom);
+    EXPECT_EQ(chts()->tool(), app::ChartTool::Zoom);
     const auto& c = chts()->chart();
     chts()->MousePress(c.PlotLeft + 200, (c.PlotTop + c.PlotBottom) / 2.0, Qt::LeftButton);
     auto* zoom = chts()->findChild<QDialog*>(QStringLiteral("ZoomKori"));
@@ -264,26 +281,18 @@ TEST_F(Road, FibonacciTimeLinesByTradingOrCalendarDays) {
     EXPECT_GT(lines(), trading);
 }
 
-TEST_F(Road, TheOscillatorPanelIsASeamThatShowsOnlyWithAnOscillatorChosen) {
+TEST_F(Road, TheOscillatorPanelShowsOnlyWithAnOscillatorChosen) {
     TypeCode("krm");
-    int painted = 0;
-    chts()->SetOscillatorPainter([&](chart::Chart& c, const app::ChartJob& job, platform::Surface&,
-                                     platform::Surface& panel) {
-        ++painted;
-        EXPECT_GT(c.LastBar(), 0);
-        EXPECT_EQ(job.Request.AutoOscCode, "RSI");
-        panel.FilledBox(0, 0, 50, 50, 0xFF);
-        return true;
-    });
     Key("ref");
-    EXPECT_EQ(painted, 0);
-    EXPECT_FALSE(chts()->picture2()->isVisible());
+    EXPECT_FALSE(chts()->panelShown());
+    EXPECT_EQ(chts()->model().lastBuild().PriceHeight, chts()->picture1()->picture().height());
     charts()->state().Request.AutoOsc = true;
     charts()->state().Request.AutoOscCode = "RSI";
     Key("ref");
-    EXPECT_EQ(painted, 1);
-    EXPECT_TRUE(chts()->picture2()->isVisible());
-    EXPECT_FALSE(chts()->picture2()->picture().isNull());
+    EXPECT_TRUE(chts()->panelShown());
+    // The panel takes the bottom of the one picture, as it does in a PNG of the same size.
+    const int height = chts()->picture1()->picture().height();
+    EXPECT_EQ(chts()->model().lastBuild().PriceHeight, height - height * 3 / 10);
 }
 
 TEST_F(Road, AChosenOscillatorDrawsItsPanelUnderTheChartAndTheParabolicNone) {
@@ -292,10 +301,10 @@ TEST_F(Road, AChosenOscillatorDrawsItsPanelUnderTheChartAndTheParabolicNone) {
     req.AutoOsc = true;
     req.AutoOscCode = "RSI";
     Key("ref");
-    ASSERT_TRUE(chts()->picture2()->isVisible());
+    ASSERT_TRUE(chts()->panelShown());
     // The panel lies below the price chart in the one stream: some line starts below its area.
     std::ifstream stream(app::ChartStreamPath(s.session));
-    const double priceHeight = chts()->picture1()->picture().height();
+    const double priceHeight = chts()->model().lastBuild().PriceHeight;
     bool below = false;
     for (std::string l; std::getline(stream, l);) {
         const auto comma = l.find(',', 2); // y1 follows the second comma
@@ -307,7 +316,7 @@ TEST_F(Road, AChosenOscillatorDrawsItsPanelUnderTheChartAndTheParabolicNone) {
 
     req.AutoOscCode = "PARA";
     Key("ref");
-    EXPECT_FALSE(chts()->picture2()->isVisible());
+    EXPECT_FALSE(chts()->panelShown());
 }
 
 TEST_F(Road, ASavedChartShowsItsOscillatorPanelAgain) {
@@ -316,18 +325,21 @@ TEST_F(Road, ASavedChartShowsItsOscillatorPanelAgain) {
     req.AutoOsc = true;
     req.AutoOscCode = "RSI";
     Key("ref");
-    ASSERT_TRUE(chts()->picture2()->isVisible());
-    const QImage livePanel = chts()->picture2()->picture().copy();
+    ASSERT_TRUE(chts()->panelShown());
+    const int top = chts()->model().lastBuild().PriceHeight;
+    const QImage& live = chts()->picture1()->picture();
+    const QImage livePanel = live.copy(0, top, live.width(), live.height() - top);
     const std::string saved = s.session.folders.ChtSaveFolder + "KRMRSI.cht";
     ASSERT_TRUE(chts()->SaveChartAs(saved));
 
     req.AutoOsc = false;
     Key("fwd");
-    ASSERT_FALSE(chts()->picture2()->isVisible());
+    ASSERT_FALSE(chts()->panelShown());
     ASSERT_TRUE(chts()->DisplaySavedChart(saved));
-    ASSERT_TRUE(chts()->picture2()->isVisible()) << "the panel of the saved stream is dropped";
     // The played panel is the live one but for what only the builder draws (blanks of titles).
-    const QImage played = chts()->picture2()->picture().convertToFormat(livePanel.format());
+    const QImage& shown = chts()->picture1()->picture();
+    const QImage played = shown.copy(0, top, livePanel.width(), livePanel.height())
+                              .convertToFormat(livePanel.format());
     ASSERT_EQ(played.size(), livePanel.size());
     long same = 0, drawn = 0;
     const QRgb back = livePanel.pixel(livePanel.width() - 1, livePanel.height() - 1);
@@ -337,7 +349,7 @@ TEST_F(Road, ASavedChartShowsItsOscillatorPanelAgain) {
             drawn += played.pixel(x, y) != back;
         }
     const long all = static_cast<long>(played.width()) * played.height();
-    EXPECT_GT(same, all * 95 / 100);
+    EXPECT_GT(same, all * 95 / 100) << "the panel of the saved stream is dropped";
     EXPECT_GT(drawn, all / 50);
 }
 
@@ -362,7 +374,7 @@ TEST_F(Road, SwingAndSettingsWindowsReachTheChartOnShow) {
     emit hub->ShowOscillator(QStringLiteral("MACD"));
     QApplication::processEvents();
     EXPECT_EQ(req.AutoOscCode, "MACD");
-    EXPECT_TRUE(chts()->picture2()->isVisible());
+    EXPECT_TRUE(chts()->panelShown());
 }
 
 TEST_F(Road, ScrollAndStepsMoveTheEndOfTheChart) {
@@ -380,7 +392,7 @@ TEST_F(Road, ScrollAndStepsMoveTheEndOfTheChart) {
     EXPECT_GT(stepped, chart::AddCalendarPeriods(lastDate, 'M', -2));
     Key("p1M"); // forward past the last record is the latest chart again
     EXPECT_EQ(chts()->chart().LastRecord, lastRecord);
-    EXPECT_FALSE(charts()->state().Request.ByFinishDate);
+    EXPECT_FALSE(chts()->model().endDate());
 
     Key("scroll");
     auto* scroll = chts()->findChild<QScrollBar*>(QStringLiteral("KoriScroll"));
@@ -498,4 +510,243 @@ TEST_F(Road, AMissingPriceFileIsReportedAndTheToolsStayQuiet) {
     Key("fwd"); // the walk goes on to the next security
     EXPECT_EQ(Code(), "ALX");
     EXPECT_GT(chts()->chart().LastBar(), 0);
+}
+
+TEST_F(Road, AnEndDateMovedInTheWindowStaysWithThatChartOnly) {
+    TypeCode("krm");
+    const int latest = chts()->chart().LastRecord;
+    Key("m1M");
+    ASSERT_LT(chts()->chart().LastRecord, latest);
+    Key("fwd");
+    const std::string next = Code();
+    EXPECT_EQ(chts()->chart().LastRecord, app::PriceRecordCount(s.session, next))
+        << "the next chart shows its latest data";
+    Key("rev");
+    EXPECT_EQ(chts()->chart().LastRecord, latest);
+    // Back in the selection the finish date still says LATEST, and SHOW CHART means it.
+    Key("m1M");
+    Key("new");
+    auto* finish = sel()->findChild<QLineEdit*>(QStringLiteral("txtFinish"));
+    ASSERT_NE(finish, nullptr);
+    EXPECT_EQ(finish->text(), QStringLiteral("LATEST"));
+    sel()->ShowChart();
+    EXPECT_EQ(chts()->chart().LastRecord, latest);
+}
+
+TEST_F(Road, TheKeyboardWalksTheListPicksStyleAndPeriodAndLeavesATool) {
+    TypeCode("krm");
+    main.activateWindow();
+    (void)QTest::qWaitForWindowActive(&main);
+    QWidget* view = chts()->picture1();
+    view->setFocus();
+    QTest::keyClick(view, Qt::Key_PageDown);
+    EXPECT_NE(Code(), "KRM");
+    QTest::keyClick(view, Qt::Key_PageUp);
+    EXPECT_EQ(Code(), "KRM");
+    QTest::keyClick(view, Qt::Key_Right);
+    QTest::keyClick(view, Qt::Key_Left);
+    EXPECT_EQ(Code(), "KRM");
+    QTest::keyClick(view, Qt::Key_W);
+    EXPECT_EQ(charts()->state().Request.ChartPeriod, 'W');
+    QTest::keyClick(view, Qt::Key_C);
+    EXPECT_EQ(charts()->state().Request.ChartStyle, 'C');
+    QTest::keyClick(view, Qt::Key_D);
+    QTest::keyClick(view, Qt::Key_B);
+    Key("tline");
+    ASSERT_EQ(chts()->tool(), app::ChartTool::Trendline);
+    QTest::keyClick(view, Qt::Key_Escape);
+    EXPECT_EQ(chts()->tool(), app::ChartTool::None);
+    EXPECT_FALSE(chts()->ToolKey("tline")->isChecked());
+
+    // After a pick in the oscillator box the keys go to the chart, not to the box.
+    auto* box = chts()->findChild<QComboBox*>(QStringLiteral("cboOsc"));
+    ASSERT_NE(box, nullptr);
+    EXPECT_EQ(box->focusPolicy(), Qt::ClickFocus);
+    box->setFocus();
+    emit box->activated(1);
+    QApplication::processEvents();
+    if (main.isActiveWindow()) EXPECT_TRUE(view->hasFocus());
+    const int picked = box->currentIndex();
+    QTest::keyClick(view, Qt::Key_PageDown);
+    EXPECT_EQ(box->currentIndex(), picked) << "PageDown walked the list, not the oscillators";
+    EXPECT_NE(Code(), "KRM");
+}
+
+TEST_F(Road, TheWheelScrollsTheHistoryAndCtrlWheelChangesTheSpacing) {
+    TypeCode("krm");
+    const int latest = chts()->chart().LastRecord;
+    const int spacing = chts()->chart().BarSpacing;
+    auto wheel = [this](int delta, Qt::KeyboardModifiers mods) {
+        QWidget* view = chts()->picture1();
+        const QPointF at(200, 200);
+        QWheelEvent e(at, view->mapToGlobal(at), QPoint(), QPoint(0, delta), Qt::NoButton, mods,
+                      Qt::NoScrollPhase, false);
+        QApplication::sendEvent(view, &e);
+        QApplication::processEvents();
+    };
+    wheel(120, Qt::NoModifier);
+    EXPECT_EQ(chts()->chart().LastRecord, latest - 5);
+    wheel(-120, Qt::NoModifier);
+    EXPECT_EQ(chts()->chart().LastRecord, latest);
+    wheel(120, Qt::ControlModifier);
+    EXPECT_EQ(chts()->chart().BarSpacing, spacing + 1);
+    wheel(-240, Qt::ControlModifier);
+    EXPECT_EQ(chts()->chart().BarSpacing, spacing - 1);
+}
+
+TEST_F(Road, ANoteLeavesTheFibonacciLinesOnTheChart) {
+    TypeCode("krm");
+    const auto& c = chts()->chart();
+    Key("fib");
+    chts()->MousePress(c.PlotLeft + 40, c.PriceToY(c.MinLow), Qt::LeftButton);
+    chts()->MousePress(c.PlotLeft + 300, c.PriceToY(c.MaxHigh), Qt::LeftButton);
+    auto dashed = [this] {
+        const std::string l = platform::ReadWholeFile(app::ChartLinesPath(s.session)).value_or("");
+        return std::count(l.begin(), l.end(), 'D');
+    };
+    ASSERT_EQ(dashed(), 3);
+    Key("text");
+    s.dialogs.QueueInput(std::string("note"));
+    chts()->MousePress(c.PlotLeft + 100, c.PriceToY(c.ChartBars()[25].Close), Qt::LeftButton);
+    ASSERT_NE(platform::ReadWholeFile(app::NotesPath(s.session, "KRM")).value_or("").find("note"),
+              std::string::npos);
+    EXPECT_EQ(dashed(), 3);
+}
+
+TEST_F(Road, AGarbagePriceFileSaysWhyTheChartAreaIsBlank) {
+    TypeCode("krm");
+    const auto path = store::PriceFile::PathFor(s.session.folders.DataFolder, "KRM");
+    const auto size = platform::FileSizeOr0(path);
+    {
+        // Garbage whose every float reads as the largest float there is: no scale spans it.
+        std::string bytes;
+        while (bytes.size() < size)
+            bytes += std::string("\xff\xff\x7f\x7f", 4);
+        std::ofstream out(path, std::ios::binary | std::ios::trunc);
+        out << bytes.substr(0, static_cast<std::size_t>(size));
+    }
+    s.dialogs.clear();
+    Key("ref");
+    ASSERT_FALSE(s.dialogs.shown().empty());
+    EXPECT_EQ(s.dialogs.shown().back().text, "The chart has no usable price scale.");
+    EXPECT_EQ(s.dialogs.shown().back().title, "Chart Display");
+}
+
+TEST_F(Road, TheOscillatorSettingsAreReachedFromTheChartAndSavesRedraw) {
+    TypeCode("krm");
+    auto* settings = chts()->findChild<QAction*>(QStringLiteral("cmOscSettings"));
+    ASSERT_NE(settings, nullptr);
+    settings->trigger();
+    QApplication::processEvents();
+    auto* frm = main.findChild<QDialog*>(QStringLiteral("OscFrm"));
+    ASSERT_NE(frm, nullptr);
+    EXPECT_TRUE(frm->isVisible());
+    frm->close();
+    QApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
+
+    // "Always show oscillator settings box": a pick in the toolbar opens it.
+    charts()->state().Defaults.ShowOscSettings = true;
+    auto* box = chts()->findChild<QComboBox*>(QStringLiteral("cboOsc"));
+    int rsi = -1;
+    for (int i = 0; i < box->count(); ++i)
+        if (app::OscChoices()[static_cast<std::size_t>(i)].Code == std::string("RSI")) rsi = i;
+    ASSERT_GE(rsi, 0);
+    emit box->activated(rsi);
+    QApplication::processEvents();
+    frm = main.findChild<QDialog*>(QStringLiteral("OscFrm"));
+    ASSERT_NE(frm, nullptr);
+    EXPECT_TRUE(frm->isVisible());
+    frm->close();
+    QApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
+    ASSERT_TRUE(chts()->panelShown());
+
+    // A double click on the panel opens it too.
+    const int y = chts()->model().lastBuild().PriceHeight + 30;
+    QTest::mouseDClick(chts()->picture1(), Qt::LeftButton, {}, QPoint(200, y));
+    QApplication::processEvents();
+    frm = main.findChild<QDialog*>(QStringLiteral("OscFrm"));
+    ASSERT_NE(frm, nullptr);
+    frm->close();
+    QApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
+
+    // SAVE in the chart defaults draws the chart again at once.
+    std::filesystem::remove(app::ChartStreamPath(s.session));
+    auto* hub = main.findChild<gui::SettingsHub*>(QStringLiteral("SettingsHub"));
+    ASSERT_NE(hub, nullptr);
+    emit hub->ChartDefaultsSaved();
+    QApplication::processEvents();
+    EXPECT_TRUE(platform::FileHasData(app::ChartStreamPath(s.session)));
+}
+
+TEST_F(Road, ChartSelectionFollowsAStyleChangedInTheChartWindow) {
+    TypeCode("krm");
+    Key("pf");
+    Key("bar");
+    Key("new");
+    for (const char* name : {"Combo2", "Combo3", "Combo4"}) {
+        auto* w = sel()->findChild<QComboBox*>(QString::fromLatin1(name));
+        ASSERT_NE(w, nullptr) << name;
+        EXPECT_TRUE(w->isEnabled()) << name;
+    }
+    EXPECT_EQ(sel()->findChild<QComboBox*>(QStringLiteral("Combo1"))->currentIndex(), 0);
+}
+
+TEST_F(Road, PrintShowsAPreviewOfThePageFirst) {
+    TypeCode("krm");
+    QPrinter printer(QPrinter::HighResolution);
+    printer.setOutputFormat(QPrinter::PdfFormat);
+    printer.setOutputFileName(QString::fromStdString((s.root.path() / "preview.pdf").string()));
+    chts()->SetPrinter(&printer);
+    bool previewed = false;
+    QTimer poll;
+    poll.setInterval(50);
+    int tries = 0;
+    QObject::connect(&poll, &QTimer::timeout, [&] {
+        if (++tries > 200) QApplication::exit(); // never reached while the preview works
+        if (auto* d = qobject_cast<QDialog*>(QApplication::activeModalWidget());
+            d && d->objectName() == QStringLiteral("PrintPreview")) {
+            previewed = true;
+            d->reject();
+        }
+    });
+    poll.start();
+    chts()->Print();
+    poll.stop();
+    EXPECT_TRUE(previewed);
+}
+
+TEST_F(Road, TheScreenShowsThePictureTheSharedBuildMakesForAFile) {
+    TypeCode("krm");
+    auto& req = charts()->state().Request;
+    req.AutoOsc = true;
+    req.AutoOscCode = "RSI";
+    Key("ref");
+    const QImage& shown = chts()->picture1()->picture();
+    app::ChartJob job;
+    job.Name = chts()->current();
+    job.Request = req;
+    job.Defaults = charts()->state().Defaults;
+    job.WriteStream = false;
+    job.DrawOverlays = [this](chart::Chart& c, const chart::ChartRequest& half,
+                              platform::Surface& surface) {
+        app::DrawChartLines(s.session, c, half, "KRM", surface);
+        app::DrawTextNotes(s.session, c, half, "KRM", surface);
+    };
+    gui::ImageSurface file(shown.width(), shown.height());
+    chart::Chart c;
+    ASSERT_TRUE(app::BuildChartWithPanel(s.session, job, c, file).Status.ok());
+    EXPECT_TRUE(file.Finish() == shown) << "a PNG of the same size is the picture on screen";
+}
+
+TEST_F(Road, AMaximisedChartAddsNoSecondToolsMenu) {
+    TypeCode("krm");
+    auto* bar = chts()->findChild<QMenuBar*>();
+    ASSERT_NE(bar, nullptr);
+    QStringList titles;
+    for (QAction* a : bar->actions())
+        titles << a->text();
+    EXPECT_FALSE(titles.contains(QStringLiteral("&Tools"))) << titles.join(' ').toStdString();
+    EXPECT_TRUE(titles.contains(QStringLiteral("&Lines")));
+    // The tool lines menu still holds what it held.
+    EXPECT_NE(chts()->findChild<QAction*>(QStringLiteral("cmRemoveTrendlines")), nullptr);
 }

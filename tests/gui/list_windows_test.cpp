@@ -325,12 +325,15 @@ TEST_F(Lists, IndustryClassesAreCheckedCellByCellAndWrittenBackOnClose) {
     EXPECT_EQ(store::ClassNameOf(sys(), "990"), "Other");
     delete w;
 
-    // Display reads the file again and forgets edits.
+    // Display reads the file again, forgets edits, and says what it read.
     gui::IndClass again(s.session);
     Edit(again.grid(), 0, 1, "Changed");
+    again.statusLine()->clear();
     again.findChild<QAction*>("mnuDisplay")->trigger();
     EXPECT_EQ(Cell(again.grid(), 0, 1), "Base Metals");
     EXPECT_FALSE(again.changed());
+    EXPECT_EQ(again.statusLine()->text(),
+              QStringLiteral("%1 rows read from IndClass.dat").arg(again.grid()->rowCount()));
 
     const auto pdf = s.root.path() / "classes.pdf";
     QPrinter printer(QPrinter::HighResolution);
@@ -434,4 +437,24 @@ TEST_F(Lists, AMissingClassFileStartsAnEmptyGridAndIsWrittenOnClose) {
     w.findChild<QAction*>("mnuClose")->trigger();
     EXPECT_EQ(ReadSys("Gics.dat"), "4510,Information Technology,\r\n");
     EXPECT_EQ(store::SectorNameOf(sys(), "4510"), "Information Technology_");
+}
+
+TEST_F(Lists, TheCountUnderAListSaysOneChartNotOneCharts) {
+    gui::SubList2 w(s.session, hub());
+    auto& left = w.panel(0);
+    auto& right = w.panel(1);
+    left.chooser()->setCurrentIndex(1);   // Resources
+    right.chooser()->setCurrentIndex(10); // Z, empty
+    QLabel* count = nullptr;
+    for (auto* l : right.findChildren<QLabel*>())
+        if (l->objectName().startsWith(QStringLiteral("lblCount"))) count = l;
+    ASSERT_NE(count, nullptr);
+    Select(left.list(), {0});
+    Click(w, "cmdCopyRight");
+    EXPECT_EQ(count->text(), QStringLiteral("1 chart"));
+    Select(left.list(), {5});
+    Click(w, "cmdCopyRight");
+    EXPECT_EQ(count->text(), QStringLiteral("2 charts"));
+    s.dialogs.QueueAnswer(Answer::No);
+    w.reject();
 }

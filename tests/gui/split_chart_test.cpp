@@ -95,7 +95,7 @@ TEST_F(SplitRoad, SecondChartSplitsTheChartOnShowAndPrintAndSaveCarryIt) {
         platform::ReadWholeFile(app::ChartStreamPath(s.session)).value_or("");
     EXPECT_NE(stream.find("WEEKLY - "), std::string::npos);
     EXPECT_NE(stream.find("DAILY - "), std::string::npos);
-    EXPECT_FALSE(chts()->picture2()->isVisible());
+    EXPECT_FALSE(chts()->panelShown());
     EXPECT_NE(chts()->picture1()->picture(), single);
     // The mouse tools stay quiet over two charts.
     chts()->MouseMove(200, 200, Qt::NoButton);

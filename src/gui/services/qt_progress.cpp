@@ -41,6 +41,10 @@ void QtProgress::Yield() {
     QCoreApplication::processEvents();
 }
 
+bool QtProgress::barShown() const {
+    return !m_progress->isHidden() && !m_cancel->isHidden();
+}
+
 void QtProgress::Finish() {
     m_label->hide();
     m_progress->hide();

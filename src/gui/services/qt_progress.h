@@ -18,6 +18,8 @@ public:
     void SetValue(long long value) override;
     void Yield() override;
     void Finish(); // hides the bar again
+    QStatusBar* statusBar() const { return m_bar; }
+    bool barShown() const; // the bar and its Cancel button are on show
 
 private:
     QStatusBar* m_bar;

@@ -1,8 +1,6 @@
 #include "gui/windows/chart_windows.h"
 
 #include "app/chart_service.h"
-#include "app/osc_service.h"
-#include "osc/osc_panel.h"
 
 #include "gui/windows/cht_page.h"
 #include "gui/windows/cht_sel.h"
@@ -31,7 +29,8 @@ ChartWindows::ChartWindows(MainWindow& main) : QObject(&main), m_main(main) {
         reload();
         if (Chts* c = chts(); c && m_chartWindow->isVisible()) c->Rebuild();
     };
-    connect(&hub, &SettingsHub::ChartDefaultsSaved, this, reload);
+    // SAVE in the chart defaults redraws the chart on show with them.
+    connect(&hub, &SettingsHub::ChartDefaultsSaved, this, rebuild);
     connect(&hub, &SettingsHub::RebuildChart, this, rebuild);
     connect(&hub, &SettingsHub::ColoursChanged, this, rebuild);
     connect(&hub, &SettingsHub::FontsChanged, this, rebuild);
@@ -118,18 +117,12 @@ Chts* ChartWindows::EnsureChts() {
     m_chartWindow->setAttribute(Qt::WA_DeleteOnClose);
     connect(c, &Chts::ChartSelectionRequested, this, &ChartWindows::BackToSelection);
     c->SetPrinter(&printer());
-    c->SetOscillatorPainter([this](chart::Chart& chart, const app::ChartJob& job,
-                                   platform::Surface& price, platform::Surface& panel) {
-        auto& session = m_main.session();
-        panel.SetBackColour(session.palette[osc::oscpal::Background]);
-        panel.Clear();
-        app::OscPanelJob p;
-        p.OscName = job.Request.AutoOscCode;
-        p.SlowStochastic = job.Request.AutoOscSlow;
-        p.PanelOffset = price.ScaleHeight();
-        p.PriceSurface = &price;
-        const auto outcome = app::DrawSecurityOscillator(session, job, chart, p, panel);
-        return outcome != osc::OscOutcome::DailyOnly && outcome != osc::OscOutcome::OnPriceChart;
+    // The oscillator settings box: from the panel, the chart's menu, or before an oscillator
+    // picked in the toolbar shows when "Always show oscillator settings box" is ticked.
+    connect(c, &Chts::OscSettingsRequested, this, [this] {
+        const auto& r = m_state.Request;
+        OpenOscillatorSettings(m_main, r.AutoOsc ? r.AutoOscCode : std::string(), r.ChartStyle,
+                               std::string(1, r.ChartPeriod));
     });
     // Closing the chart window on its own goes back to the selection it came from.
     connect(m_chartWindow, &QObject::destroyed, this, [this] {

@@ -351,6 +351,9 @@ void ChtSel::BandsChosen(int index) {
         Refresh();
         return;
     }
+    // The values asked for are those of the code in the field, typed or shown.
+    m_sel.TakeTypedCode(m_code->text().toStdString());
+    Refresh();
     const auto rec = m_sel.Current();
     for (;;) {
         const auto values =

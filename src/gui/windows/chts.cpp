@@ -24,13 +24,14 @@
 #include <QComboBox>
 #include <QDialog>
 #include <QFileDialog>
+#include <QKeyEvent>
 #include <QLabel>
 #include <QMdiSubWindow>
 #include <QMenu>
 #include <QMenuBar>
 #include <QPageLayout>
 #include <QPainter>
-#include <QPrintDialog>
+#include <QPrintPreviewDialog>
 #include <QPrinter>
 #include <QScrollBar>
 #include <QStatusBar>
@@ -48,31 +49,26 @@ namespace {
 QString Q(const std::string& s) {
     return QString::fromStdString(s);
 }
-constexpr int kPanes = 5;
-constexpr int kOscPanelHeight = 170;
-
-// The parabolic is chosen as an oscillator but drawn over the bars: no panel for it.
-bool OnPriceChart(const std::string& oscName) {
-    const auto* id = osc::FindOscIdentifier(oscName);
-    return id != nullptr && id->OnPriceChart;
-}
-constexpr int kFibTimeLineEntry = 21;
+constexpr int kPanes = 6; // the read-out: date, open, high, low, close, volume
 // "d/m/yy" for the scroll read-out.
 std::string ShortDate(const std::string& yyyymmdd) {
     const auto d = platform::ParseDateText(yyyymmdd);
     if (!d) return yyyymmdd;
     return std::to_string(d->day) + "/" + std::to_string(d->month) + "/" + yyyymmdd.substr(2, 2);
 }
+app::ChartButton ButtonOf(Qt::MouseButton b) {
+    return b == Qt::LeftButton    ? app::ChartButton::Left
+           : b == Qt::RightButton ? app::ChartButton::Right
+                                  : app::ChartButton::Other;
+}
 } // namespace
 
 Chts::Chts(app::Session& session, app::ChartState& state, QWidget* parent)
-    : QWidget(parent), m_session(session), m_state(state), m_walk(session),
-      m_chart(std::make_unique<chart::Chart>()), m_toolbar(new QToolBar(this)),
-      m_toolbar2(new QToolBar(this)), m_oscBox(new QComboBox(this)),
-      m_picture1(new ChartView(this)), m_picture2(new ChartView(this)),
-      m_picture4(new ChartView(this)), m_koriScroll(new QScrollBar(Qt::Horizontal, this)),
-      m_status(new QStatusBar(this)), m_autoTimer(new QTimer(this)),
-      m_resizeTimer(new QTimer(this)) {
+    : QWidget(parent), m_session(session), m_state(state), m_model(session, state),
+      m_toolbar(new QToolBar(this)), m_toolbar2(new QToolBar(this)), m_oscBox(new QComboBox(this)),
+      m_picture1(new ChartView(this)), m_picture4(new ChartView(this)),
+      m_koriScroll(new QScrollBar(Qt::Horizontal, this)), m_status(new QStatusBar(this)),
+      m_autoTimer(new QTimer(this)), m_resizeTimer(new QTimer(this)) {
     setObjectName(QStringLiteral("Chts"));
     setWindowTitle(QStringLiteral("Chart"));
     auto* layout = new QVBoxLayout(this);
@@ -91,7 +87,7 @@ Chts::Chts(app::Session& session, app::ChartState& state, QWidget* parent)
     file->addAction(QStringLiteral("Display Saved Chart"), this, &Chts::DisplaySavedChartDialog)
         ->setObjectName(QStringLiteral("cmShowSaved"));
     file->addSeparator();
-    file->addAction(QStringLiteral("Chart &Selection"), this, [this] { SetTool(kToolNewChart); });
+    file->addAction(QStringLiteral("Chart &Selection"), this, &Chts::NewChart);
     file->addAction(QStringLiteral("&Close"), this, [this] {
         // Inside the frame the window is a sub-window; window() would be the main window.
         if (auto* sub = qobject_cast<QMdiSubWindow*>(parentWidget()))
@@ -99,7 +95,8 @@ Chts::Chts(app::Session& session, app::ChartState& state, QWidget* parent)
         else
             close();
     });
-    QMenu* tools = menus->addMenu(QStringLiteral("&Tools"));
+    // Not "Tools": a maximised chart shares the menu bar with the main window's "Tools".
+    QMenu* tools = menus->addMenu(QStringLiteral("&Lines"));
     tools
         ->addAction(QStringLiteral("Remove all trendlines for ..."), this,
                     &Chts::RemoveAllTrendlines)
@@ -107,7 +104,7 @@ Chts::Chts(app::Session& session, app::ChartState& state, QWidget* parent)
     m_timeLinesCaption = tools->addAction(QStringLiteral("Fib Time Lines - Trading Days"));
     m_timeLinesCaption->setObjectName(QStringLiteral("cmFibTimeKind"));
     connect(m_timeLinesCaption, &QAction::triggered, this,
-            [this] { SetCalendarTimeLines(!m_calendarLines); });
+            [this] { SetCalendarTimeLines(!m_model.calendarTimeLines()); });
     QMenu* overlays = menus->addMenu(QStringLiteral("&Overlays"));
     QAction* mma = overlays->addAction(QStringLiteral("&Multiple Moving Averages"));
     mma->setObjectName(QStringLiteral("cmMMA"));
@@ -120,6 +117,10 @@ Chts::Chts(app::Session& session, app::ChartState& state, QWidget* parent)
     swing->setObjectName(QStringLiteral("cmSwing"));
     swing->setCheckable(true);
     connect(swing, &QAction::toggled, this, [this](bool on) { SetSwing(on); });
+    overlays
+        ->addAction(QStringLiteral("&Oscillator Settings ..."), this,
+                    [this] { emit OscSettingsRequested(); })
+        ->setObjectName(QStringLiteral("cmOscSettings"));
     overlays->addSeparator();
     m_singleChart = overlays->addAction(QStringLiteral("Single C&hart"), this, &Chts::EndSplit);
     m_singleChart->setObjectName(QStringLiteral("cmSingleChart"));
@@ -133,16 +134,11 @@ Chts::Chts(app::Session& session, app::ChartState& state, QWidget* parent)
     m_koriScroll->hide();
     layout->addWidget(m_koriScroll);
     m_picture1->setObjectName(QStringLiteral("Picture1"));
-    m_picture2->setObjectName(QStringLiteral("Picture2"));
     m_picture4->setObjectName(QStringLiteral("Picture4"));
-    m_picture2->setMinimumHeight(kOscPanelHeight);
-    m_picture2->setMaximumHeight(kOscPanelHeight);
-    m_picture2->hide();
     m_picture4->setMinimumSize(200, 52);
     m_picture4->setMaximumHeight(52);
     m_picture4->hide();
     layout->addWidget(m_picture1, 1);
-    layout->addWidget(m_picture2);
     layout->addWidget(m_picture4);
     for (int i = 0; i < kPanes; ++i) {
         auto* pane = new QLabel(m_status);
@@ -156,21 +152,24 @@ Chts::Chts(app::Session& session, app::ChartState& state, QWidget* parent)
     connect(m_picture1, &ChartView::ChartMouseMove, this, &Chts::MouseMove);
     connect(m_picture1, &ChartView::ChartMousePress, this, &Chts::MousePress);
     connect(m_picture1, &ChartView::ChartMouseRelease, this, &Chts::MouseRelease);
+    connect(m_picture1, &ChartView::ChartWheel, this, &Chts::Wheel);
+    connect(m_picture1, &ChartView::ChartDoubleClick, this,
+            [this](double x, double y) { Apply(m_model.DoubleClick(x, y)); });
+    m_picture1->setFocusPolicy(Qt::StrongFocus);
     connect(m_koriScroll, &QScrollBar::valueChanged, this, [this](int v) {
-        if (!m_haveName || m_koriScroll->signalsBlocked()) return;
-        const std::string date = app::PriceRecordDate(m_session, Code(), v);
-        if (date.empty()) return;
-        m_state.Request.ByFinishDate = true;
-        m_state.Request.FinishDate = date;
+        if (!m_model.haveSecurity() || m_koriScroll->signalsBlocked()) return;
+        if (!m_model.EndAtRecord(v)) return;
         Rebuild();
-        SetPanes({ShortDate(date)});
+        SetPanes({ShortDate(app::PriceRecordDate(m_session, Code(), v))});
     });
     connect(m_autoTimer, &QTimer::timeout, this, [this] { NextChart(1); });
     m_resizeTimer->setSingleShot(true);
     m_resizeTimer->setInterval(200);
     connect(m_picture1, &ChartView::Resized, m_resizeTimer, qOverload<>(&QTimer::start));
     connect(m_resizeTimer, &QTimer::timeout, this, [this] {
-        if (m_haveName && !m_showingSaved && m_picture1->picture().size() != AreaSize()) Rebuild();
+        if (m_model.haveSecurity() && !m_model.showingSaved() &&
+            m_picture1->picture().size() != AreaSize())
+            Rebuild();
     });
 }
 
@@ -193,19 +192,19 @@ void Chts::BuildToolBar() {
         connect(a, &QAction::triggered, this, fn);
         return a;
     };
-    add("new", "New", "Chart selection", [this] { SetTool(kToolNewChart); });
-    add("rev", "<", "Previous chart of the list", [this] { NextChart(-1); });
+    add("new", "New", "Chart selection", [this] { NewChart(); });
+    add("rev", "<", "Previous chart of the list (Page Up)", [this] { NextChart(-1); });
     add("ref", "=", "Redraw this chart", [this] { NextChart(0); });
-    add("fwd", ">", "Next chart of the list", [this] { NextChart(1); });
+    add("fwd", ">", "Next chart of the list (Page Down)", [this] { NextChart(1); });
     m_toolbar->addSeparator();
-    add("bar", "Bar", "Bar chart", [this] { SetStyle('B'); });
-    add("cstick", "Cdl", "Candlestick chart", [this] { SetStyle('C'); });
-    add("lne", "Line", "Line chart", [this] { SetStyle('L'); });
-    add("pf", "P&&F", "Point and figure chart", [this] { SetStyle('P'); });
+    add("bar", "Bar", "Bar chart (B)", [this] { SetStyle('B'); });
+    add("cstick", "Cdl", "Candlestick chart (C)", [this] { SetStyle('C'); });
+    add("lne", "Line", "Line chart (L)", [this] { SetStyle('L'); });
+    add("pf", "P&&F", "Point and figure chart (P)", [this] { SetStyle('P'); });
     m_toolbar->addSeparator();
-    add("dly", "D", "Daily", [this] { SetPeriod('A'); });
-    add("wky", "W", "Weekly", [this] { SetPeriod('W'); });
-    add("mly", "M", "Monthly", [this] { SetPeriod('M'); });
+    add("dly", "D", "Daily (D)", [this] { SetPeriod('A'); });
+    add("wky", "W", "Weekly (W)", [this] { SetPeriod('W'); });
+    add("mly", "M", "Monthly (M)", [this] { SetPeriod('M'); });
     add("m1D", "-1D", "Back a day", [this] { StepEnd('A', -1); });
     add("p1D", "+1D", "Forward a day", [this] { StepEnd('A', 1); });
     add("m1W", "-1W", "Back a week", [this] { StepEnd('W', -1); });
@@ -235,31 +234,62 @@ void Chts::BuildToolBar() {
         m_state.Request.AutoOscCode = row.Code;
         m_state.Request.AutoOscSlow = row.Slow;
         Rebuild();
+        if (i != 0 && m_state.Defaults.ShowOscSettings) emit OscSettingsRequested();
+        // The keys belong to the chart again: PageDown, Home and letters must not change the
+        // oscillator behind the user's back.
+        m_picture1->setFocus();
     });
+    // Reached by a click only, so the keyboard never lands in it.
+    m_oscBox->setFocusPolicy(Qt::ClickFocus);
     m_toolbar->addWidget(m_oscBox);
     bar = m_toolbar2;
     add(
         "tline", "Trend", "Draw trendlines",
-        [this] { SetTool(m_tool == kToolTrendline ? kToolNone : kToolTrendline); }, true);
+        [this] {
+            SetTool(tool() == app::ChartTool::Trendline ? app::ChartTool::None
+                                                        : app::ChartTool::Trendline);
+        },
+        true);
     add(
-        "terase", "Erase", "Delete a trendline", [this] { SetTool(kToolErase); }, true);
+        "terase", "Erase", "Delete a trendline", [this] { SetTool(app::ChartTool::Erase); }, true);
     add(
         "fib", "Fib", "Fibonacci retracement",
-        [this] { SetTool(m_tool == kToolFibRetracement ? kToolNone : kToolFibRetracement); }, true);
+        [this] {
+            SetTool(tool() == app::ChartTool::FibRetracement ? app::ChartTool::None
+                                                             : app::ChartTool::FibRetracement);
+        },
+        true);
     add(
         "sFibLines", "FibT", "Fibonacci time lines",
-        [this] { SetTool(m_tool == kToolFibTimeLines ? kToolNone : kToolFibTimeLines); }, true);
+        [this] {
+            SetTool(tool() == app::ChartTool::FibTimeLines ? app::ChartTool::None
+                                                           : app::ChartTool::FibTimeLines);
+        },
+        true);
     add(
         "sGannAng", "Gann", "Gann angles",
-        [this] { SetTool(m_tool == kToolGann ? kToolNone : kToolGann); }, true);
+        [this] {
+            SetTool(tool() == app::ChartTool::Gann ? app::ChartTool::None : app::ChartTool::Gann);
+        },
+        true);
     add(
         "text", "Text", "Text notes",
-        [this] { SetTool(m_tool == kToolText ? kToolNone : kToolText); }, true);
+        [this] {
+            SetTool(tool() == app::ChartTool::Text ? app::ChartTool::None : app::ChartTool::Text);
+        },
+        true);
     add(
         "sDayCount", "Days", "Count the days between two bars",
-        [this] { SetTool(m_tool == kToolDayCount ? kToolNone : kToolDayCount); }, true);
+        [this] {
+            SetTool(tool() == app::ChartTool::DayCount ? app::ChartTool::None
+                                                       : app::ChartTool::DayCount);
+        },
+        true);
     add(
-        "sZoom", "Zoom", "Zoom", [this] { SetTool(m_tool == kToolZoom ? kToolNone : kToolZoom); },
+        "sZoom", "Zoom", "Zoom",
+        [this] {
+            SetTool(tool() == app::ChartTool::Zoom ? app::ChartTool::None : app::ChartTool::Zoom);
+        },
         true);
     m_toolbar2->addSeparator();
     add("scroll", "Scroll", "Scroll through the history",
@@ -281,7 +311,7 @@ QAction* Chts::ToolKey(const char* key) const {
 }
 
 std::string Chts::Code() const {
-    return platform::Trim(m_name.Code);
+    return m_model.Code();
 }
 
 QSize Chts::AreaSize() const {
@@ -303,29 +333,13 @@ std::vector<std::string> Chts::StatusPanes() const {
 }
 
 void Chts::LeaveChart() {
-    // Trendlines that changed are packed when the chart goes.
-    if (m_trendChanged && m_haveName) (void)app::PackTrendlines(m_session, Code());
-    m_trendChanged = false;
+    m_model.LeaveChart();
 }
 
 bool Chts::NextChart(int delta) {
-    LeaveChart();
-    if (!m_walk.Open(m_state.Request)) {
-        m_session.dialogs().MsgBox(m_walk.status().message(), "Chart Display");
-        return false;
-    }
-    const bool classWalk = (m_state.ClassWalk || m_state.GicsWalk) && m_state.Request.ListMode == 1;
-    const auto r =
-        classWalk ? app::StepClassChart(m_walk, m_state.Request, delta,
-                                        m_state.GicsWalk ? m_state.GicsCode : m_state.ClassCode,
-                                        m_state.GicsWalk, m_session.dialogs())
-                  : app::StepChart(m_walk, m_state.Request, delta);
-    if (!r) return false;
-    m_name = *r;
-    m_haveName = true;
-    m_state.Split.AfterNextChart(delta);
-    if (delta != 0)
-        m_state.Request.ByFinishDate = m_state.Request.ByFinishDate && !m_koriScroll->isVisible();
+    if (!m_model.NextChart(delta)) return false;
+    // The read-out of the chart before says nothing about this one.
+    if (delta != 0) SetPanes({});
     return Rebuild();
 }
 
@@ -344,83 +358,43 @@ void Chts::SetSwing(bool on) {
 }
 
 bool Chts::Rebuild() {
-    if (!m_haveName) return false;
+    return RebuildKeeping(false);
+}
+
+bool Chts::RebuildKeeping(bool keepToolLines) {
+    if (!m_model.haveSecurity()) return false;
     QApplication::setOverrideCursor(Qt::WaitCursor);
-    app::ClearChartLines(m_session);
-    m_clickStage = 0;
-    m_showingSaved = false;
-    m_moving = -1;
-    auto& req = m_state.Request;
-    const bool longer = req.ChartPeriod != 'A';
-    req.AvOnePeriod = longer ? m_state.Defaults.MAPeriod1Long : m_state.Defaults.MAPeriod1Daily;
-    req.AvTwoPeriod = longer ? m_state.Defaults.MAPeriod2Long : m_state.Defaults.MAPeriod2Daily;
-    // A split fills the whole area with its two charts: no oscillator panel under them.
-    m_splitShown = m_state.Split.Applies(req);
-    req.SecondPanelShowing = req.AutoOsc && static_cast<bool>(m_oscPainter) && !m_splitShown &&
-                             req.ChartStyle != 'P' && !OnPriceChart(req.AutoOscCode);
     const QSize size = AreaSize();
     ImageSurface area(size.width(), size.height());
-    app::ChartJob job;
-    job.Name = m_name;
-    job.Request = req;
-    if (app::IsCloseOnly(m_name.RecordType)) job.Request.ChartStyle = 'L';
-    job.Defaults = m_state.Defaults;
-    job.Page = &m_page;
-    if (m_splitShown) {
-        m_state.Split.Apply(job.Request);
-        job.Lower = m_state.Split.Lower();
-    }
-    const std::string code = Code();
-    job.DrawOverlays = [this, &job, code](chart::Chart& c, platform::Surface& s) {
-        if (m_overlayHook) m_overlayHook(c, job.Request, s);
-        // Trendlines and notes belong to one security's single chart.
-        if (job.Request.SplitMode) return;
-        m_trendEnds = app::DrawChartLines(m_session, c, job.Request, code, s);
-        app::DrawTextNotes(m_session, c, job.Request, code, s);
-    };
-    m_trendEnds.clear();
-    m_chart = std::make_unique<chart::Chart>();
-    auto built = app::BuildSecurityChart(m_session, job, *m_chart, area);
-    bool panelShown = false;
-    if (req.SecondPanelShowing && built) {
-        ImageSurface panel(size.width(), kOscPanelHeight);
-        panelShown = m_oscPainter(*m_chart, job, area, panel);
-        if (panelShown) m_picture2->SetPicture(panel.Finish());
-    }
-    m_picture2->setVisible(panelShown);
-    if (req.SecondPanelShowing && built && !panelShown) {
-        // The price chart takes the whole area again.
-        req.SecondPanelShowing = job.Request.SecondPanelShowing = false;
-        area.Clear();
-        m_trendEnds.clear();
-        m_chart = std::make_unique<chart::Chart>();
-        built = app::BuildSecurityChart(m_session, job, *m_chart, area);
-    }
+    const app::ChartOutcome built = m_model.Build(area, keepToolLines);
     m_picture1->SetPicture(area.Finish());
+    m_picture1->SetCrosshair(std::nullopt);
     DrawLegend();
-    m_oscBox->setCurrentIndex(app::OscChoiceOf(req));
-    std::string title = code + "  " + platform::Trim(m_name.Name);
-    if (m_splitShown) title += "   /   " + m_state.Split.Lower()->Name.TrimmedCode();
+    m_oscBox->setCurrentIndex(app::OscChoiceOf(m_state.Request));
+    const std::string code = Code();
+    std::string title = code + "  " + platform::Trim(m_model.current().Name);
+    if (m_model.splitShown()) title += "   /   " + m_state.Split.Lower()->Name.TrimmedCode();
     setWindowTitle(Q(title));
     m_singleChart->setEnabled(m_state.Split.Chosen());
     if (m_koriScroll->isVisible()) {
         m_koriScroll->blockSignals(true);
-        m_koriScroll->setRange(1, std::max(1, app::PriceRecordCount(m_session, code)));
-        m_koriScroll->setValue(m_chart->LastRecord);
+        m_koriScroll->setRange(1, std::max(1, m_model.PriceRecordCount()));
+        m_koriScroll->setValue(chart().LastRecord);
         m_koriScroll->blockSignals(false);
     }
+    SyncToolKeys();
     QApplication::restoreOverrideCursor();
-    return built.ok();
+    return built.Status.ok();
 }
 
 bool Chts::ShowSplit(const app::SecondChart& lower) {
-    m_state.Split.Choose(lower, m_haveName);
-    return m_haveName && Rebuild();
+    m_state.Split.Choose(lower, m_model.haveSecurity());
+    return m_model.haveSecurity() && Rebuild();
 }
 
 void Chts::EndSplit() {
     m_state.Split.End();
-    if (m_haveName) Rebuild();
+    if (m_model.haveSecurity()) Rebuild();
 }
 
 void Chts::DrawLegend() {
@@ -453,243 +427,104 @@ void Chts::DrawLegend() {
 }
 
 void Chts::SetStyle(char style) {
-    m_state.Request.ChartStyle = style;
-    if (style == 'P') {
-        m_state.Request.ChartPeriod = 'A';
-        m_state.Request.AutoOsc = false;
-        m_state.Request.ChartBands = 0;
-    }
-    if (style == 'C' && m_state.Request.BarSpacing < 3) m_state.Request.BarSpacing = 3;
-    Rebuild();
+    if (m_model.SetStyle(style)) Rebuild();
+    SyncToolKeys();
 }
 
 void Chts::SetPeriod(char period) {
-    if (m_state.Request.ChartStyle == 'P') return;
-    m_state.Request.ChartPeriod = period;
-    Rebuild();
+    if (m_model.SetPeriod(period)) Rebuild();
 }
 
 void Chts::StepEnd(char unit, int direction) {
-    if (!m_haveName || m_chart->LastBar() < 0) return;
-    auto& req = m_state.Request;
-    const std::string shown(
-        m_chart->ChartBars()[static_cast<std::size_t>(m_chart->LastBar())].DateText());
-    const std::string next = chart::AddCalendarPeriods(shown, unit, direction);
-    const int count = app::PriceRecordCount(m_session, Code());
-    const std::string latest = app::PriceRecordDate(m_session, Code(), count);
-    if (direction > 0 && !latest.empty() && next >= latest) {
-        req.ByFinishDate = false;
-    } else {
-        req.ByFinishDate = true;
-        req.FinishDate = next;
-    }
-    Rebuild();
+    if (m_model.StepEnd(unit, direction)) Rebuild();
 }
 
-void Chts::SetTool(int mode) {
-    if (mode == kToolNewChart) {
-        StopAutoScroll();
-        LeaveChart();
-        m_tool = kToolNone;
-        emit ChartSelectionRequested();
+void Chts::Wheel(int notches, bool ctrl) {
+    if (ctrl) {
+        if (m_model.ChangeBarSpacing(notches)) Rebuild();
         return;
     }
-    if (mode == kToolZoom && m_state.Request.ChartStyle != 'B' &&
-        m_state.Request.ChartStyle != 'C') {
-        m_session.dialogs().MsgBox("Zoom only available on Bar & Candlestick charts", "Zoom");
-        mode = kToolNone;
+    // Away from the user goes back in time, a few bars a notch, as the scroll bar does.
+    if (m_model.ScrollBars(-notches * 5)) {
+        Rebuild();
+        if (const auto& end = m_model.endDate()) SetPanes({ShortDate(*end)});
     }
-    if (mode == kToolErase)
-        m_session.dialogs().MsgBox(
-            "To delete a trendline, click that trendline with your RIGHT mouse button",
-            "Trendlines");
-    m_tool = mode;
-    m_clickStage = 0;
+}
+
+void Chts::NewChart() {
+    StopAutoScroll();
+    LeaveChart();
+    Apply(m_model.SetTool(app::ChartTool::None));
+    emit ChartSelectionRequested();
+}
+
+void Chts::SetTool(app::ChartTool tool) {
+    Apply(m_model.SetTool(tool));
+}
+
+void Chts::SyncToolKeys() {
     const struct {
         const char* key;
-        int mode;
-    } keys[] = {{"tline", kToolTrendline},    {"terase", kToolErase},
-                {"fib", kToolFibRetracement}, {"sFibLines", kToolFibTimeLines},
-                {"sGannAng", kToolGann},      {"text", kToolText},
-                {"sZoom", kToolZoom},         {"sDayCount", kToolDayCount}};
+        app::ChartTool tool;
+    } keys[] = {
+        {"tline", app::ChartTool::Trendline},    {"terase", app::ChartTool::Erase},
+        {"fib", app::ChartTool::FibRetracement}, {"sFibLines", app::ChartTool::FibTimeLines},
+        {"sGannAng", app::ChartTool::Gann},      {"text", app::ChartTool::Text},
+        {"sZoom", app::ChartTool::Zoom},         {"sDayCount", app::ChartTool::DayCount}};
     for (const auto& k : keys)
-        if (QAction* a = ToolKey(k.key)) a->setChecked(m_tool == k.mode);
-    if (m_tool == kToolFibRetracement) SetPanes({});
+        if (QAction* a = ToolKey(k.key)) a->setChecked(m_model.tool() == k.tool);
 }
 
 void Chts::SetCalendarTimeLines(bool calendar) {
-    m_calendarLines = calendar;
+    m_model.SetCalendarTimeLines(calendar);
     m_timeLinesCaption->setText(calendar ? QStringLiteral("Fib Time Lines - Calander Days")
                                          : QStringLiteral("Fib Time Lines - Trading Days"));
 }
 
-void Chts::PaintOnPicture(const std::function<void(platform::Surface&)>& draw) {
+void Chts::Apply(const app::ChartEffects& fx) {
+    if (fx.ClearRubber) m_picture1->SetRubberBand(std::nullopt);
+    if (fx.Rubber)
+        m_picture1->SetRubberBand(
+            QLineF(fx.Rubber->x1, fx.Rubber->y1, fx.Rubber->x2, fx.Rubber->y2),
+            QColor(255, 255, 0));
+    if (fx.Rebuild) RebuildKeeping(fx.KeepToolLines);
+    if (fx.Panes) SetPanes(*fx.Panes);
+    if (fx.PictureChanged) m_picture1->update();
+    if (fx.ZoomAt) Zoom(fx.ZoomAt->first, fx.ZoomAt->second);
+    if (fx.OscSettings) emit OscSettingsRequested();
+    SyncToolKeys();
+}
+
+void Chts::WithPicture(const std::function<void(platform::Surface&)>& draw) {
     QImage& image = m_picture1->mutablePicture();
-    if (image.isNull()) return;
-    {
-        QPainter painter(&image);
-        QtSurface surface(&painter, image.width(), image.height());
-        draw(surface);
+    if (image.isNull()) {
+        platform::RecordingSurface none(1, 1);
+        draw(none);
+        return;
     }
-    m_picture1->update();
+    QPainter painter(&image);
+    QtSurface surface(&painter, image.width(), image.height());
+    draw(surface);
 }
 
 void Chts::MouseMove(double x, double y, Qt::MouseButtons buttons) {
-    if (!m_haveName || m_showingSaved || m_splitShown || m_chart->LastBar() < 0) return;
-    if ((m_tool == kToolTrendline && (buttons & Qt::LeftButton)) || m_moving >= 0) {
-        const double ax = m_moving >= 0 ? m_fixedX : m_downX;
-        const double ay = m_moving >= 0 ? m_fixedY : m_downY;
-        m_picture1->SetRubberBand(QLineF(ax, ay, x, y), QColor(255, 255, 0));
-        return;
-    }
-    const bool closeOnly = app::IsCloseOnly(m_name.RecordType);
-    if ((buttons & Qt::LeftButton) && m_tool == kToolNone)
-        SetPanes(app::RiseFallReadout(*m_chart, m_downX, x));
-    else if (m_tool != kToolFibRetracement && m_tool != kToolDayCount)
-        SetPanes(app::CursorReadout(*m_chart, x, closeOnly));
-    (void)y;
+    const app::ChartEffects fx = m_model.MouseMove(x, y, buttons & Qt::LeftButton);
+    m_picture1->SetCrosshair(fx.Crosshair ? std::optional<QPointF>(QPointF(*fx.Crosshair, y))
+                                          : std::nullopt);
+    Apply(fx);
 }
 
 void Chts::MousePress(double x, double y, Qt::MouseButton button) {
-    if (!m_haveName || m_showingSaved || m_splitShown || m_chart->LastBar() < 0) return;
-    m_downX = x;
-    m_downY = y;
-    m_leftDown = button == Qt::LeftButton;
-    const auto& req = m_state.Request;
-    const std::string code = Code();
-    if (button == Qt::RightButton && m_tool != kToolGann) {
-        const int i = chart::NearestTrendline(m_trendEnds, x, y);
-        if (i < 0) return;
-        const auto e = m_trendEnds[static_cast<std::size_t>(i)];
-        if (m_tool == kToolErase) {
-            if (app::EraseTrendline(m_session, code, e.RecordNumber)) {
-                m_trendChanged = true;
-                Rebuild();
-            }
-            return;
-        }
-        if (m_tool == kToolTrendline) {
-            // The end nearer the click moves; the other stays.
-            const bool moveA = std::hypot(x - e.xA, y - e.yA) < std::hypot(x - e.xB, y - e.yB);
-            m_moving = i;
-            m_fixedX = moveA ? e.xB : e.xA;
-            m_fixedY = moveA ? e.yB : e.yA;
-        }
-        return;
-    }
-    const auto frame = app::ToolFrameOf(*m_chart, req);
-    switch (m_tool) {
-    case kToolFibRetracement: {
-        const double price = m_chart->YToPrice(y);
-        if (price <= 0) return;
-        if (m_clickStage == 0) {
-            m_fibStart = price;
-            m_clickStage = 1;
-            SetPanes({"Start  " + app::ReadoutPrice(price)});
-            return;
-        }
-        m_clickStage = 0;
-        const auto levels = chart::FibonacciLevels(m_fibStart, price);
-        const double rise = price - m_fibStart;
-        if (levels.empty()) {
-            SetPanes({"Start  " + app::ReadoutPrice(m_fibStart),
-                      "End   " + app::ReadoutPrice(price),
-                      "Rise   " + platform::Trim(platform::Format(rise, "#####.00#",
-                                                                  platform::ZeroSign::Dropped))});
-            SetTool(kToolNone);
-            return;
-        }
-        std::vector<std::string> panes = {
-            "End   " + app::ReadoutPrice(price),
-            "Rise   " +
-                platform::Trim(platform::Format(rise, "#####.00#", platform::ZeroSign::Dropped))};
-        for (const auto& l : levels)
-            panes.push_back(l.StatusText + app::ReadoutPrice(l.Price));
-        SetPanes(panes);
-        const auto lines = chart::FibonacciLines(frame, x, levels);
-        PaintOnPicture([&](platform::Surface& s) {
-            for (const auto& seg : lines)
-                app::RecordChartLine(m_session, s, seg);
-        });
-        return;
-    }
-    case kToolFibTimeLines: {
-        const int bar = app::BarUnder(*m_chart, x);
-        if (bar < 0) return;
-        const auto xs = chart::FibTimeLines(frame, bar, m_calendarLines);
-        PaintOnPicture([&](platform::Surface& s) {
-            for (double lx : xs)
-                app::RecordChartLine(m_session, s,
-                                     {lx, static_cast<double>(m_chart->PlotTop), lx,
-                                      static_cast<double>(m_chart->PlotBottom), kFibTimeLineEntry,
-                                      'D'});
-        });
-        return;
-    }
-    case kToolGann: {
-        const auto fan = chart::GannFan(frame, x, y, button == Qt::LeftButton);
-        PaintOnPicture([&](platform::Surface& s) {
-            for (const auto& seg : fan)
-                app::RecordChartLine(m_session, s, seg);
-        });
-        return;
-    }
-    case kToolText: {
-        if (m_chart->YToPrice(y) <= 0) return;
-        const auto text = m_session.dialogs().InputBox(
-            "Text - Enter text required - Press ENTER to Save", "Text");
-        if (!text || platform::Trim(*text).empty()) return;
-        if (app::AddTextNote(m_session, *m_chart, req, code, x, y, *text)) Rebuild();
-        return;
-    }
-    case kToolZoom:
-        Zoom(x, y);
-        return;
-    case kToolDayCount:
-        if (app::BarUnder(*m_chart, x) < 0) return;
-        if (m_clickStage == 0) {
-            m_countFromX = x;
-            m_clickStage = 1;
-            SetPanes({"From  " +
-                      ShortDate(std::string(
-                          m_chart->ChartBars()[static_cast<std::size_t>(app::BarUnder(*m_chart, x))]
-                              .DateText()))});
-            return;
-        }
-        m_clickStage = 0;
-        SetPanes(app::DayCountReadout(*m_chart, m_countFromX, x));
-        return;
-    default:
-        return;
-    }
+    app::ChartEffects fx;
+    WithPicture([&](platform::Surface& s) { fx = m_model.MousePress(x, y, ButtonOf(button), s); });
+    Apply(fx);
 }
 
 void Chts::MouseRelease(double x, double y, Qt::MouseButton button) {
-    if (!m_haveName || m_showingSaved || m_splitShown) return;
-    m_picture1->SetRubberBand(std::nullopt);
-    const auto& req = m_state.Request;
-    if (m_moving >= 0 && button == Qt::RightButton) {
-        const int record = m_trendEnds[static_cast<std::size_t>(m_moving)].RecordNumber;
-        m_moving = -1;
-        if (app::MoveTrendline(m_session, *m_chart, req, Code(), record, m_fixedX, m_fixedY, x,
-                               y)) {
-            m_trendChanged = true;
-            Rebuild();
-        }
-        return;
-    }
-    if (m_tool == kToolTrendline && button == Qt::LeftButton && m_leftDown) {
-        m_leftDown = false;
-        bool added = false;
-        PaintOnPicture([&](platform::Surface& s) {
-            added = app::AddTrendline(m_session, *m_chart, req, Code(), s, m_downX, m_downY, x, y);
-        });
-        if (added) {
-            // The new line is found by a right click like the replayed ones.
-            m_trendEnds = app::TrendEndsOf(m_session, *m_chart, req, Code());
-        }
-    }
-    m_leftDown = false;
+    app::ChartEffects fx;
+    WithPicture(
+        [&](platform::Surface& s) { fx = m_model.MouseRelease(x, y, ButtonOf(button), s); });
+    Apply(fx);
 }
 
 void Chts::Zoom(double x, double y) {
@@ -732,8 +567,8 @@ bool Chts::PrintTo(QPrinter& printer) {
     const QImage& shown = m_picture1->picture();
     chart::PaperJob job{paper, m_session.palette, m_session.fonts,
                         static_cast<double>(shown.width()), static_cast<double>(shown.height())};
-    const std::filesystem::path source =
-        m_showingSaved ? std::filesystem::path(m_savedPath) : app::ChartStreamPath(m_session);
+    const std::filesystem::path source = m_model.showingSaved() ? std::filesystem::path(m_savedPath)
+                                                                : app::ChartStreamPath(m_session);
     const auto outcome = chart::PrintChart(source, job, *m_print);
     QApplication::restoreOverrideCursor();
     m_panes[0]->setText(before);
@@ -753,10 +588,13 @@ void Chts::Print() {
         const int orient = m_session.page.Orient;
         printer.setPageOrientation(orient == 1 ? QPageLayout::Portrait : QPageLayout::Landscape);
     }
-    QPrintDialog dialog(&printer, this);
-    dialog.setWindowTitle(QStringLiteral("Print Chart"));
-    if (dialog.exec() != QDialog::Accepted) return;
-    PrintTo(printer);
+    // The page as it will print first; its print key sends it to the printer.
+    QPrintPreviewDialog preview(&printer, this);
+    preview.setObjectName(QStringLiteral("PrintPreview"));
+    preview.setWindowTitle(QStringLiteral("Print Chart"));
+    connect(&preview, &QPrintPreviewDialog::paintRequested, this,
+            [this](QPrinter* p) { PrintTo(*p); });
+    preview.exec();
 }
 
 void Chts::PageSetup() {
@@ -780,23 +618,20 @@ void Chts::SaveChartDialog() {
 
 bool Chts::DisplaySavedChart(const std::string& chosen) {
     if (chosen.empty()) return false;
-    // The stream is played whole: what lies below the price area (an oscillator panel) goes to
-    // Picture2, as it did when the chart was built.
+    // The stream is played whole: the oscillator panel lies inside the area as it was built;
+    // a stream from a taller area (another program's page) gets the height it reaches.
     const QSize size = AreaSize();
     const chart::StreamReach reach =
         chart::MeasureStream(platform::ResolvePath(platform::NormalisePath(chosen)));
-    const int panel = reach.Bottom > size.height() ? kOscPanelHeight : 0;
-    ImageSurface area(size.width(), size.height() + panel);
+    const int height = std::max(size.height(), static_cast<int>(std::ceil(reach.Bottom)) + 1);
+    ImageSurface area(size.width(), height);
     const bool shown = chart::DisplaySavedChart(chosen, area, m_session.palette, m_session.fonts,
                                                 m_session.dialogs());
     const QImage& picture = area.Finish();
     if (!shown) return false;
     LeaveChart();
-    m_picture1->SetPicture(picture.copy(0, 0, size.width(), size.height()));
-    if (panel > 0) m_picture2->SetPicture(picture.copy(0, size.height(), size.width(), panel));
-    m_picture2->setVisible(panel > 0);
-    m_showingSaved = true;
-    m_splitShown = false;
+    m_picture1->SetPicture(picture);
+    m_model.ShowingSaved(true);
     m_savedPath = chosen;
     setWindowTitle(Q("Saved chart  " + std::filesystem::path(chosen).filename().string()));
     return true;
@@ -810,11 +645,8 @@ void Chts::DisplaySavedChartDialog() {
 }
 
 void Chts::RemoveAllTrendlines() {
-    if (!m_haveName) return;
-    if (app::RemoveAllTrendlines(m_session, Code())) {
-        m_trendChanged = false;
-        Rebuild();
-    }
+    if (!m_model.haveSecurity()) return;
+    if (m_model.RemoveAllTrendlines()) Rebuild();
 }
 
 void Chts::StartAutoScroll() {
@@ -822,7 +654,7 @@ void Chts::StartAutoScroll() {
                                                      "Display Interval", "2.5");
     if (!answer) return;
     const double seconds = std::clamp(platform::Val(*answer), 0.0, 60.0);
-    m_tool = kToolAutoScroll;
+    m_model.SetTool(app::ChartTool::AutoScroll);
     m_autoTimer->start(static_cast<int>(seconds * 1000));
     m_status->showMessage(QStringLiteral("AUTOMATIC SCROLL - TO STOP click AUTO"));
 }
@@ -831,26 +663,65 @@ void Chts::StopAutoScroll() {
     if (!m_autoTimer->isActive()) return;
     m_autoTimer->stop();
     m_status->clearMessage();
-    if (m_tool == kToolAutoScroll) m_tool = kToolNone;
+    if (m_model.tool() == app::ChartTool::AutoScroll) SetTool(app::ChartTool::None);
 }
 
 void Chts::ShowScrollBar(bool on) {
     if (!on) {
         m_koriScroll->hide();
-        m_state.Request.ByFinishDate = false;
+        m_model.EndAtLatest();
         Rebuild();
         return;
     }
-    const int count = m_haveName ? app::PriceRecordCount(m_session, Code()) : 0;
-    if (count < 2 || m_chart->LastBar() < 0 || count <= m_chart->LastBar() + 1) {
+    const int count = m_model.PriceRecordCount();
+    if (count < 2 || chart().LastBar() < 0 || count <= chart().LastBar() + 1) {
         m_session.dialogs().MsgBox("Too few records to show scroll bar", "Chart Scroll");
         return;
     }
     m_koriScroll->blockSignals(true);
     m_koriScroll->setRange(1, count);
-    m_koriScroll->setValue(m_chart->LastRecord);
+    m_koriScroll->setValue(chart().LastRecord);
     m_koriScroll->blockSignals(false);
     m_koriScroll->show();
+}
+
+void Chts::keyPressEvent(QKeyEvent* e) {
+    // Keys a user expects on a chart: the page keys and arrows walk the list, a letter picks
+    // the style or the period, Escape leaves a tool. With Alt or Ctrl they stay the menus'.
+    if (e->modifiers() & (Qt::AltModifier | Qt::ControlModifier | Qt::MetaModifier)) {
+        QWidget::keyPressEvent(e);
+        return;
+    }
+    switch (e->key()) {
+    case Qt::Key_PageDown:
+    case Qt::Key_Right:
+        NextChart(1);
+        break;
+    case Qt::Key_PageUp:
+    case Qt::Key_Left:
+        NextChart(-1);
+        break;
+    case Qt::Key_Escape:
+        SetTool(app::ChartTool::None);
+        break;
+    case Qt::Key_B:
+    case Qt::Key_C:
+    case Qt::Key_L:
+    case Qt::Key_P:
+        SetStyle(static_cast<char>(e->key()));
+        break;
+    case Qt::Key_D:
+        SetPeriod('A');
+        break;
+    case Qt::Key_W:
+    case Qt::Key_M:
+        SetPeriod(static_cast<char>(e->key()));
+        break;
+    default:
+        QWidget::keyPressEvent(e);
+        return;
+    }
+    e->accept();
 }
 
 void Chts::closeEvent(QCloseEvent* e) {

@@ -5,6 +5,7 @@
 // menu prints, sets up the page, saves and shows saved charts.
 #include "app/chart_selection.h"
 #include "app/chart_service.h"
+#include "app/chart_window_model.h"
 #include "chart/chart_tools.h"
 #include "chart/print_chart.h"
 #include "chart/swing.h"
@@ -19,6 +20,7 @@
 
 class QAction;
 class QComboBox;
+class QKeyEvent;
 class QLabel;
 class QPrinter;
 class QScrollBar;
@@ -30,37 +32,16 @@ namespace kori::gui {
 
 class ChartView;
 
-// What the mouse is doing.
-enum ToolMode : int {
-    kToolNone = 0,
-    kToolNewChart = 4,
-    kToolTrendline = 7,
-    kToolZoom = 10,
-    kToolAutoScroll = 14,
-    kToolFibRetracement = 22,
-    kToolFibTimeLines = 23,
-    kToolGann = 30,  // the Gann fan tool (a flip, not a mode of its own elsewhere)
-    kToolText = 31,  // text notes
-    kToolErase = 32, // delete a trendline with the right button
-    kToolDayCount = 33,
-};
-
 class Chts : public QWidget {
     Q_OBJECT
 public:
     Chts(app::Session& session, app::ChartState& state, QWidget* parent = nullptr);
     ~Chts() override;
 
-    // Seams for extra drawing: the overlay hook runs on every build; the oscillator painter
-    // draws the panel into Picture2 (`panel` is the panel's own area) and may add to the price
-    // chart (`price`, still open), as the classic MACD lines do. It answers whether the panel
-    // is wanted; when not (RMO on a weekly chart), the price chart is built again on its own.
-    using OverlayHook =
-        std::function<void(chart::Chart&, const chart::ChartRequest&, platform::Surface&)>;
-    using OscillatorPainter = std::function<bool(
-        chart::Chart&, const app::ChartJob&, platform::Surface& price, platform::Surface& panel)>;
-    void SetOverlayHook(OverlayHook hook) { m_overlayHook = std::move(hook); }
-    void SetOscillatorPainter(OscillatorPainter painter) { m_oscPainter = std::move(painter); }
+    // Seam for extra drawing on every build.
+    void SetOverlayHook(app::ChartWindowModel::OverlayHook hook) {
+        m_model.SetOverlayHook(std::move(hook));
+    }
 
     // The next-chart command: "fwd" +1, "rev" -1, "ref" 0 on the list in use.
     bool NextChart(int delta);
@@ -70,8 +51,10 @@ public:
     void SetPeriod(char period);
     // Steps the chart's end by a day, week or month ('A', 'W', 'M'), forward or back.
     void StepEnd(char unit, int direction);
-    void SetTool(int mode);
-    int toolMode() const { return m_tool; }
+    void SetTool(app::ChartTool tool);
+    // "new": leaves the chart for the chart selection.
+    void NewChart();
+    app::ChartTool tool() const { return m_model.tool(); }
     void SetCalendarTimeLines(bool calendar);
     // Swing lines on or off, by the method and value of the swing settings.
     void SetSwing(bool on);
@@ -79,7 +62,9 @@ public:
     // next-chart command steps on or "Single Chart" is chosen.
     bool ShowSplit(const app::SecondChart& lower);
     void EndSplit();
-    bool splitShown() const { return m_splitShown; }
+    bool splitShown() const { return m_model.splitShown(); }
+    // Whether the oscillator panel shows under the price chart (in the same picture).
+    bool panelShown() const { return m_model.panelShown(); }
 
     // The printer "Printer Setup" shapes, kept for the run; without one each print starts afresh.
     void SetPrinter(QPrinter* printer) { m_printer = printer; }
@@ -103,62 +88,49 @@ public:
     void MousePress(double x, double y, Qt::MouseButton button);
     void MouseRelease(double x, double y, Qt::MouseButton button);
 
-    chart::Chart& chart() { return *m_chart; }
-    const store::NameRecord& current() const { return m_name; }
+    chart::Chart& chart() { return m_model.chart(); }
+    const store::NameRecord& current() const { return m_model.current(); }
+    app::ChartWindowModel& model() { return m_model; }
     ChartView* picture1() const { return m_picture1; }
-    ChartView* picture2() const { return m_picture2; }
     ChartView* picture4() const { return m_picture4; }
-    const std::vector<chart::TrendEnds>& trendEnds() const { return m_trendEnds; }
+    const std::vector<chart::TrendEnds>& trendEnds() const { return m_model.trendEnds(); }
     // The texts of the status panes.
     std::vector<std::string> StatusPanes() const;
     QToolBar* toolBar() const { return m_toolbar; }
     // The action of a toolbar key ("fwd", "tline", ...), or nullptr.
     QAction* ToolKey(const char* key) const;
-    bool showingSavedChart() const { return m_showingSaved; }
+    bool showingSavedChart() const { return m_model.showingSaved(); }
+    void Wheel(int notches, bool ctrl);
 
 signals:
     // "new": back to the chart selection.
     void ChartSelectionRequested();
+    // The oscillator settings box is wanted (the panel was double-clicked).
+    void OscSettingsRequested();
 
 protected:
     void closeEvent(QCloseEvent* e) override;
+    void keyPressEvent(QKeyEvent* e) override;
 
 private:
     void BuildToolBar();
     void SetPanes(const std::vector<std::string>& texts);
-    void PaintOnPicture(const std::function<void(platform::Surface&)>& draw);
+    void WithPicture(const std::function<void(platform::Surface&)>& draw);
+    bool RebuildKeeping(bool keepToolLines);
     void DrawLegend();
     void EnsurePrinterColours();
     void LeaveChart();
     std::string Code() const;
     QSize AreaSize() const;
     void Zoom(double x, double y);
+    void Apply(const app::ChartEffects& fx);
+    void SyncToolKeys();
 
     app::Session& m_session;
     app::ChartState& m_state;
-    app::ChartWalk m_walk;
-    store::NameRecord m_name;
-    bool m_haveName = false;
-    std::unique_ptr<chart::Chart> m_chart;
-    chart::PrinterPage m_page;
+    app::ChartWindowModel m_model;
     std::optional<chart::PrintSettings> m_print;
     QPrinter* m_printer = nullptr;
-    std::vector<chart::TrendEnds> m_trendEnds;
-    bool m_trendChanged = false;
-    OverlayHook m_overlayHook;
-    OscillatorPainter m_oscPainter;
-
-    int m_tool = kToolNone;
-    int m_clickStage = 0;
-    double m_downX = 0, m_downY = 0;
-    bool m_leftDown = false;
-    double m_fibStart = 0;
-    double m_countFromX = 0;
-    int m_moving = -1; // index in m_trendEnds of a line being moved
-    double m_fixedX = 0, m_fixedY = 0;
-    bool m_calendarLines = false;
-    bool m_showingSaved = false;
-    bool m_splitShown = false; // the picture holds two charts: the mouse tools stay quiet
     std::string m_savedPath;
 
     QToolBar* m_toolbar;
@@ -168,7 +140,6 @@ private:
     QAction* m_singleChart = nullptr;
     chart::SwingSwitch m_swingSwitch;
     ChartView* m_picture1;
-    ChartView* m_picture2;
     ChartView* m_picture4;
     QScrollBar* m_koriScroll;
     QStatusBar* m_status;

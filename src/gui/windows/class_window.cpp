@@ -1,26 +1,50 @@
 #include "gui/windows/class_window.h"
 
+#include "gui/widgets/grid_view.h"
 #include "gui/widgets/settings_dialog.h"
 #include "gui/widgets/window_place.h"
 #include "gui/windows/gics_class.h"
 #include "gui/windows/ind_class.h"
 #include "platform/text.h"
 
-#include <QHeaderView>
+#include <QLabel>
 #include <QMenuBar>
 #include <QPrintDialog>
 #include <QPrinter>
-#include <QTableWidget>
-#include <QTextDocument>
-#include <QTimer>
 #include <QVBoxLayout>
 
 #include <algorithm>
 
 namespace kori::gui {
 
+namespace {
+
+// Column 1 holds the class code, formatted to its digits; the text columns take no commas,
+// which separate the fields of the file.
+app::GridModel::CellCheck ClassCellCheck(int digits) {
+    return [digits](int column, const std::string& text) -> app::CellVerdict {
+        if (column == 0) {
+            const auto formatted = store::CheckClassId(text, digits);
+            if (!formatted) return {false, text, "Id must be numeric"};
+            return {true, *formatted, {}};
+        }
+        if (text.find(',') != std::string::npos) return {false, text, "Commas cannot be used"};
+        return {true, text, {}};
+    };
+}
+
+std::vector<std::string> Headers(const QStringList& headers) {
+    std::vector<std::string> out;
+    for (const auto& h : headers)
+        out.push_back(h.toStdString());
+    return out;
+}
+
+} // namespace
+
 ClassWindow::ClassWindow(app::Session& session, const Kind& kind, bool pick, QWidget* parent)
-    : QDialog(parent), m_session(session), m_kind(kind), m_pick(pick) {
+    : QDialog(parent), m_session(session), m_kind(kind),
+      m_model(Headers(kind.headers), ClassCellCheck(kind.digits)), m_pick(pick) {
     setObjectName(QString::fromLatin1(kind.name));
     setWindowTitle(QString::fromLatin1(kind.title));
     KeepWindowPosition(this, session.services().settings, kind.name);
@@ -39,12 +63,8 @@ ClassWindow::ClassWindow(app::Session& session, const Kind& kind, bool pick, QWi
     item("&Display", "mnuDisplay", [this] { Display(); });
     if (kind.canPrint) item("&Print", "mnuPrint", [this] { Print(); });
 
-    m_grid = new QTableWidget(0, static_cast<int>(kind.headers.size()), this);
+    m_grid = new GridView(m_model, session.dialogs(), kind.msgTitle, this);
     m_grid->setObjectName(QStringLiteral("grdClass"));
-    m_grid->setHorizontalHeaderLabels(kind.headers);
-    m_grid->horizontalHeader()->setStretchLastSection(true);
-    m_grid->verticalHeader()->setDefaultSectionSize(22);
-    m_grid->setSelectionMode(QAbstractItemView::SingleSelection);
     for (int c = 1; c < m_grid->columnCount(); ++c)
         m_grid->setColumnWidth(c, 200);
     m_grid->setColumnWidth(0, 120);
@@ -52,138 +72,63 @@ ClassWindow::ClassWindow(app::Session& session, const Kind& kind, bool pick, QWi
         m_grid->setEditTriggers(QAbstractItemView::NoEditTriggers);
         m_grid->setSelectionBehavior(QAbstractItemView::SelectRows);
         connect(m_grid, &QTableWidget::cellDoubleClicked, this, [this](int row, int) {
-            const QTableWidgetItem* it = m_grid->item(row, 0);
-            const std::string code = it ? platform::Trim(S(it->text())) : std::string();
+            const std::string code = platform::Trim(m_model.cell(row, 0));
             if (code.empty()) return;
             m_picked = code;
             accept();
         });
     }
-    connect(m_grid, &QTableWidget::itemChanged, this, &ClassWindow::CellLeft);
+    m_status = new QLabel(this);
+    m_status->setObjectName(QStringLiteral("lblStatus"));
 
     auto* layout = new QVBoxLayout(this);
     layout->setMenuBar(m_menus);
     layout->addWidget(m_grid);
+    layout->addWidget(m_status);
     resize(kind.headers.size() > 2 ? 620 : 440, 420);
     Display();
 }
 
-void ClassWindow::SetRow(int row, const store::ClassRow& values) {
-    for (int c = 0; c < m_grid->columnCount(); ++c) {
-        const auto i = static_cast<std::size_t>(c);
-        std::string text = i < values.size() ? values[i] : std::string();
-        if (c == 0)
-            if (auto formatted = store::CheckClassId(text, m_kind.digits)) text = *formatted;
-        m_grid->setItem(row, c, new QTableWidgetItem(Q(text)));
-    }
+QTableWidget* ClassWindow::grid() const {
+    return m_grid;
 }
 
 void ClassWindow::Display() {
-    m_filling = true;
-    const auto rows = store::ReadClassFile(m_session.folders.SystemFolder, m_kind.fileName,
-                                           static_cast<std::size_t>(m_grid->columnCount()));
-    m_grid->setRowCount(static_cast<int>(rows.size()));
-    for (std::size_t r = 0; r < rows.size(); ++r)
-        SetRow(static_cast<int>(r), rows[r]);
-    m_filling = false;
-    m_changed = false;
-}
-
-bool ClassWindow::CheckCell(int row, int column, bool report) {
-    QTableWidgetItem* it = m_grid->item(row, column);
-    if (!it) return true;
-    const std::string text = S(it->text());
-    if (column == 0) {
-        const auto formatted = store::CheckClassId(text, m_kind.digits);
-        if (!formatted) {
-            if (report) m_session.dialogs().MsgBox("Id must be numeric", m_kind.msgTitle);
-            return false;
-        }
-        if (Q(*formatted) != it->text()) {
-            m_filling = true;
-            it->setText(Q(*formatted));
-            m_filling = false;
-        }
-        return true;
-    }
-    if (text.find(',') != std::string::npos) {
-        if (report) m_session.dialogs().MsgBox("Commas cannot be used", m_kind.msgTitle);
-        return false;
-    }
-    return true;
-}
-
-void ClassWindow::CellLeft(QTableWidgetItem* item) {
-    if (m_filling) return;
-    m_changed = true;
-    if (CheckCell(item->row(), item->column(), true)) return;
-    // The refused cell stays as typed and takes the focus back.
-    QTimer::singleShot(0, m_grid, [grid = m_grid, item] {
-        grid->setCurrentItem(item);
-        grid->editItem(item);
-    });
+    m_model.Load(store::ReadClassFile(m_session.folders.SystemFolder, m_kind.fileName,
+                                      static_cast<std::size_t>(m_model.columnCount())));
+    m_grid->Refresh();
+    // Said under the grid, so that a Display over an unchanged grid is seen to have run.
+    const int n = m_model.rowCount();
+    m_status->setText(QStringLiteral("%1 row%2 read from %3")
+                          .arg(n)
+                          .arg(n == 1 ? "" : "s")
+                          .arg(QString::fromLatin1(m_kind.fileName)));
 }
 
 void ClassWindow::AddRow() {
-    const int at = m_grid->currentRow() >= 0 ? m_grid->currentRow() + 1 : m_grid->rowCount();
-    m_filling = true;
-    m_grid->insertRow(at);
-    SetRow(at, {});
-    m_filling = false;
-    m_grid->setCurrentCell(at, 0);
+    m_grid->AddRow();
 }
 
 void ClassWindow::DeleteRow() {
-    const int row = m_grid->currentRow();
-    if (row < 0) return;
-    m_grid->removeRow(row);
-    m_changed = true;
-}
-
-std::optional<std::vector<store::ClassRow>> ClassWindow::Rows() {
-    std::vector<store::ClassRow> rows;
-    for (int r = 0; r < m_grid->rowCount(); ++r) {
-        store::ClassRow row;
-        for (int c = 0; c < m_grid->columnCount(); ++c) {
-            if (!CheckCell(r, c, true)) {
-                m_grid->setCurrentCell(r, c);
-                return std::nullopt;
-            }
-            const QTableWidgetItem* it = m_grid->item(r, c);
-            row.push_back(it ? platform::Trim(S(it->text())) : std::string());
-        }
-        rows.push_back(std::move(row));
-    }
-    return rows;
+    m_grid->DeleteCurrentRow();
 }
 
 void ClassWindow::SortList() {
-    const auto rows = Rows();
-    if (!rows) return;
-    auto sorted = *rows;
     // Codes are formatted to one width, so text order is number order.
-    std::stable_sort(sorted.begin(), sorted.end(), [](const auto& a, const auto& b) {
-        if (a[0].empty() != b[0].empty()) return b[0].empty();
-        return a[0] < b[0];
-    });
-    m_filling = true;
-    for (std::size_t r = 0; r < sorted.size(); ++r)
-        SetRow(static_cast<int>(r), sorted[r]);
-    m_filling = false;
-    if (sorted != *rows) m_changed = true;
+    m_grid->SortBy(0);
 }
 
 bool ClassWindow::SaveChanges() {
     // A pick only reads the file; a sort made to find a row there is not kept.
-    if (!m_changed || m_pick) return true;
-    const auto rows = Rows();
-    if (!rows) return false;
-    if (auto s = store::WriteClassFile(m_session.folders.SystemFolder, m_kind.fileName, *rows);
+    if (!m_model.changed() || m_pick) return true;
+    if (!m_grid->CheckAll()) return false;
+    if (auto s = store::WriteClassFile(m_session.folders.SystemFolder, m_kind.fileName,
+                                       m_model.TrimmedRows());
         !s) {
         m_session.dialogs().MsgBox(s.message(), m_kind.msgTitle);
         return false;
     }
-    m_changed = false;
+    m_model.MarkSaved();
     return true;
 }
 
@@ -193,24 +138,7 @@ void ClassWindow::reject() {
 }
 
 void ClassWindow::PrintTo(QPrinter& printer) const {
-    QString html = QStringLiteral("<h3>%1</h3><table border=\"1\" cellspacing=\"0\" "
-                                  "cellpadding=\"3\"><tr>")
-                       .arg(windowTitle().toHtmlEscaped());
-    for (const auto& h : m_kind.headers)
-        html += QStringLiteral("<th>%1</th>").arg(h.toHtmlEscaped());
-    html += QStringLiteral("</tr>");
-    for (int r = 0; r < m_grid->rowCount(); ++r) {
-        html += QStringLiteral("<tr>");
-        for (int c = 0; c < m_grid->columnCount(); ++c) {
-            const QTableWidgetItem* it = m_grid->item(r, c);
-            html += QStringLiteral("<td>%1</td>").arg(it ? it->text().toHtmlEscaped() : QString());
-        }
-        html += QStringLiteral("</tr>");
-    }
-    html += QStringLiteral("</table>");
-    QTextDocument doc;
-    doc.setHtml(html);
-    doc.print(&printer);
+    m_grid->PrintTo(printer, windowTitle());
 }
 
 void ClassWindow::Print() {

@@ -2,6 +2,7 @@
 // The grid both classification windows share: the rows of IndClass.dat or Gics.dat, checked
 // cell by cell as the user leaves them and written back when the window closes with changes.
 // In pick mode (chart selection) a double click on a row returns its code.
+#include "app/grid_model.h"
 #include "app/session.h"
 #include "store/classifications.h"
 
@@ -11,12 +12,14 @@
 #include <optional>
 #include <string>
 
+class QLabel;
 class QMenuBar;
 class QPrinter;
 class QTableWidget;
-class QTableWidgetItem;
 
 namespace kori::gui {
+
+class GridView;
 
 class ClassWindow : public QDialog {
     Q_OBJECT
@@ -31,9 +34,11 @@ public:
         bool canPrint;
     };
 
-    QTableWidget* grid() const { return m_grid; }
+    QTableWidget* grid() const;
+    // What "&Display" last did, under the grid.
+    QLabel* statusLine() const { return m_status; }
     QMenuBar* menus() const { return m_menus; }
-    bool changed() const { return m_changed; }
+    bool changed() const { return m_model.changed(); }
     const std::optional<std::string>& picked() const { return m_picked; }
 
     // ShowIndClass / ShowGicsClass: the file into the grid, codes formatted.
@@ -55,20 +60,15 @@ protected:
     ClassWindow(app::Session& session, const Kind& kind, bool pick, QWidget* parent);
 
 private:
-    void CellLeft(QTableWidgetItem* item);
-    // Rows as the file takes them, or nullopt (with the message) when a cell is refused.
-    std::optional<std::vector<store::ClassRow>> Rows();
-    bool CheckCell(int row, int column, bool report);
     void Print();
-    void SetRow(int row, const store::ClassRow& values);
 
     app::Session& m_session;
     Kind m_kind;
-    QTableWidget* m_grid;
+    app::GridModel m_model;
+    GridView* m_grid;
+    QLabel* m_status;
     QMenuBar* m_menus;
     bool m_pick;
-    bool m_changed = false;
-    bool m_filling = false;
     std::optional<std::string> m_picked;
 };
 

@@ -25,9 +25,14 @@ QString Q(const std::string& s) {
 }
 } // namespace
 
-MainWindow::MainWindow(app::Session& session, QWidget* parent)
-    : QMainWindow(parent), m_session(session), m_mdi(new QMdiArea(this)),
-      m_progress(new QtProgress(statusBar())) {
+MainWindow::MainWindow(app::Session& session, QtProgress* progress, QWidget* parent)
+    : QMainWindow(parent), m_session(session), m_mdi(new QMdiArea(this)), m_progress(progress) {
+    if (m_progress) {
+        setStatusBar(m_progress->statusBar());
+    } else {
+        m_ownProgress = std::make_unique<QtProgress>(statusBar());
+        m_progress = m_ownProgress.get();
+    }
     setObjectName(QStringLiteral("Main"));
     setCentralWidget(m_mdi);
     m_mdi->setViewMode(QMdiArea::SubWindowView);
@@ -187,12 +192,15 @@ void MainWindow::closeEvent(QCloseEvent* e) {
     e->accept();
 }
 
+QString MainWindow::AboutText() const {
+    return QStringLiteral("KORI Charting\nVersion %1\n\nEnd-of-day share-market charting.\n\n"
+                          "System folder: %2\nData folder: %3")
+        .arg(QStringLiteral(KORI_VERSION), Q(m_session.folders.SystemFolder),
+             Q(m_session.folders.DataFolder));
+}
+
 void MainWindow::ShowAbout() {
-    QMessageBox::about(
-        this, QStringLiteral("About KORI"),
-        QStringLiteral("KORI Charting 8\n\nEnd-of-day share-market charting.\n\n"
-                       "System folder: %1\nData folder: %2")
-            .arg(Q(m_session.folders.SystemFolder), Q(m_session.folders.DataFolder)));
+    QMessageBox::about(this, QStringLiteral("About KORI"), AboutText());
 }
 
 } // namespace kori::gui

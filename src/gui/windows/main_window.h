@@ -8,6 +8,7 @@
 
 #include <functional>
 #include <map>
+#include <memory>
 #include <string>
 
 class QMdiArea;
@@ -21,7 +22,11 @@ class QtProgress;
 class MainWindow : public QMainWindow {
     Q_OBJECT
 public:
-    explicit MainWindow(app::Session& session, QWidget* parent = nullptr);
+    // `progress`: the progress the session's walks report to, built before the session with a
+    // status bar of its own, which the main window takes over. Without one the window makes its
+    // own (tests that do not walk).
+    explicit MainWindow(app::Session& session, QtProgress* progress = nullptr,
+                        QWidget* parent = nullptr);
     ~MainWindow() override;
 
     QMdiArea* mdiArea() const { return m_mdi; }
@@ -50,6 +55,8 @@ public:
     bool Open(const std::string& opens);
 
     app::Session& session() { return m_session; }
+    // What "&About KORI" shows: the version of this build first.
+    QString AboutText() const;
     bool ending() const { return m_ending; }
     void SetHideDownloadProgram(bool hide) { m_hideDownloadProgram = hide; }
 
@@ -64,6 +71,7 @@ private:
 
     app::Session& m_session;
     QMdiArea* m_mdi;
+    std::unique_ptr<QtProgress> m_ownProgress;
     QtProgress* m_progress;
     std::vector<app::MenuItem> m_tops;
     std::map<std::string, std::function<void()>> m_actions; // by `opens`

@@ -18,7 +18,7 @@ signals:
     // A small window stored a value the chart on show depends on: build it again.
     void RebuildChart();
     // "SAVE" in the chart defaults: defaults and oscillator settings were written and read
-    // again. A chart on show is not redrawn for this.
+    // again; the chart on show is drawn again with them.
     void ChartDefaultsSaved();
     // OK in the oscillator settings: the oscillator is to be shown with its new settings.
     void ShowOscillator(const QString& oscName);

@@ -1,0 +1,68 @@
+#pragma once
+// The rows of an editing grid and what every such grid does with them: a cell checked as the
+// user leaves it, rows inserted and deleted, a sort by one column, a check of every cell before
+// the rows are written, and whether anything changed since they were read. The class windows
+// use it now; the editors, scan results and update lists that come are grids of the same kind.
+#include <functional>
+#include <optional>
+#include <string>
+#include <vector>
+
+namespace kori::app {
+
+// The answer of a cell check: the text to keep (the text itself, or a code formatted, say), or
+// a refusal with the message the user sees.
+struct CellVerdict {
+    bool Accepted = true;
+    std::string Text;
+    std::string Message;
+};
+
+struct CellRefusal {
+    int Row = 0, Column = 0;
+    std::string Message;
+};
+
+class GridModel {
+public:
+    using Row = std::vector<std::string>;
+    using CellCheck = std::function<CellVerdict(int column, const std::string& text)>;
+
+    explicit GridModel(std::vector<std::string> headers, CellCheck check = {});
+
+    const std::vector<std::string>& headers() const { return m_headers; }
+    int rowCount() const { return static_cast<int>(m_rows.size()); }
+    int columnCount() const { return static_cast<int>(m_headers.size()); }
+    const std::vector<Row>& rows() const { return m_rows; }
+    const std::string& cell(int row, int column) const;
+
+    // Rows as read from a file: cut or padded to the columns, each cell put in the form its
+    // check gives where it passes. Nothing counts as changed.
+    void Load(std::vector<Row> rows);
+    // A cell the user left: kept in the form the check gives, or kept as typed when refused
+    // (the verdict carries the message). Either way the grid has changed.
+    CellVerdict SetCell(int row, int column, std::string text);
+    // A blank row at `at` (the end when out of range); its index.
+    int InsertRow(int at);
+    bool DeleteRow(int row);
+    // Rows in text order of `column`, rows with that cell blank last, ties in their order.
+    // Every cell must pass first; otherwise the first refusal and no sort.
+    std::optional<CellRefusal> SortBy(int column);
+    // The first cell, row by row, that its check refuses.
+    std::optional<CellRefusal> FirstRefusal() const;
+    // The rows with every cell trimmed, as a file takes them.
+    std::vector<Row> TrimmedRows() const;
+
+    bool changed() const { return m_changed; }
+    void MarkSaved() { m_changed = false; }
+
+private:
+    CellVerdict Check(int column, const std::string& text) const;
+
+    std::vector<std::string> m_headers;
+    CellCheck m_check;
+    std::vector<Row> m_rows;
+    bool m_changed = false;
+};
+
+} // namespace kori::app
