@@ -60,7 +60,7 @@ public:
         return std::string(m_bars[static_cast<std::size_t>(rec - 1)].DateText());
     }
     std::string NoteText(std::int16_t) override { return {}; }
-    platform::Status Load(const chart::LoadRequest& req, store::ChartSeries& s) override {
+    platform::Status Load(const store::SeriesRequest& req, store::ChartSeries& s) override {
         s.ChartBars.assign(m_bars.begin() + (req.FirstRecord - 1), m_bars.begin() + req.LastRecord);
         s.LastBar = static_cast<std::int16_t>(req.LastRecord - req.FirstRecord);
         store::LoadResults r;

@@ -26,7 +26,10 @@ bool ChartWalk::Open(chart::ChartRequest& request, bool quiet) {
     m_names.clear();
     m_list.clear();
     store::NameFile nf(store::NameFile::PathIn(m_session.folders.DataFolder));
-    if (!platform::FileExists(nf.path()) || !nf.ReadAll(m_names)) {
+    m_status = platform::FileExists(nf.path())
+                   ? nf.ReadAll(m_names)
+                   : platform::Status::Error("The name file cannot be read");
+    if (!m_status) {
         m_names.clear();
         request.ListMode = 1;
         request.ListName.clear();
@@ -40,15 +43,19 @@ bool ChartWalk::Open(chart::ChartRequest& request, bool quiet) {
                                      ? ListDisplayName(m_session, request.ListMode)
                                      : request.ListName;
         const auto path = store::ListPath(m_session.folders.DataFolder, letter);
-        if (platform::FileHasData(path) && store::ReadList(path, m_list) && !m_list.empty()) {
+        const auto listRead =
+            platform::FileHasData(path) ? store::ReadList(path, m_list) : platform::Status::Ok();
+        if (listRead && !m_list.empty()) {
             m_fullList = false;
             m_caption = " " + name;
             request.ListName = name;
             return true;
         }
         m_list.clear();
+        // A list over the record limit says so; an empty one gets the empty-list message.
         if (!quiet)
-            m_session.dialogs().MsgBox(store::EmptyListMessage(name),
+            m_session.dialogs().MsgBox(listRead ? store::EmptyListMessage(name)
+                                                : listRead.message(),
                                        store::EmptyListTitle(m_session.folders.DataFolder));
     }
     request.ListMode = 1;

@@ -23,8 +23,10 @@ public:
 
     // Opens the list of `request.ListMode`. An empty or missing chart list shows the empty-list
     // message and falls back to the full list (ListMode 1, empty ListName). False when the
-    // name file cannot be read at all.
+    // name file cannot be read at all; `status()` then says why (the record limit of the format
+    // included), for the caller to show.
     bool Open(chart::ChartRequest& request, bool quiet = false);
+    const platform::Status& status() const { return m_status; }
     int Count() const;
     int NameCount() const { return static_cast<int>(m_names.size()); }
     std::string Caption() const { return m_caption; }
@@ -43,6 +45,7 @@ private:
     std::vector<store::ChartListEntry> m_list; // empty in the full list
     bool m_fullList = true;
     std::string m_caption = kFullListCaption;
+    platform::Status m_status;
 };
 
 // Record types 1 to 3 are close-only: they chart as lines whatever the style asked.

@@ -1,9 +1,11 @@
 #include "app/chart_selection.h"
 
+#include "osc/osc_identifiers.h"
 #include "platform/date_text.h"
 #include "platform/files.h"
 #include "platform/text.h"
 #include "store/classifications.h"
+#include "store/name_file.h"
 #include "store/name_record.h"
 
 #include <algorithm>
@@ -13,28 +15,13 @@
 namespace kori::app {
 
 const std::vector<OscChoice>& OscChoices() {
-    static const std::vector<OscChoice> rows = {
-        {"(None)", "", false},
-        {"Average True Range", "ATR", false},
-        {"Directional Movement", "DM", false},
-        {"Coppock", "COP", false},
-        {"ElderRay", "ERY", false},
-        {"FX", "FX", false},
-        {"Jones Holy Grail", "JHG", false},
-        {"MACD", "MACD", false},
-        {"Momentum", "MOM", false},
-        {"On-Balance Volume", "OBV", false},
-        {"ROC", "ROC", false},
-        {"ROC & FX", "R/F", false},
-        {"RMO", "RMO", false},
-        {"RMX", "RMX", false},
-        {"RSI", "RSI", false},
-        {"Stochastic", "STO", false},
-        {"Stochastic(slow)", "STO", true},
-        {"Volatility", "VTY", false},
-        {"Williams %R", "WMS", false},
-        {"Parabolic", "PARA", false},
-    };
+    static const std::vector<OscChoice> rows = [] {
+        std::vector<OscChoice> r{{"(None)", "", false}};
+        for (const osc::OscChoice& c : osc::ChooserOrder())
+            r.push_back(
+                {std::string(osc::ChooserCaption(c)), std::string(c.OscName), c.SlowStochastic});
+        return r;
+    }();
     return rows;
 }
 
@@ -131,7 +118,10 @@ bool ChartSelection::Load() {
     m_form.Spacing = r.BarSpacing;
     ShowAverages();
     if (r.ListMode >= 12) r.ListMode = 1;
-    m_walk.Open(r);
+    // A name file that exists but cannot be used says why (a missing one is the empty library).
+    if (!m_walk.Open(r) &&
+        platform::FileExists(store::NameFile::PathIn(m_session.folders.DataFolder)))
+        m_session.dialogs().MsgBox(m_walk.status().message(), "Chart Selection");
     m_form.ListCaption = m_walk.Caption();
     m_state.SettingsLoaded = true;
     m_form.Count = m_walk.Count();

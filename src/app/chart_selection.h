@@ -30,9 +30,10 @@ struct ChartState {
     SplitChart Split;
 };
 
+// A row of the oscillator chooser; the rows come from the oscillator registry.
 struct OscChoice {
-    const char* Caption;
-    const char* Code; // empty for "(None)"
+    std::string Caption;
+    std::string Code; // empty for "(None)"
     bool Slow;
 };
 // The rows of the oscillator chooser, "(None)" first.

@@ -147,7 +147,7 @@ bool SaveDataPaths(Session& session, const ChartDataPaths& edited) {
         const std::string question = "Directory " + p + " does not exist. Create this directory ?";
         if (session.dialogs().MsgBox(question, "Create Directory", Buttons::YesNo,
                                      Icon::Question) == Answer::Yes)
-            (void)platform::CreateFolder(p);
+            (void)platform::CreateFolderPath(p); // the user asked for this one
     }
     const std::string& system = session.folders.SystemFolder;
     (void)WriteChartPathsFile(system + "ChtPaths.lst", paths);

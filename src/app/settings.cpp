@@ -128,6 +128,7 @@ SubListSettings ReadSubListSettings(const IniFile& ini) {
 }
 
 void WriteFontSettings(IniFile& ini, const FontSettings& fonts, std::string_view section) {
+    platform::IniFile::Batch once(ini); // one write of the file for the whole save
     (void)ini.Write(section, "CFont", fonts.CFont);
     (void)ini.Write(section, "CFontSize", fonts.CFontSize);
     (void)ini.Write(section, "SFont", fonts.SFont);
@@ -135,6 +136,7 @@ void WriteFontSettings(IniFile& ini, const FontSettings& fonts, std::string_view
 }
 
 void WritePageSettings(IniFile& ini, const PageSettings& page) {
+    platform::IniFile::Batch once(ini); // one write of the file for the whole save
     WriteNumber(ini, "ChtPage", "PPTop", page.PPTop);
     WriteNumber(ini, "ChtPage", "PPLft", page.PPLft);
     (void)ini.Write("ChtPage", "PPBot", platform::StrSingle(page.PPBot));
@@ -147,11 +149,13 @@ void WriteZoom(IniFile& ini, std::int16_t zoom) {
 }
 
 void WriteAdjustmentSettings(IniFile& ini, const AdjustmentSettings& adjustments) {
+    platform::IniFile::Batch once(ini); // one write of the file for the whole save
     WriteNumber(ini, "Adjustments", "Divs", adjustments.Divs);
     (void)ini.Write("Adjustments", "NoShortNames", BoolText(adjustments.NoShortNames));
 }
 
 void WriteSubListSettings(IniFile& ini, const SubListSettings& subLists) {
+    platform::IniFile::Batch once(ini); // one write of the file for the whole save
     WriteNumber(ini, "SubLists", "Last", subLists.Last);
     WriteNumber(ini, "SubLists", "Columns", subLists.Columns);
 }

@@ -3,6 +3,7 @@
 #include "platform/rounding.h"
 #include "platform/text.h"
 
+#include <algorithm>
 #include <cmath>
 #include <limits>
 #include <vector>
@@ -105,15 +106,38 @@ MainWindowPlace LoadMainWindowPlace(const platform::SettingsStore& store, Screen
     MainWindowPlace place;
     // The design size stands for any screen; a stored one follows the screen.
     const ScreenSize writtenOn = StoredScreen(store, kMainKey).value_or(ScreenSize{});
-    if (const auto w = StoredSize(store, "Width"))
+    if (const auto w = StoredSize(store, "Width")) {
         place.width = ScaleWindowPosition({0, 0, *w, 0}, writtenOn, screen).width;
-    if (const auto h = StoredSize(store, "Height"))
+        place.sizeStored = true;
+    }
+    if (const auto h = StoredSize(store, "Height")) {
         place.height = ScaleWindowPosition({0, 0, 0, *h}, writtenOn, screen).height;
+        place.sizeStored = true;
+    }
     if (const auto p = LoadWindowPosition(store, kMainKey, screen)) {
         place.left = p->left;
         place.top = p->top;
     }
     return place;
+}
+
+PixelSize FirstStartSize(PixelSize design, PixelSize available) {
+    const auto fit = [](int want, int least, int room) {
+        const int size = std::max(want, least);
+        return room > 0 ? std::min(size, room) : size;
+    };
+    return {fit(kFirstStartSize.width, design.width, available.width),
+            fit(kFirstStartSize.height, design.height, available.height)};
+}
+
+PixelSize GrowToFit(PixelSize window, PixelSize area, PixelSize child, PixelSize available) {
+    const auto grow = [](int size, int room, int need, int limit) {
+        if (need <= room) return size;
+        const int wanted = size + (need - room);
+        return limit > 0 ? std::max(size, std::min(wanted, limit)) : wanted;
+    };
+    return {grow(window.width, area.width, child.width, available.width),
+            grow(window.height, area.height, child.height, available.height)};
 }
 
 void SaveMainWindowPlace(platform::SettingsStore& store, const WindowPosition& position,

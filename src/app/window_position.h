@@ -60,7 +60,22 @@ struct MainWindowPlace {
     std::int32_t width = kMainDesignWidth;
     std::int32_t height = kMainDesignHeight;
     std::optional<std::int32_t> left, top; // design place when absent
+    bool sizeStored = false;               // false on a first start: the design size stands
 };
+
+// Sizes in pixels for the first start, when no size is kept.
+struct PixelSize {
+    int width = 0, height = 0;
+};
+// The first start opens the main window large enough for its child windows (the chart
+// selection whole, the chart window's toolbar) and never larger than the screen's free area:
+// the design size is a size, not a limit that clips them.
+inline constexpr PixelSize kFirstStartSize{1100, 780};
+PixelSize FirstStartSize(PixelSize design, PixelSize available);
+// How much a main window of size `window` must grow for a child of `child` (its frame,
+// including its place in the work area) to fit in a work area of size `area`, held within
+// `available`: the new size. The same size when the child fits.
+PixelSize GrowToFit(PixelSize window, PixelSize area, PixelSize child, PixelSize available);
 MainWindowPlace LoadMainWindowPlace(const platform::SettingsStore& store, ScreenSize screen);
 // On close: `Height`, `Width` and `Main`, with the screen.
 void SaveMainWindowPlace(platform::SettingsStore& store, const WindowPosition& position,

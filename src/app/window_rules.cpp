@@ -105,6 +105,7 @@ SwingSettings ReadSwingSettings(const platform::IniFile& ini) {
 }
 
 void WriteSwingSettings(platform::IniFile& ini, const SwingSettings& s) {
+    platform::IniFile::Batch once(ini); // one write of the file for the whole save
     (void)ini.Write("Charts", "SwingMethod", chart::SwingMethodName(s.SwingMethod));
     (void)ini.Write("Charts", "SwingValue", platform::FloatText(s.SwingValue));
 }

@@ -73,8 +73,8 @@ platform::Status LoadWindow(Chart& c, const ChartBuild& b, PriceSource& source, 
         c.AreaWidth = win.AreaWidth;
         g.PlotRight = PlotRightFor(c.AreaWidth);
     }
-    const LoadRequest load{c.FirstRecord, c.LastRecord, r.ChartPeriod, r.ShowVolume,
-                           b.Name.RecordType};
+    const store::SeriesRequest load{c.FirstRecord, c.LastRecord, r.ChartPeriod, r.ShowVolume,
+                                    b.Name.RecordType};
     return source.Load(load, c.Series);
 }
 

@@ -136,6 +136,7 @@ ChartDefaults LoadChartDefaults(const platform::IniFile& ini) {
 }
 
 void SaveChartDefaults(platform::IniFile& ini, const ChartDefaults& d) {
+    platform::IniFile::Batch once(ini); // one write of the file for the whole save
     ini.Write(kCharts, "Av1D", Number(d.MAPeriod1Daily));
     ini.Write(kCharts, "Av2D", Number(d.MAPeriod2Daily));
     ini.Write(kCharts, "Av1W", Number(d.MAPeriod1Long));
@@ -194,6 +195,7 @@ void LoadChartRequestSettings(const platform::IniFile& ini, ChartRequest& r) {
 }
 
 void SaveChartRequestSettings(platform::IniFile& ini, const ChartRequest& r) {
+    platform::IniFile::Batch once(ini); // one write of the file for the whole save
     ini.Write(kCharts, "Type", std::string(1, r.ChartStyle));
     ini.Write(kCharts, "Period", std::string(1, r.ChartPeriod));
     ini.Write(kCharts, "Spacing", Number(r.BarSpacing));

@@ -1,6 +1,14 @@
 #include "chart/draw_context.h"
 
+#include <algorithm>
+
 namespace kori::chart {
+
+PlotRect PlotFrame(const Chart& c) {
+    return {c.PlotLeft - 1.0, static_cast<double>(std::min(c.PlotTop, c.PlotBottom)),
+            static_cast<double>(c.PlotRight),
+            static_cast<double>(std::max(c.PlotTop, c.PlotBottom))};
+}
 
 platform::Colour ChartPainter::Col(int entry) const {
     return in.Palette[static_cast<std::size_t>(entry)];
@@ -25,6 +33,23 @@ void ChartPainter::Dotted(double x1, double y1, double x2, double y2, int entry)
 void ChartPainter::Box(double x1, double y1, double x2, double y2, int entry) {
     screen.Box(x1, y1, x2, y2, Col(entry));
     stream.Shape('B', x1, y1, x2, y2, Col(entry));
+}
+
+void ChartPainter::PlotLine(char letter, double x1, double y1, double x2, double y2, int entry) {
+    PlotLine(letter, x1, y1, x2, y2, Col(entry));
+}
+
+void ChartPainter::PlotLine(char letter, double x1, double y1, double x2, double y2,
+                            platform::Colour colour) {
+    const auto part = ClipToFrame(PlotFrame(chart), x1, y1, x2, y2);
+    if (!part) return;
+    screen.Line(part->X1, part->Y1, part->X2, part->Y2, colour);
+    stream.Shape(letter, part->X1, part->Y1, part->X2, part->Y2, colour);
+}
+
+bool ChartPainter::InPlot(double x, double y) const {
+    const PlotRect f = PlotFrame(chart);
+    return x >= f.Left && x <= f.Right && y >= f.Top && y <= f.Bottom;
 }
 
 TextFont ChartPainter::Font1(bool bold) const {

@@ -6,6 +6,7 @@
 #include "chart/chart.h"
 #include "chart/chart_defaults.h"
 #include "chart/chart_request.h"
+#include "chart/geometry.h"
 #include "platform/palette.h"
 #include "platform/surface.h"
 
@@ -42,6 +43,9 @@ inline constexpr int StopLine = 10, StopBroken = 11, PreviousStopBroken = 13, Fr
                      OpenCloseReversal = 32, PivotPoint = 33, YearLine = 34, Grid = 35;
 }
 
+// The price panel's frame as the frame box draws it, from PlotLeft - 1 to PlotRight.
+PlotRect PlotFrame(const Chart& c);
+
 class ChartPainter {
 public:
     ChartPainter(Chart& c, const DrawInputs& inputs, platform::Surface& surface)
@@ -55,6 +59,11 @@ public:
     void DottedScreen(double x1, double y1, double x2, double y2, int entry);
     void Dotted(double x1, double y1, double x2, double y2, int entry);
     void Box(double x1, double y1, double x2, double y2, int entry); // outline, "B"
+    // A line of an overlay: the part inside the price panel's frame is drawn and streamed,
+    // the rest of it (a band beyond the scale, say) is not.
+    void PlotLine(char letter, double x1, double y1, double x2, double y2, int entry);
+    void PlotLine(char letter, double x1, double y1, double x2, double y2, platform::Colour colour);
+    bool InPlot(double x, double y) const;
 
     TextFont Font1(bool bold) const;
     TextFont Font1() const { return Font1(in.Fonts.Bold1); }

@@ -48,6 +48,9 @@ void DateAxis::Tick(double x, bool yearChanged, std::string_view date, int month
         label = std::string(1, "JFMAMJJASOND"[month - 1]);
     }
     if (label.empty()) return;
+    constexpr double kGap = 2;
+    if (x < m_labelEnd + kGap) return;
+    m_labelEnd = x + m_p.Width(label, m_p.Font1());
     m_p.ScreenText(x, c.VolBottom + 2, label, pal::Labels, m_p.Font1());
     m_p.StreamT(x, c.VolBottom + 2, label, pal::Labels);
 }

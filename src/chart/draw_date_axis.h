@@ -1,6 +1,8 @@
 #pragma once
 // The date axis under the chart (`DrawDateTick`): ticks every fourth 8-unit column at most,
-// month letters on daily charts, two-digit years and, on daily charts, year lines.
+// month letters on daily charts, two-digit years and, on daily charts, year lines. A label
+// that would print over the label before it is left out (its tick stays): a year forces a tick
+// however close the last one, and a point-and-figure column can hold many months.
 #include "chart/draw_context.h"
 
 #include <string>
@@ -22,6 +24,7 @@ private:
     long m_lastCol8 = 0;
     int m_lastMonth = 0;
     std::string m_lastYear;
+    double m_labelEnd = -1e9; // right end of the last label printed
 };
 
 } // namespace kori::chart

@@ -3,6 +3,7 @@
 #include "platform/number_format.h"
 #include "platform/text.h"
 
+#include <algorithm>
 #include <cmath>
 
 namespace kori::chart {
@@ -52,8 +53,7 @@ void DrawVolumeScale(ChartPainter& p) {
         const double y = c.VolBottom - n * step;
         if (n > 0) p.Dotted(c.PlotRight, y, c.PlotRight + 2, y, pal::Notes);
         if (!c.Volumes.ready()) continue;
-        const std::string label =
-            platform::Format(c.Volumes.YToVolume(y), "0", platform::ZeroSign::Dropped);
+        const std::string label = VolumeLabel(c.Volumes.YToVolume(y));
         const double x = c.PlotRight + 30 - p.Width(label, f2);
         p.ScreenText(x, y - 4, label, pal::Labels, f2);
         p.stream.Text('S', f2.Size, x, y - 4, label, p.Col(pal::Labels));
@@ -114,6 +114,15 @@ void DrawVerticalGrid(ChartPainter& p) {
 
 } // namespace
 
+std::string VolumeLabel(double volume) {
+    const double v = std::max(0.0, volume);
+    if (v < 10000) return platform::Format(v, "0", platform::ZeroSign::Dropped);
+    if (v < 1e6) return platform::Format(v / 1e3, "0", platform::ZeroSign::Dropped) + "K";
+    if (v < 1e7) return platform::Format(v / 1e6, "0.0", platform::ZeroSign::Dropped) + "M";
+    if (v < 1e9) return platform::Format(v / 1e6, "0", platform::ZeroSign::Dropped) + "M";
+    return platform::Format(v / 1e9, "0.0", platform::ZeroSign::Dropped) + "G";
+}
+
 std::string HeadingLine(const ChartRequest& r, const ChartName& name, bool logarithmic,
                         bool lineChart) {
     std::string s = PeriodWord(r.ChartPeriod);
@@ -153,7 +162,13 @@ void DrawHeading(ChartPainter& p) {
     DrawTitle(p);
     const Chart& c = p.chart;
     const std::string line = HeadingLine(p.in.Request, p.in.Name, c.Logarithmic, c.Style == 'L');
-    const double x = c.PlotLeft + 2, y = c.TitleTop - 18;
+    double x = c.PlotLeft + 2, y = c.TitleTop - 18;
+    if (y < 0) {
+        // The upper half of a split has no room above its plot: the line follows the code.
+        const TextFont f = p.Font1();
+        x = 4.0 * c.PlotLeft + p.Width(platform::Trim(p.in.Name.Code) + "    ", {1, 9.75, f.Bold});
+        y = c.TitleTop + 2;
+    }
     p.ScreenText(x, y, line, pal::Heading, p.Font1(true));
     p.StreamT(x, y, line, pal::Heading);
 }

@@ -46,10 +46,10 @@ void DrawTrailingLabels(ChartPainter& p) {
     const double w = p.Width(kChartStamp, stamp);
     p.ScreenText(c.PlotRight - 30 - w, c.TitleTop - 10, kChartStamp, pal::Labels, stamp);
     if (p.in.PrintBold)
-        p.stream.Text('Z', p.in.Fonts.Size1, c.PlotRight - 50 - w, c.TitleTop - 20, kChartStamp,
-                      p.Col(pal::Labels));
+        p.stream.Text('Z', p.in.Fonts.Size1, c.PlotRight - 50 - w, c.TitleTop - 20,
+                      kChartStampInStream, p.Col(pal::Labels));
     else
-        p.stream.Text('Z', 7, c.PlotRight - 30 - w, c.TitleTop - 10, kChartStamp,
+        p.stream.Text('Z', 7, c.PlotRight - 30 - w, c.TitleTop - 10, kChartStampInStream,
                       p.Col(pal::Labels));
 }
 

@@ -37,15 +37,14 @@ std::string FilePriceSource::NoteText(std::int16_t record) {
     return p ? std::string(p + 32, 14) : std::string();
 }
 
-platform::Status FilePriceSource::Load(const LoadRequest& r, store::ChartSeries& series) {
-    store::SeriesRequest q{r.FirstRecord, r.LastRecord, r.ChartPeriod, r.WantVolume, r.RecordType};
+platform::Status FilePriceSource::Load(const store::SeriesRequest& r, store::ChartSeries& series) {
     const char* first = Record(r.FirstRecord);
     if (!first || !Record(r.LastRecord) || r.LastRecord < r.FirstRecord)
         return platform::Status::Error("Records " + std::to_string(r.FirstRecord) + " to " +
                                        std::to_string(r.LastRecord) + " are not in " + FileName());
     const std::size_t size =
         static_cast<std::size_t>(r.LastRecord - r.FirstRecord + 1) * store::PriceRecord::kSize;
-    return store::LoadChartSeriesFromBytes(std::string_view(first, size), q, FileName(), series);
+    return store::LoadChartSeriesFromBytes(std::string_view(first, size), r, FileName(), series);
 }
 
 } // namespace kori::chart

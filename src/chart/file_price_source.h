@@ -20,7 +20,7 @@ public:
     std::int16_t RecordCount() override { return m_count; }
     std::string DateOf(std::int16_t record) override;
     std::string NoteText(std::int16_t record) override;
-    platform::Status Load(const LoadRequest& request, store::ChartSeries& series) override;
+    platform::Status Load(const store::SeriesRequest& request, store::ChartSeries& series) override;
 
 private:
     const char* Record(std::int16_t record) const;

@@ -80,6 +80,39 @@ Panels LayOutPanels(const PlotGeometry& g, bool showVolume, bool upsideDown) {
     return p;
 }
 
+std::optional<ClippedLine> ClipToFrame(const PlotRect& f, double x1, double y1, double x2,
+                                       double y2) {
+    // Liang-Barsky: the line as p(t) = start + t * (end - start), t from 0 to 1, cut by the
+    // four edges in turn.
+    const double dx = x2 - x1, dy = y2 - y1;
+    double t0 = 0, t1 = 1;
+    const double p[4] = {-dx, dx, -dy, dy};
+    const double q[4] = {x1 - f.Left, f.Right - x1, y1 - f.Top, f.Bottom - y1};
+    for (int i = 0; i < 4; ++i) {
+        if (p[i] == 0) {
+            if (q[i] < 0) return std::nullopt; // parallel to this edge and outside it
+            continue;
+        }
+        const double t = q[i] / p[i];
+        if (p[i] < 0)
+            t0 = std::max(t0, t);
+        else
+            t1 = std::min(t1, t);
+        if (t0 > t1) return std::nullopt;
+    }
+    // Whole ends stay exactly as given; cut ends fall on the edge.
+    ClippedLine s{x1, y1, x2, y2};
+    if (t0 > 0) {
+        s.X1 = x1 + t0 * dx;
+        s.Y1 = y1 + t0 * dy;
+    }
+    if (t1 < 1) {
+        s.X2 = x1 + t1 * dx;
+        s.Y2 = y1 + t1 * dy;
+    }
+    return s;
+}
+
 RecordWindow ComputeRecordWindow(const WindowInputs& in,
                                  const std::function<std::string(std::int16_t)>& dateOf) {
     RecordWindow w;

@@ -4,6 +4,7 @@
 
 #include <cstdint>
 #include <functional>
+#include <optional>
 #include <string>
 
 namespace kori::chart {
@@ -53,5 +54,16 @@ RecordWindow ComputeRecordWindow(const WindowInputs& in,
 
 // PlotRight for an area width: 99% of it less the room for the price labels.
 std::int16_t PlotRightFor(double width);
+
+// A rectangle in chart units, Top above Bottom on the screen whatever the chart's way up.
+struct PlotRect {
+    double Left = 0, Top = 0, Right = 0, Bottom = 0;
+};
+struct ClippedLine {
+    double X1 = 0, Y1 = 0, X2 = 0, Y2 = 0;
+};
+// The part of a line inside the frame (edges included); nullopt when none of it is.
+std::optional<ClippedLine> ClipToFrame(const PlotRect& f, double x1, double y1, double x2,
+                                       double y2);
 
 } // namespace kori::chart

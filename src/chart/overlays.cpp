@@ -41,7 +41,7 @@ struct Polyline {
     double lastX = 0, lastY = 0;
 
     void To(double x, double y) {
-        if (started) p.Line(letter, lastX, lastY, x, y, entry);
+        if (started) p.PlotLine(letter, lastX, lastY, x, y, entry);
         started = true;
         lastX = x;
         lastY = y;
@@ -117,10 +117,8 @@ template <typename Ends> void DrawBands(ChartPainter& p, int period, bool dotted
             started = true;
             lastX = x - 1;
         } else {
-            p.screen.Line(lastX, lastUp, x, up, col);
-            p.stream.Shape('L', lastX, lastUp, x, up, col);
-            p.screen.Line(lastX, lastDown, x, down, col);
-            p.stream.Shape('L', lastX, lastDown, x, down, col);
+            p.PlotLine('L', lastX, lastUp, x, up, col);
+            p.PlotLine('L', lastX, lastDown, x, down, col);
             lastX = x;
         }
         lastUp = up;

@@ -129,6 +129,10 @@ std::vector<ParabolicPoint> ComputeParabolic(const std::vector<ParabolicBar>& ba
     return out;
 }
 
+double ParabolicTextY(const ChartRequest& r, const Chart& c) {
+    return r.SplitMode && r.SplitHalf == 2 ? c.TitleTop + 2.0 : 2.0;
+}
+
 std::string ParabolicStopText(double stop) {
     return platform::Format(stop, stop < 0.2 ? "0.000" : "0.00", platform::ZeroSign::Dropped);
 }
@@ -155,6 +159,7 @@ void DrawParabolic(ChartPainter& p, bool onAverage) {
         if (!onAverage && pt.Stop <= 0) continue;
         const double x = c.PlotLeft + static_cast<double>(pt.Bar) * c.BarSpacing;
         const double y = onAverage ? ToY16(turn - pt.Stop, 0) : c.PriceToY(pt.Stop);
+        if (!p.InPlot(x, y)) continue; // a stop beyond the scale
         const platform::Colour col =
             p.Col(pt.Direction == 'U' ? pal::ParabolicUp : pal::ParabolicDown);
         p.screen.Point(x, y, col);
@@ -166,11 +171,13 @@ void DrawParabolic(ChartPainter& p, bool onAverage) {
     if (end.Stop <= 0) return;
     const std::string text = "Parabolic last stop : " + ParabolicStopText(end.Stop);
     const int entry = end.Direction == 'U' ? pal::ParabolicTextUp : pal::ParabolicTextDown;
-    const double y = c.PriceToY(end.Stop);
     TextFont f = p.Font1(false);
     f.Size = 8.25;
-    // Right of the plot; on a narrow margin it ends at the area's edge.
-    const double x = std::min(c.PlotRight + 2.0, c.AreaWidth - p.Width(text, f) - 2);
+    // The margin right of the plot holds the price labels and is far narrower than the text:
+    // at the stop's y it would print over them and the last bars. It stands right-aligned to
+    // the plot in the top row, beside the trailing labels, where nothing else prints.
+    const double x = c.PlotRight - p.Width(text, f);
+    const double y = ParabolicTextY(p.in.Request, c);
     p.ScreenText(x, y, text, entry, f);
     p.stream.Text('T', 8.25, x, y, text, p.Col(entry));
 }

@@ -1,6 +1,7 @@
 #pragma once
 // The parabolic stop over the bars ("PARA"), or over the close line ("PARAV"): a dot a bar in
-// the colour of the direction, and on "PARA" the last stop written right of the plot.
+// the colour of the direction (none beyond the plot's frame), and on "PARA" the last stop
+// written in the top row, right-aligned to the plot.
 #include "chart/draw_context.h"
 
 #include <optional>
@@ -28,6 +29,9 @@ struct ParabolicPoint {
 std::vector<ParabolicPoint> ComputeParabolic(const std::vector<ParabolicBar>& bars);
 
 void DrawParabolic(ChartPainter& p, bool onAverage);
+
+// The y of the last stop's text: the row of the trailing labels.
+double ParabolicTextY(const ChartRequest& r, const Chart& c);
 
 // "0.000" below 0.2, "0.00" otherwise.
 std::string ParabolicStopText(double stop);

@@ -3,19 +3,12 @@
 // date), the load of a window into chart bars, and the text of a note record.
 #include "platform/status.h"
 #include "store/chart_bars.h"
+#include "store/load_chart_series.h"
 
 #include <cstdint>
 #include <string>
 
 namespace kori::chart {
-
-struct LoadRequest {
-    std::int16_t FirstRecord = 1;
-    std::int16_t LastRecord = 0;
-    char ChartPeriod = 'A';
-    bool WantVolume = true;
-    std::int16_t RecordType = 4;
-};
 
 class PriceSource {
 public:
@@ -26,7 +19,8 @@ public:
     virtual std::string DateOf(std::int16_t record) = 0;
     // The 14-character adjustment text of a record that carries a note.
     virtual std::string NoteText(std::int16_t record) = 0;
-    virtual platform::Status Load(const LoadRequest& request, store::ChartSeries& series) = 0;
+    virtual platform::Status Load(const store::SeriesRequest& request,
+                                  store::ChartSeries& series) = 0;
 };
 
 } // namespace kori::chart

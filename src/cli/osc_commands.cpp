@@ -133,15 +133,12 @@ void RunIndicator(CliContext& ctx, const IndicatorOptions& o) {
 
     const auto path = store::PriceFile::PathFor(session.folders.DataFolder, rec.Code);
     store::PriceFile pf(path);
-    if (!platform::FileExists(path) || !pf.Open() || pf.Count() < 1)
-        throw CliError{"No Data for " + path.filename().string()};
+    if (auto st = pf.OpenWithData(); !st) throw CliError{st.message()};
     store::SeriesRequest q;
-    q.FirstRecord = static_cast<std::int16_t>(o.first);
-    q.LastRecord = static_cast<std::int16_t>(o.last > 0 ? o.last : pf.Count());
-    if (o.first < 1 || q.LastRecord > pf.Count() || q.LastRecord < q.FirstRecord)
-        throw CliError{"Records " + std::to_string(o.first) + " to " +
-                       std::to_string(q.LastRecord) + " are not in " + path.filename().string() +
-                       " (1 to " + std::to_string(pf.Count()) + ")"};
+    if (auto st = store::SetRecordRange(q, o.first, o.last > 0 ? o.last : 0, pf.Count(),
+                                        path.filename().string());
+        !st)
+        throw CliError{st.message()};
     q.Period = o.period[0];
     q.WantVolume = true;
     q.RecordType = rec.RecordType;

@@ -104,27 +104,20 @@ void AddBarsCommand(CLI::App& app, CliContext& ctx) {
     cmd->add_flag("--json", o->json, "JSON output");
     cmd->callback([&ctx, o] {
         auto& session = ctx.OpenSession();
-        const auto names = ReadNames(session);
-        const std::string wanted = store::PadCode(o->code);
-        const store::NameRecord* rec = nullptr;
-        for (const auto& n : names)
-            if (n.Code == wanted) {
-                rec = &n;
-                break;
-            }
-        if (!rec) throw CliError{"No File For That Name: " + Trim(o->code)};
+        (void)ReadNames(session); // no name file: say so
+        platform::Status why;
+        const auto found = store::FindCode(session.folders.DataFolder, o->code, why);
+        if (!why) throw CliError{why.message()};
+        if (!found) throw CliError{"No File For That Name: " + Trim(o->code)};
+        const store::NameRecord* rec = &found->Record;
         const auto path = store::PriceFile::PathFor(session.folders.DataFolder, rec->Code);
         store::PriceFile pf(path);
-        if (!platform::FileExists(path)) throw CliError{"No Data for " + path.filename().string()};
-        if (auto st = pf.Open(); !st) throw CliError{st.message()};
-        if (pf.Count() < 1) throw CliError{"No Data for " + path.filename().string()};
+        if (auto st = pf.OpenWithData(); !st) throw CliError{st.message()};
         store::SeriesRequest q;
-        q.FirstRecord = static_cast<std::int16_t>(o->first);
-        q.LastRecord = static_cast<std::int16_t>(o->last > 0 ? o->last : pf.Count());
-        if (o->first < 1 || q.LastRecord > pf.Count() || q.LastRecord < q.FirstRecord)
-            throw CliError{"Records " + std::to_string(o->first) + " to " +
-                           std::to_string(q.LastRecord) + " are not in " +
-                           path.filename().string() + " (1 to " + std::to_string(pf.Count()) + ")"};
+        if (auto st = store::SetRecordRange(q, o->first, o->last > 0 ? o->last : 0, pf.Count(),
+                                            path.filename().string());
+            !st)
+            throw CliError{st.message()};
         q.Period = o->period[0];
         q.WantVolume = !o->noVolume;
         q.RecordType = rec->RecordType;
@@ -183,11 +176,14 @@ void AddListsCommand(CLI::App& app, CliContext& ctx) {
         auto& session = ctx.OpenSession();
         const auto display = store::GetSubLists(session.services().settings);
         json out = json::array();
+        std::vector<std::string> unreadable;
         for (std::size_t i = 0; i < store::kListLetters.size(); ++i) {
             const char letter = store::kListLetters[i];
             const auto path = store::ListPath(session.folders.DataFolder, letter);
             std::vector<store::ChartListEntry> entries;
-            if (platform::FileExists(path)) (void)store::ReadList(path, entries);
+            if (platform::FileExists(path))
+                if (auto st = store::ReadList(path, entries); !st)
+                    unreadable.push_back(st.message());
             json codes = json::array();
             for (const auto& e : entries)
                 codes.push_back(TextJson(e.Code));
@@ -203,6 +199,13 @@ void AddListsCommand(CLI::App& app, CliContext& ctx) {
             }
         }
         if (*asJson) ctx.out << out.dump(2) << "\n";
+        // A list the format cannot hold is named, not passed over in silence.
+        if (!unreadable.empty()) {
+            std::string text = unreadable.front();
+            for (std::size_t i = 1; i < unreadable.size(); ++i)
+                text += "\n" + unreadable[i];
+            throw CliError{text};
+        }
     });
 }
 

@@ -46,7 +46,7 @@ int main(int argc, char** argv) {
     std::optional<std::string> rootArg;
     if (parser.isSet(rootOpt)) rootArg = parser.value(rootOpt).toStdString();
     const auto root = kori::app::FindInstallRoot(rootArg);
-    kori::platform::CreateFolder(root);
+    kori::platform::CreateFolderPath(root);
 
     kori::gui::QtDialogs dialogs;
     kori::platform::NullProgress startupProgress;

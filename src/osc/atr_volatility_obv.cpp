@@ -1,6 +1,7 @@
 #include "osc/atr_volatility_obv.h"
 
 #include <algorithm>
+#include <cmath>
 #include <limits>
 
 namespace kori::osc {
@@ -15,11 +16,12 @@ std::optional<Money> ToMoney(float v) {
 // the gaps keep their sign. None when a price cannot be held in currency (not a number, or
 // beyond its range), rather than a wrapped-around value.
 std::optional<Money> TrueRange(const store::ChartBar& bar, const store::ChartBar& before) {
-    const auto a = ToMoney(bar.High - bar.Low);
-    const auto b = ToMoney(before.Close - bar.Low);
-    const auto c = ToMoney(bar.High - before.Close);
-    if (!a || !b || !c) return std::nullopt;
-    return std::max({*a, *b, *c});
+    const float a = bar.High - bar.Low;
+    const float b = before.Close - bar.Low;
+    const float c = bar.High - before.Close;
+    if (std::isnan(a) || std::isnan(b) || std::isnan(c)) return std::nullopt;
+    // The conversion keeps order, so the largest price converts to the largest currency.
+    return ToMoney(std::max({a, b, c}));
 }
 
 // The routine's first scale stops it when every non-zero true range is the same.

@@ -3,6 +3,7 @@
 // identifier as named columns, one row a bar, with no value where the routine computed none.
 #include "osc/osc_series.h"
 #include "osc/osc_settings.h"
+#include "platform/rounding.h"
 
 #include <optional>
 #include <span>
@@ -34,6 +35,31 @@ struct OscTable {
     std::span<const std::optional<double>> Row(std::size_t bar) const {
         return std::span(values).subspan(bar * columns.size(), columns.size());
     }
+};
+
+// The columns an identifier's computation fills, one value a bar; built into an OscTable.
+class OscColumns {
+public:
+    explicit OscColumns(int bars) : m_bars(static_cast<std::size_t>(bars)) {}
+
+    template <class T> OscColumns& Add(std::string name, const Series<T>& series) {
+        m_table.columns.push_back(std::move(name));
+        std::vector<std::optional<double>> column(m_bars);
+        for (std::size_t i = 0; i < column.size() && i < series.size(); ++i)
+            if (series[i]) column[i] = AsDouble(*series[i]);
+        m_columns.push_back(std::move(column));
+        return *this;
+    }
+
+    OscTable Build();
+
+private:
+    static double AsDouble(double v) { return v; }
+    static double AsDouble(platform::Money v) { return v.ToDouble(); }
+
+    std::size_t m_bars;
+    OscTable m_table;
+    std::vector<std::vector<std::optional<double>>> m_columns;
 };
 
 // The periods of an identifier for the chart period, in the order of its settings keys.

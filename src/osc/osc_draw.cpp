@@ -888,7 +888,7 @@ OscOutcome ShowOscillator(chart::Chart& chart, std::string_view oscName, char ch
         return OscOutcome::DailyOnly;
     }
     if (name != "OBV" && name != "DM") {
-        const auto periods = Periods(def, name == "R/F" ? "ROC" : name, chartPeriod);
+        const auto periods = Periods(def, name, chartPeriod);
         if (periods.empty() || periods[0] == 0) return OscOutcome::NotSet;
     }
     // Directional Movement works a period of 0 as 10, so it is validated as such.
@@ -896,47 +896,17 @@ OscOutcome ShowOscillator(chart::Chart& chart, std::string_view oscName, char ch
     if (name == "DM")
         for (std::int16_t OscDef::*f : {&OscDef::DMA, &OscDef::DMW, &OscDef::DMXA, &OscDef::DMXW})
             if (checked.*f == 0) checked.*f = 10;
+    // The comparison file of RMO and RMX was resolved by the caller, which says when it is
+    // missing; only the periods are checked here.
     const std::string column(1, chartPeriod);
-    if (!CheckOscSettings(checked, name, column, in.TargetName, in.Dialogs))
+    if (!CheckOscSettings(checked, name, column, in.TargetName, in.Dialogs, false))
         return OscOutcome::NotValid;
     if (const auto problem = NegativePeriodProblem(checked, name, column)) {
         in.Dialogs.MsgBox(problem->text, problem->title);
         return OscOutcome::NotValid;
     }
     try {
-        if (name == "ATR")
-            OscATR(chart, def, chartPeriod, in, panel);
-        else if (name == "STO" || name == "FX")
-            OscStochFX(chart, name, def, chartPeriod, in, panel, false);
-        else if (name == "ROC")
-            OscROC(chart, name, def, chartPeriod, in, panel);
-        else if (name == "RMX")
-            OscRMX(chart, def, chartPeriod, in, panel);
-        else if (name == "RMO")
-            OscRMO(chart, def, chartPeriod, in, panel);
-        else if (name == "R/F") {
-            OscROC(chart, name, def, chartPeriod, in, panel);
-            OscStochFX(chart, name, def, chartPeriod, in, panel, true);
-        } else if (name == "RSI")
-            OscRSI(chart, def, chartPeriod, in, panel);
-        else if (name == "MACD")
-            OscMACD(chart, def, chartPeriod, in, panel);
-        else if (name == "WMS")
-            OscWilliams(chart, def, chartPeriod, in, panel);
-        else if (name == "ERY")
-            OscElderRay(chart, def, chartPeriod, in, panel);
-        else if (name == "MOM")
-            OscMomentum(chart, def, chartPeriod, in, panel);
-        else if (name == "DM")
-            OscDirectional(chart, def, chartPeriod, in, panel);
-        else if (name == "JHG")
-            OscHolyGrail(chart, def, chartPeriod, in, panel);
-        else if (name == "COP")
-            OscCoppock(chart, def, chartPeriod, in, panel);
-        else if (name == "VTY")
-            OscVolatility(chart, def, chartPeriod, in, panel);
-        else if (name == "OBV")
-            OscOBV(chart, in, panel, false);
+        id->Draw(chart, def, chartPeriod, in, panel);
     } catch (const std::bad_alloc&) {
         (void)chart.Stream.Close();
         ShowOscFailure(in.Dialogs, 480, "");

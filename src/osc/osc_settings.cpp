@@ -1,5 +1,6 @@
 #include "osc/osc_settings.h"
 
+#include "osc/osc_identifiers.h"
 #include "platform/files.h"
 #include "platform/text.h"
 
@@ -39,31 +40,6 @@ constexpr OscPeriodKey kPeriodKeys[] = {
     {"AtrD", "AtrW", &D::AtrD, &D::AtrW, 0, 0, 1, 200, true},
     {"BBA", "BBW", &D::BBA, &D::BBW, 21, 21, 1, 100, false},
 };
-
-struct OscKeyList {
-    std::string_view oscName;
-    std::array<std::string_view, 4> keys;
-    std::size_t count;
-};
-
-constexpr std::array<OscKeyList, 16> kOscKeys{{
-    {"ATR", {"AtrD"}, 1},
-    {"STO", {"StochK", "StochD"}, 2},
-    {"FX", {"FXF", "FXX"}, 2},
-    {"ROC", {"RocP", "RocA"}, 2},
-    {"RMX", {"RmxP", "RmxA"}, 2},
-    {"RMO", {"RmoP", "RmoA"}, 2},
-    {"R/F", {"RocP", "RocA", "FXF", "FXX"}, 4},
-    {"RSI", {"RsiP"}, 1},
-    {"MACD", {"Md1", "Md2", "Md3"}, 3},
-    {"WMS", {"WmsA"}, 1},
-    {"ERY", {"ERA"}, 1},
-    {"MOM", {"MMA"}, 1},
-    {"DM", {"DMA", "DMXA"}, 2},
-    {"JHG", {"HolyD"}, 1},
-    {"COP", {"CopD"}, 1},
-    {"VTY", {"VtyD"}, 1},
-}};
 
 std::int16_t ReadPeriod(const platform::IniFile& ini, std::string_view key) {
     const double v = std::nearbyint(platform::Val(ini.Read(kOscDefSection, key)));
@@ -143,9 +119,8 @@ const OscPeriodKey* FindOscPeriodKeyByName(std::string_view key) {
 }
 
 std::span<const std::string_view> OscSettingKeys(std::string_view oscName) {
-    for (const auto& o : kOscKeys)
-        if (o.oscName == oscName) return {o.keys.data(), o.count};
-    return {};
+    const OscIdentifier* id = FindOscIdentifier(oscName);
+    return id == nullptr ? std::span<const std::string_view>{} : id->PeriodKeys();
 }
 
 OscDef ReadOscSettings(const platform::IniFile& ini) {
@@ -169,6 +144,7 @@ OscDef ReadOscSettings(const platform::IniFile& ini) {
 }
 
 bool WriteOscSettings(platform::IniFile& ini, const OscDef& def) {
+    platform::IniFile::Batch once(ini); // one write of the file for the whole save
     bool ok = true;
     auto put = [&](std::string_view key, std::string_view value) {
         ok = ini.Write(kOscDefSection, key, value) && ok;
@@ -189,7 +165,7 @@ bool WriteOscSettings(platform::IniFile& ini, const OscDef& def) {
     put("LCalTp", def.LCalTp);
     put("VCalTp", def.VCalTp);
     put("CutVols", def.CutVols);
-    return ok;
+    return once.Commit() && ok;
 }
 
 void FillOscDefaults(OscDef& def, std::string_view oscName, bool weekly) {
@@ -217,11 +193,11 @@ std::string CompareFileCode(std::string_view compFile) {
 
 std::optional<OscMessage> OscSettingsProblem(const OscDef& def, std::string_view oscName,
                                              std::string_view chartPeriod,
-                                             std::string_view targetName) {
+                                             std::string_view targetName, bool compareFile) {
     if (platform::Upper(targetName) != "CHTS") return std::nullopt;
     if (FirstFailingKey(def, oscName, WeeklyColumn(chartPeriod), true) != nullptr)
         return NotValid(oscName);
-    if (UsesCompareFile(oscName)) return CompareFileProblem(def);
+    if (compareFile && UsesCompareFile(oscName)) return CompareFileProblem(def);
     return std::nullopt;
 }
 
@@ -237,8 +213,8 @@ std::optional<OscMessage> NegativePeriodProblem(const OscDef& def, std::string_v
 }
 
 bool CheckOscSettings(const OscDef& def, std::string_view oscName, std::string_view chartPeriod,
-                      std::string_view targetName, platform::Dialogs& dialogs) {
-    const auto problem = OscSettingsProblem(def, oscName, chartPeriod, targetName);
+                      std::string_view targetName, platform::Dialogs& dialogs, bool compareFile) {
+    const auto problem = OscSettingsProblem(def, oscName, chartPeriod, targetName, compareFile);
     if (!problem) return true;
     dialogs.MsgBox(problem->text, problem->title);
     return false;

@@ -83,17 +83,19 @@ std::string CompareFileCode(std::string_view compFile);
 
 // Validation of the chart window: runs only when `targetName` is "CHTS" (any case); the
 // column is daily when `chartPeriod` (trimmed) is "A". RMX is tested on its daily period in
-// both columns. RMO and RMX also need their comparison file to exist.
+// both columns. RMO and RMX also need their comparison file to exist, unless `compareFile` is
+// false because the caller resolves the file itself (with its own message).
 std::optional<OscMessage> OscSettingsProblem(const OscDef& def, std::string_view oscName,
                                              std::string_view chartPeriod,
-                                             std::string_view targetName);
+                                             std::string_view targetName, bool compareFile = true);
 // Whatever the window: a negative period in the column in use (it would count back before
 // the first bar), with the same message.
 std::optional<OscMessage> NegativePeriodProblem(const OscDef& def, std::string_view oscName,
                                                 std::string_view chartPeriod);
 // Shows the problem, if any, through `dialogs`; true when the settings pass.
 bool CheckOscSettings(const OscDef& def, std::string_view oscName, std::string_view chartPeriod,
-                      std::string_view targetName, platform::Dialogs& dialogs);
+                      std::string_view targetName, platform::Dialogs& dialogs,
+                      bool compareFile = true);
 
 // Validation of the settings dialog's OK for the oscillator's own column.
 std::optional<OscMessage> OscFormProblem(const OscDef& def, std::string_view oscName, bool weekly);

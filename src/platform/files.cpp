@@ -236,6 +236,18 @@ Status AppendToFile(const fs::path& path, std::string_view bytes) {
 }
 
 bool CreateFolder(const fs::path& folder) {
+    std::string s = NormalisePath(folder.string());
+    while (s.size() > 1 && s.back() == '/')
+        s.pop_back();
+    const fs::path p(s);
+    std::error_code ec;
+    if (fs::is_directory(p, ec)) return true;
+    const fs::path parent = p.has_parent_path() ? p.parent_path() : fs::path(".");
+    if (!fs::is_directory(parent, ec)) return false;
+    return fs::create_directory(p, ec) || fs::is_directory(p, ec);
+}
+
+bool CreateFolderPath(const fs::path& folder) {
     std::error_code ec;
     fs::create_directories(fs::path(NormalisePath(folder.string())), ec);
     return !ec;

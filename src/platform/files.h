@@ -65,6 +65,10 @@ private:
     long long m_previous;
 };
 
+// Makes one folder inside a folder that exists; false when its parent is missing, so a path
+// read from a file never makes a tree of folders anywhere.
 bool CreateFolder(const fs::path& folder);
+// Makes a folder and any missing parents: only for the install root and folders the user chose.
+bool CreateFolderPath(const fs::path& folder);
 
 } // namespace kori::platform

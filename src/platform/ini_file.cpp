@@ -4,6 +4,7 @@
 #include "platform/text.h"
 
 #include <sstream>
+#include <sys/stat.h>
 
 namespace kori::platform {
 
@@ -13,10 +14,29 @@ bool IniFile::exists() const {
     return FileExists(m_path);
 }
 
+IniFile::Stamp IniFile::StampOf(const std::filesystem::path& path) {
+    struct stat st {};
+    Stamp s;
+    if (::stat(ResolvePath(path).c_str(), &st) != 0) return s;
+    s.exists = true;
+    s.size = static_cast<long long>(st.st_size);
+    s.seconds = static_cast<long long>(st.st_mtim.tv_sec);
+    s.nanos = static_cast<long long>(st.st_mtim.tv_nsec);
+    s.inode = static_cast<unsigned long long>(st.st_ino);
+    return s;
+}
+
 void IniFile::Load() const {
-    // Re-read on every access: another window (or program) may have written the file.
+    // Another window (or program) may have written the file: read it again only then. Changes
+    // held by a batch stay until it saves them.
+    if (m_batchDepth > 0 && m_loaded) return;
+    const Stamp now = StampOf(m_path);
+    if (m_loaded && now == m_stamp) return;
     m_lines.clear();
     m_loaded = true;
+    m_stamp = now;
+    if (!now.exists) return;
+    ++m_diskReads;
     const auto content = ReadWholeFile(m_path);
     if (!content) return;
     std::istringstream in(*content);
@@ -40,13 +60,35 @@ void IniFile::Load() const {
     }
 }
 
-bool IniFile::Save() const {
+bool IniFile::Batch::Commit() {
+    if (m_done) return true;
+    m_done = true;
+    if (--m_ini.m_batchDepth == 0 && m_ini.m_unsaved) return m_ini.Save();
+    return true;
+}
+
+IniFile::Batch::~Batch() {
+    (void)Commit();
+}
+
+bool IniFile::Save() {
+    if (m_batchDepth > 0) {
+        m_unsaved = true;
+        return true;
+    }
+    m_unsaved = false;
     std::string out;
     for (const auto& l : m_lines) {
         out += l.text;
         out += "\r\n";
     }
-    return WriteFileAtomic(m_path, out).ok();
+    const bool ok = WriteFileAtomic(m_path, out).ok();
+    // What is in memory is what was written: no need to read it back.
+    if (ok)
+        m_stamp = StampOf(m_path);
+    else
+        m_loaded = false; // memory is not what the disk holds: read it again next time
+    return ok;
 }
 
 std::string IniFile::ReadRaw(std::string_view section, std::string_view key) const {

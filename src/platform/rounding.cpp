@@ -68,7 +68,7 @@ std::optional<std::int32_t> FixToInt32(double x) {
     return Fit<std::int32_t>(Fix(x));
 }
 
-std::optional<Money> Money::FromDouble(double value) {
+std::optional<Money> Money::FromDecimalDigits(double value) {
     if (!std::isfinite(value)) return std::nullopt;
     // Work on the 15 significant decimal digits of the value, so that 0.00015 is the tie it
     // was typed as and not the 1.4999... that its binary form times 10000 gives.
@@ -113,10 +113,14 @@ std::optional<Money> Money::Times(std::int64_t n) const {
 
 std::optional<Money> Money::DividedBy(std::int64_t n) const {
     if (n == 0) return std::nullopt;
-    const Wide q = n > 0 ? DivideHalfEven(m_raw, n)
-                         : DivideHalfEven(-static_cast<Wide>(m_raw), -static_cast<Wide>(n));
-    if (q > std::numeric_limits<std::int64_t>::max()) return std::nullopt; // min / -1
-    return Money(static_cast<std::int64_t>(q));
+    if (n == -1 && m_raw == std::numeric_limits<std::int64_t>::min()) return std::nullopt;
+    std::int64_t q = m_raw / n;
+    const std::int64_t r = m_raw % n;
+    // Twice the remainder against the divisor, in unsigned so neither can overflow.
+    const std::uint64_t twice = 2 * static_cast<std::uint64_t>(r < 0 ? -(r + 1) + 1ULL : r);
+    const std::uint64_t absN = n < 0 ? static_cast<std::uint64_t>(-(n + 1)) + 1 : n;
+    if (twice > absN || (twice == absN && q % 2 != 0)) q += (m_raw < 0) != (n < 0) ? -1 : 1;
+    return Money(q);
 }
 
 std::optional<Money> Money::Plus(Money o) const {

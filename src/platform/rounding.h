@@ -36,7 +36,21 @@ public:
     static constexpr Money FromRaw(std::int64_t tenThousandths) { return Money(tenThousandths); }
     // Rounded to four decimals on the decimal digits of the value (15 significant), halves to
     // even; nullopt when the value is out of range or not a number.
-    static std::optional<Money> FromDouble(double value);
+    static std::optional<Money> FromDouble(double value) {
+        // Most prices are nowhere near a tie: below 2^31 ten-thousandths the binary product
+        // is within 1e-6 of the decimal value, so one clear of the half by more than 1e-4
+        // rounds the same either way, without working out the decimal digits.
+        const double scaled = (value < 0 ? -value : value) * kScale;
+        if (scaled < 2147483648.0) {
+            const auto whole = static_cast<std::int64_t>(scaled);
+            const double frac = scaled - static_cast<double>(whole);
+            if (frac < 0.4999 || frac > 0.5001) {
+                const std::int64_t raw = frac > 0.5 ? whole + 1 : whole;
+                return Money(value < 0 ? -raw : raw);
+            }
+        }
+        return FromDecimalDigits(value);
+    }
 
     constexpr std::int64_t raw() const { return m_raw; }
     double ToDouble() const { return static_cast<double>(m_raw) / kScale; }
@@ -59,6 +73,7 @@ public:
     constexpr auto operator<=>(const Money&) const = default;
 
 private:
+    static std::optional<Money> FromDecimalDigits(double value);
     constexpr explicit Money(std::int64_t raw) : m_raw(raw) {}
     std::int64_t m_raw = 0;
 };

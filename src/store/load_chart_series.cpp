@@ -205,6 +205,18 @@ struct Loader {
 
 } // namespace
 
+Status SetRecordRange(SeriesRequest& q, long long first, long long last, int count,
+                      std::string_view fileName) {
+    if (last == 0) last = count;
+    if (first < 1 || last < first || last > count)
+        return Status::Error("Records " + std::to_string(first) + " to " + std::to_string(last) +
+                             " are not in " + std::string(fileName) + " (1 to " +
+                             std::to_string(count) + ")");
+    q.FirstRecord = static_cast<std::int16_t>(first);
+    q.LastRecord = static_cast<std::int16_t>(last);
+    return Status::Ok();
+}
+
 Status LoadChartSeriesFromBytes(std::string_view bytes, const SeriesRequest& req,
                                 std::string_view fileName, ChartSeries& s) {
     s.Results = LoadResults{};

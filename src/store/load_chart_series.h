@@ -17,6 +17,12 @@ struct SeriesRequest {
     std::int16_t RecordType = 4;
 };
 
+// Sets the records first..last of a file of `count` records into a request; `last` 0 means
+// the last record. Numbers are checked before they are narrowed to the 16 bits of a record
+// number: a range outside 1..count is refused with a message naming the file.
+platform::Status SetRecordRange(SeriesRequest& request, long long first, long long last, int count,
+                                std::string_view fileName);
+
 // Folds the records first..last held in `bytes` (50 bytes each, record FirstRecord first).
 // `fileName` names the file in an error about a malformed date.
 platform::Status LoadChartSeriesFromBytes(std::string_view bytes, const SeriesRequest& request,

@@ -15,6 +15,11 @@ std::filesystem::path NameFile::PathIn(std::string_view dataFolder) {
 std::optional<FoundCode> FindCode(std::string_view dataFolder, std::string_view code,
                                   platform::Status& status) {
     status = Status::Ok();
+    if (platform::Trim(code).empty()) return std::nullopt;
+    if (!IsValidCode(code)) {
+        status = Status::Error("Invalid Code: " + platform::Trim(code));
+        return std::nullopt;
+    }
     const auto path = NameFile::PathIn(dataFolder);
     if (!platform::FileExists(path)) return std::nullopt;
     std::int16_t count = 0;

@@ -56,6 +56,16 @@ std::string NameRecord::TrimmedCode() const {
     return platform::Trim(Code);
 }
 
+bool IsValidCode(std::string_view code) {
+    const std::string c = platform::Trim(code);
+    if (c.empty() || c.size() > 6) return false;
+    for (const char ch : c) {
+        const auto u = static_cast<unsigned char>(ch);
+        if (u <= ' ' || u == 127 || ch == '/' || ch == '\\' || ch == '.' || ch == ':') return false;
+    }
+    return true;
+}
+
 std::string PadCode(std::string_view code) {
     std::string c = platform::Upper(platform::Trim(code));
     if (c == "PRN") c = "PRNX";

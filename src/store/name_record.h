@@ -3,6 +3,7 @@
 #include <array>
 #include <cstdint>
 #include <string>
+#include <string_view>
 
 namespace kori::store {
 
@@ -46,6 +47,10 @@ struct NameRecord {
         return PercentBandDown >= 1 && PercentBandDown <= 100 ? PercentBandDown : 5;
     }
 };
+
+// A code can name a price file: one to six characters after trimming, none of them a blank, a
+// control character, a path separator, a dot or a colon, so it never reaches outside its folder.
+bool IsValidCode(std::string_view code);
 
 // A code as the file stores it: upper case, padded to six; "PRN" and "AUX" in their safe forms.
 std::string PadCode(std::string_view code);

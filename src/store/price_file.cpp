@@ -2,6 +2,7 @@
 
 #include "platform/files.h"
 #include "platform/text.h"
+#include "store/name_record.h"
 #include "store/record_codec.h"
 
 #include <algorithm>
@@ -43,7 +44,18 @@ PriceRecord PriceRecord::Decode(const char* p) {
 }
 
 std::filesystem::path PriceFile::PathFor(std::string_view dataFolder, std::string_view code) {
+    // A code that could reach outside the folder names no file at all.
+    if (!IsValidCode(code)) return {};
     return platform::ResolveIn(dataFolder, platform::Trim(code) + ".WDT");
+}
+
+Status PriceFile::OpenWithData() {
+    const std::string name = m_path.empty() ? std::string("that code") : m_path.filename().string();
+    if (m_path.empty() || !platform::FileHasData(m_path))
+        return Status::Error("No Data for " + name);
+    if (auto s = Open(); !s) return s;
+    if (Count() < 1) return Status::Error("No Data for " + name);
+    return Status::Ok();
 }
 
 } // namespace kori::store

@@ -30,8 +30,11 @@ struct PriceRecord {
 class PriceFile : public RecordFile<PriceRecord> {
 public:
     using RecordFile::RecordFile;
-    // <DataFolder><code>.WDT, found whatever its case.
+    // <DataFolder><code>.WDT, found whatever its case; empty for a code that is not valid.
     static std::filesystem::path PathFor(std::string_view dataFolder, std::string_view code);
+    // Opens a price file to read from: "No Data for <file>" when it is missing or holds no
+    // record, the message of the record limit when it holds too many.
+    platform::Status OpenWithData();
 };
 
 } // namespace kori::store

@@ -17,6 +17,7 @@ Status CountRecords(const std::filesystem::path& file, std::size_t recordSize,
 }
 
 Status RecordFileBase::Open() {
+    if (m_path.empty()) return Status::Error("No file for that code");
     m_path = platform::ResolvePath(m_path);
     if (!platform::FileExists(m_path)) {
         std::ofstream create(m_path, std::ios::binary);

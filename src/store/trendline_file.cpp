@@ -2,6 +2,7 @@
 
 #include "platform/files.h"
 #include "platform/text.h"
+#include "store/name_record.h"
 #include "store/record_codec.h"
 
 namespace kori::store {
@@ -39,6 +40,7 @@ TrendRecord TrendRecord::Blank() {
 }
 
 std::filesystem::path TrendlineFile::PathFor(std::string_view chartFolder, std::string_view code) {
+    if (!IsValidCode(code)) return {};
     return platform::ResolveIn(chartFolder, platform::Trim(code) + ".TND");
 }
 

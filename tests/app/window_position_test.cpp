@@ -57,6 +57,7 @@ TEST(WindowPosition, MainWindowSizeFromHeightAndWidth) {
     EXPECT_EQ(fresh.height, 6645);
     EXPECT_FALSE(fresh.left);
     EXPECT_FALSE(fresh.top);
+    EXPECT_FALSE(fresh.sizeStored) << "a first start";
 
     SaveMainWindowPlace(store, {600, 300, 12000, 9000}, kOld);
     EXPECT_EQ(store.Get("Width", ""), "12000");
@@ -69,6 +70,7 @@ TEST(WindowPosition, MainWindowSizeFromHeightAndWidth) {
     EXPECT_EQ(same.height, 9000);
     EXPECT_EQ(same.left, 600);
     EXPECT_EQ(same.top, 300);
+    EXPECT_TRUE(same.sizeStored);
     // On a screen half as big each way everything halves.
     const MainWindowPlace half = LoadMainWindowPlace(store, {9600, 7200});
     EXPECT_EQ(half.width, 6000);
@@ -83,4 +85,36 @@ TEST(WindowPosition, MainWindowSizeFromHeightAndWidth) {
     const MainWindowPlace bad = LoadMainWindowPlace(store, {9600, 7200});
     EXPECT_EQ(bad.height, 6645);
     EXPECT_EQ(bad.width, 9045);
+}
+
+TEST(MainWindowSize, FirstStartIsLargeEnoughYetWithinTheScreen) {
+    using kori::app::FirstStartSize;
+    using kori::app::PixelSize;
+    // The design size (9045 x 6645 twips) is 603 x 443 pixels: far too small for the selection.
+    const PixelSize design{603, 443};
+    auto s = FirstStartSize(design, {1920, 1040});
+    EXPECT_EQ(s.width, kori::app::kFirstStartSize.width);
+    EXPECT_EQ(s.height, kori::app::kFirstStartSize.height);
+    s = FirstStartSize(design, {1008, 728}); // a small screen: all of it
+    EXPECT_EQ(s.width, 1008);
+    EXPECT_EQ(s.height, 728);
+    s = FirstStartSize({1400, 900}, {1920, 1040}); // a larger design size stands
+    EXPECT_EQ(s.width, 1400);
+    EXPECT_EQ(s.height, 900);
+    s = FirstStartSize(design, {}); // no screen known
+    EXPECT_EQ(s.width, kori::app::kFirstStartSize.width);
+}
+
+TEST(MainWindowSize, GrowsByWhatAChildLacksWithinTheScreen) {
+    using kori::app::GrowToFit;
+    // Window 800 x 600 with a work area of 780 x 500; the child reaches 900 x 450.
+    auto s = GrowToFit({800, 600}, {780, 500}, {900, 450}, {1900, 1000});
+    EXPECT_EQ(s.width, 920);
+    EXPECT_EQ(s.height, 600);
+    s = GrowToFit({800, 600}, {780, 500}, {2500, 700}, {1900, 1000}); // held by the screen
+    EXPECT_EQ(s.width, 1900);
+    EXPECT_EQ(s.height, 800);
+    s = GrowToFit({800, 600}, {780, 500}, {700, 400}, {1900, 1000}); // fits: unchanged
+    EXPECT_EQ(s.width, 800);
+    EXPECT_EQ(s.height, 600);
 }

@@ -187,7 +187,8 @@ TEST(BuildChart, OverlaysFollowTheTrailingLabelsInTheSameStream) {
     ASSERT_TRUE(BuildChart(r.chart, b, r.source, r.surface).ok());
     const auto lines = r.Lines();
     ASSERT_GE(lines.size(), 2u);
-    EXPECT_EQ(lines[lines.size() - 2], "Z, 7, 269.4, 120,KORI Charting, 27");
+    EXPECT_EQ(lines[lines.size() - 2], "Z, 7, 269.4, 120,KORI\xA0"
+                                       "Charting, 27");
     EXPECT_EQ(lines.back(), "L, 5, 900, 354, 900, 20");
 }
 
@@ -205,8 +206,8 @@ TEST(BuildChart, SplitLowerHalfShowsItsOwnSecurityAndPeriod) {
                  r.streamPath, false,      1,      nullptr,   {}};
     b.Lower = &lower;
     ASSERT_TRUE(BuildChart(r.chart, b, r.source, r.surface).ok());
-    EXPECT_EQ(r.source.LastLoad.ChartPeriod, 'A');
-    EXPECT_EQ(lowerSource.LastLoad.ChartPeriod, 'W');
+    EXPECT_EQ(r.source.LastLoad.Period, 'A');
+    EXPECT_EQ(lowerSource.LastLoad.Period, 'W');
     EXPECT_EQ(r.request.ChartPeriod, 'A') << "the period in hand comes back after the split";
     EXPECT_FALSE(r.request.SplitMode);
     const auto lines = r.Lines();

@@ -24,14 +24,14 @@ class MemorySource : public chart::PriceSource {
 public:
     std::vector<DayRecord> Records;
     std::string Name = "BHP.WDT";
-    chart::LoadRequest LastLoad;
+    store::SeriesRequest LastLoad;
 
     std::string FileName() const override { return Name; }
     std::int16_t RecordCount() override { return static_cast<std::int16_t>(Records.size()); }
     std::string DateOf(std::int16_t rec) override { return At(rec).Date; }
     std::string NoteText(std::int16_t rec) override { return At(rec).AdjDesc; }
 
-    platform::Status Load(const chart::LoadRequest& req, store::ChartSeries& s) override {
+    platform::Status Load(const store::SeriesRequest& req, store::ChartSeries& s) override {
         LastLoad = req;
         s = store::ChartSeries{};
         std::int64_t sum = 0;

@@ -63,10 +63,10 @@ TEST(TrailingLabels, LastDateClosingPriceAndStamp) {
     ChartRig r;
     AddDates(r);
     r.source.Records[5].Close = 15;
-    const std::vector<std::string> tail = {
-        "T, 8.25, 380, 2,Last date processed 01-02-24, 27",
-        "T, 8.25, 380, 20,Closing Price : 17.00  (15.00), 27",
-        "Z, 7, 269.4, 120,KORI Charting, 27"}; // 354 - 30 - 13 x 4.2
+    const std::vector<std::string> tail = {"T, 8.25, 380, 2,Last date processed 01-02-24, 27",
+                                           "T, 8.25, 380, 20,Closing Price : 17.00  (15.00), 27",
+                                           "Z, 7, 269.4, 120,KORI\xA0"
+                                           "Charting, 27"}; // 354 - 30 - 13 x 4.2
     ASSERT_TRUE(r.Build().ok());
     auto lines = r.Lines();
     ASSERT_GE(lines.size(), 3u);
@@ -77,7 +77,8 @@ TEST(TrailingLabels, LastDateClosingPriceAndStamp) {
     r.printBold = true; // the labels stay off paper; the stamp moves and grows
     ASSERT_TRUE(r.Build().ok());
     lines = r.Lines();
-    EXPECT_EQ(lines.back(), "Z, 8, 249.4, 110,KORI Charting, 27");
+    EXPECT_EQ(lines.back(), "Z, 8, 249.4, 110,KORI\xA0"
+                            "Charting, 27");
     for (const auto& l : lines)
         EXPECT_EQ(l.find("Closing"), std::string::npos);
     EXPECT_TRUE(HasRun(r.Calls(), {"Text 380,20 size 8 #27 [Closing Price : 17.00  (15.00)]"}));

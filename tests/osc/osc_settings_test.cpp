@@ -151,26 +151,34 @@ TEST(OscIdentifiers, DispatcherOrderAndChoices) {
         order += std::string(id.OscName) + " ";
     EXPECT_EQ(order, "ATR STO FX ROC RMX RMO R/F RSI MACD WMS ERY MOM DM JHG COP VTY OBV PARA "
                      "PARAV ");
-    EXPECT_EQ(FindOscIdentifier("R/F")->Routine, "OscROC, OscStochFX");
     EXPECT_EQ(FindOscIdentifier("RMO")->ListName, "");
-
-    auto slow = OscChoiceForToolbarKey("tbSTS");
-    ASSERT_TRUE(slow);
-    EXPECT_EQ(slow->OscName, "STO");
-    EXPECT_TRUE(slow->SlowStochastic);
-    EXPECT_EQ(OscChoiceForToolbarKey("tbROCFX")->OscName, "R/F");
-    EXPECT_EQ(OscChoiceForListName("Williams %R")->OscName, "WMS");
-    EXPECT_FALSE(OscChoiceForListName("None"));
+    EXPECT_EQ(FindOscIdentifier(" R/F ")->PeriodKeys().size(), 4u);
+    EXPECT_TRUE(FindOscIdentifier("OBV")->PeriodKeys().empty());
+    EXPECT_EQ(FindOscIdentifier("XYZ"), nullptr);
+    // Every panel oscillator has a computation and a panel; the parabolic has neither.
+    for (const auto& id : OscIdentifiers()) {
+        EXPECT_EQ(id.Compute == nullptr, id.OnPriceChart) << id.OscName;
+        EXPECT_EQ(id.Draw == nullptr, id.OnPriceChart) << id.OscName;
+    }
 
     const auto choices = MultiOscChoices();
     ASSERT_EQ(choices.size(), 18u);
     EXPECT_EQ(choices[0], "None");
     EXPECT_EQ(choices[2], "Directional Movement");
+    EXPECT_EQ(choices[7], "OBV");
     EXPECT_EQ(choices[11], "ROC and FX");
+    EXPECT_EQ(choices[14], "Stochastic (Fast)");
+    EXPECT_EQ(choices[15], "Stochastic (Slow)");
     EXPECT_EQ(choices[17], "Williams %R");
-    // Every name in the list selects an oscillator.
-    for (std::size_t i = 1; i < choices.size(); ++i)
-        EXPECT_TRUE(OscChoiceForListName(choices[i])) << choices[i];
+
+    // The chooser: the window's order with its own captions, the slow stochastic its own row.
+    std::string chooser;
+    for (const auto& c : ChooserOrder())
+        chooser += std::string(ChooserCaption(c)) + "|";
+    EXPECT_EQ(chooser, "Average True Range|Directional Movement|Coppock|ElderRay|FX|"
+                       "Jones Holy Grail|MACD|Momentum|On-Balance Volume|ROC|ROC & FX|RMO|RMX|"
+                       "RSI|Stochastic|Stochastic(slow)|Volatility|Williams %R|Parabolic|");
+    EXPECT_TRUE(ChooserOrder()[15].SlowStochastic);
 }
 
 TEST(OscIdentifiers, MultiOscSetsAreStoredAsTrimmedCommaLists) {

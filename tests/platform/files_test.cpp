@@ -136,3 +136,51 @@ TEST(SettingsStore, FallsBackAndKeepsApplicationsApart) {
     EXPECT_EQ(store.Get("SubListA", "x"), "Banks");
     EXPECT_EQ(store.Get("Other App", kAppSection, "SubListA", "none"), "none");
 }
+
+TEST(IniFile, ReadFromDiskOnceAndAgainOnlyWhenItChanges) {
+    TempRoot root;
+    root.Write("Kori.ini", "[Charts]\r\nZoom=120\r\nType=B\r\n");
+    IniFile ini(root.path() / "Kori.ini");
+    for (int i = 0; i < 50; ++i) {
+        EXPECT_EQ(ini.Read("Charts", "Zoom"), "120");
+        EXPECT_EQ(ini.Read("Charts", "Type"), "B");
+    }
+    EXPECT_EQ(ini.DiskReads(), 1u);
+    // Our own write needs no read back; another writer's change is seen.
+    ASSERT_TRUE(ini.Write("Charts", "Zoom", "90"));
+    EXPECT_EQ(ini.Read("Charts", "Zoom"), "90");
+    EXPECT_EQ(ini.DiskReads(), 1u);
+    IniFile other(root.path() / "Kori.ini");
+    ASSERT_TRUE(other.Write("Charts", "Type", "C"));
+    EXPECT_EQ(ini.Read("Charts", "Type"), "C");
+    EXPECT_EQ(ini.Read("Charts", "Zoom"), "90");
+    EXPECT_EQ(ini.DiskReads(), 2u);
+}
+
+TEST(IniFile, ABatchWritesTheFileOnce) {
+    TempRoot root;
+    IniFile ini(root.path() / "Kori.ini");
+    {
+        IniFile::Batch once(ini);
+        ASSERT_TRUE(ini.Write("Fonts", "Name", "Arial"));
+        ASSERT_TRUE(ini.Write("Fonts", "Size", "10"));
+        EXPECT_FALSE(FileExists(root.path() / "Kori.ini")) << "nothing written yet";
+        EXPECT_EQ(ini.Read("Fonts", "Size"), "10");
+    }
+    IniFile again(root.path() / "Kori.ini");
+    EXPECT_EQ(again.Read("Fonts", "Name"), "Arial");
+    EXPECT_EQ(again.Read("Fonts", "Size"), "10");
+}
+
+TEST(Files, AFolderIsMadeOnlyInsideOneThatExists) {
+    TempRoot root;
+    // A path read from a file makes no tree of folders.
+    EXPECT_FALSE(CreateFolder(root.path() / "no" / "such" / "temp"));
+    EXPECT_FALSE(std::filesystem::exists(root.path() / "no"));
+    EXPECT_TRUE(CreateFolder(root.folder() + "temp/"));
+    EXPECT_TRUE(std::filesystem::is_directory(root.path() / "temp"));
+    EXPECT_TRUE(CreateFolder(root.path() / "temp")) << "an existing folder is fine";
+    // The install root and folders the user chose are made whole.
+    EXPECT_TRUE(CreateFolderPath(root.path() / "a" / "b"));
+    EXPECT_TRUE(std::filesystem::is_directory(root.path() / "a" / "b"));
+}

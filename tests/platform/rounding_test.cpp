@@ -43,6 +43,22 @@ TEST(Rounding, IntegerParts) {
     EXPECT_EQ(FixToInt32(-7.99), -7);
 }
 
+// The quick path for values clear of a tie agrees with the decimal digits everywhere.
+TEST(Money, ConversionsNearAndFarFromTies) {
+    EXPECT_EQ(Money::FromDouble(1.00004999)->raw(), 10000);
+    EXPECT_EQ(Money::FromDouble(1.00005001)->raw(), 10001);
+    EXPECT_EQ(Money::FromDouble(-1.00005001)->raw(), -10001);
+    EXPECT_EQ(Money::FromDouble(0.00025)->raw(), 2); // a tie goes to the even
+    EXPECT_EQ(Money::FromDouble(0.00035)->raw(), 4);
+    EXPECT_EQ(Money::FromDouble(214748.36475)->raw(), 2147483648); // past the quick path
+    for (int i = -3000; i <= 3000; ++i) {
+        const double v = i * 0.000137;
+        const auto m = Money::FromDouble(v);
+        ASSERT_TRUE(m);
+        EXPECT_NEAR(static_cast<double>(m->raw()), v * 10000, 0.5 + 1e-9) << v;
+    }
+}
+
 TEST(Money, WholeNumberArithmeticIsRoundedAndChecked) {
     const auto over = [](std::int64_t raw, std::int64_t n) {
         return Money::FromRaw(raw).DividedBy(n)->raw();

@@ -2,8 +2,10 @@
 #include "store_builders.h"
 #include "support/temp_root.h"
 
+#include <cmath>
 #include <fstream>
 #include <gtest/gtest.h>
+#include <limits>
 
 using namespace kori::store;
 using kori::test::Bytes;
@@ -175,4 +177,52 @@ TEST(PriceFile, AppendsInOrderWithNoGaps) {
     EXPECT_EQ(all[0].Close, 3);
     EXPECT_EQ(all[2].Close, 2);
     EXPECT_FALSE(f.Write(5, all[0]).ok()) << "no gaps";
+}
+
+TEST(LoadChartSeries, APriceThatIsNoNumberIsReportedAndReadAsNoTrade) {
+    const float nan = std::numeric_limits<float>::quiet_NaN();
+    const float inf = std::numeric_limits<float>::infinity();
+    const std::vector<PriceRecord> recs = {
+        Day("20261102", 10, 11, 9, 10, 100), Day("20261103", 10, inf, 9, 10, 100),
+        Day("20261104", 10, 12, 9, nan, 100), Day("20261105", 11, 12, 10, 11, 100)};
+    ChartSeries s;
+    SeriesRequest q;
+    q.FirstRecord = 5;
+    q.LastRecord = 8;
+    ASSERT_TRUE(LoadChartSeriesFromBytes(Bytes(recs), q, "KRM.WDT", s).ok());
+    ASSERT_EQ(s.Issues.size(), 2u);
+    EXPECT_EQ(s.Issues[0].file, "KRM.WDT");
+    EXPECT_EQ(s.Issues[0].record, 6);
+    EXPECT_EQ(s.Issues[1].record, 7);
+    // Read as no-trade records (this early in the window their bars keep the zero close), and
+    // the scale never sees the bad values.
+    EXPECT_EQ(s.ChartBars[1].Close, 0);
+    EXPECT_EQ(s.ChartBars[2].High, 0);
+    EXPECT_EQ(s.Results.HighestPrice, 12);
+    for (const auto& b : s.ChartBars)
+        EXPECT_TRUE(std::isfinite(b.High) && std::isfinite(b.Close));
+}
+
+TEST(LoadChartSeries, RecordRangesAreCheckedBeforeTheyAreNarrowed) {
+    SeriesRequest q;
+    auto st = SetRecordRange(q, 1, 65537, 1500, "KRM.WDT");
+    EXPECT_FALSE(st.ok());
+    EXPECT_EQ(st.message(), "Records 1 to 65537 are not in KRM.WDT (1 to 1500)");
+    EXPECT_FALSE(SetRecordRange(q, 65536 + 5, 0, 1500, "KRM.WDT").ok());
+    EXPECT_FALSE(SetRecordRange(q, 0, 10, 1500, "KRM.WDT").ok());
+    EXPECT_FALSE(SetRecordRange(q, 20, 10, 1500, "KRM.WDT").ok());
+    ASSERT_TRUE(SetRecordRange(q, 3, 0, 1500, "KRM.WDT").ok());
+    EXPECT_EQ(q.FirstRecord, 3);
+    EXPECT_EQ(q.LastRecord, 1500);
+}
+
+TEST(PriceFile, OpenWithDataNamesTheTrueReason) {
+    kori::test::TempRoot root;
+    const auto path = PriceFile::PathFor(root.folder(), "KRM");
+    EXPECT_EQ(PriceFile(path).OpenWithData().message(), "No Data for KRM.WDT");
+    root.Write("KRM.WDT", "");
+    EXPECT_EQ(PriceFile(path).OpenWithData().message(), "No Data for KRM.WDT");
+    root.Write("KRM.WDT", std::string(50 * 32768, '\0'));
+    EXPECT_EQ(PriceFile(path).OpenWithData().message(),
+              "KRM.WDT holds 32768 records; a file can hold at most 32767.");
 }

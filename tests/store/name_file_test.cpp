@@ -90,3 +90,46 @@ TEST(NameFile, CountIgnoresARemainderAndRefusesAnOversizedFile) {
     std::filesystem::resize_file(f.path(), 32768ull * 96);
     EXPECT_FALSE(f.Open().ok());
 }
+
+TEST(NameFile, OneLookupServesEveryCaller) {
+    kori::test::TempRoot root;
+    NameFile f(NameFile::PathIn(root.folder()));
+    ASSERT_TRUE(f.Open().ok());
+    auto prn = Name("PRNX", "Stored in its safe form");
+    prn.IndustryClass = "321";
+    ASSERT_TRUE(f.Append(prn).ok());
+    ASSERT_TRUE(f.Append(Name("../X", "A code that is no file name")).ok());
+    kori::platform::Status why;
+    // "PRN" reaches "PRNX" whichever lookup asks.
+    const auto found = FindCode(root.folder(), "prn", why);
+    ASSERT_TRUE(found);
+    EXPECT_EQ(found->RecordNumber, 1);
+    std::string name, cls;
+    LookupNameAndClass(root.folder(), "PRN", name, cls);
+    EXPECT_EQ(name, "Stored in its safe form");
+    EXPECT_EQ(cls, "321");
+    // A request that could reach outside the folder is refused, not looked up.
+    EXPECT_FALSE(FindCode(root.folder(), "../X", why));
+    EXPECT_EQ(why.message(), "Invalid Code: ../X");
+    EXPECT_TRUE(PriceFile::PathFor(root.folder(), "../X").empty());
+    EXPECT_FALSE(PriceFile(PriceFile::PathFor(root.folder(), "../X")).Open().ok());
+    EXPECT_TRUE(IsValidCode("1AUX"));
+    EXPECT_FALSE(IsValidCode("A B"));
+    EXPECT_FALSE(IsValidCode("SEVENXX"));
+}
+
+TEST(NameFile, AFileOverTheLimitIsNamedNotTakenForAMissingCode) {
+    kori::test::TempRoot root;
+    std::string bytes;
+    auto last = Name("KRM", "Past the limit").Encode();
+    bytes.assign(96 * 32767, ' ');
+    bytes.append(last.data(), last.size());
+    root.Write("Names.dat", bytes);
+    kori::platform::ScriptedDialogs d;
+    EXPECT_FALSE(FindCodeInNameFile(root.folder(), "KRM", d));
+    EXPECT_EQ(d.messages(), std::vector<std::string>{
+                                "Names.dat holds 32768 records; a file can hold at most 32767."});
+    kori::platform::Status why;
+    EXPECT_FALSE(FindCode(root.folder(), "KRM", why));
+    EXPECT_FALSE(why.ok());
+}

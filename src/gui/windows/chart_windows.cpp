@@ -103,6 +103,7 @@ void ChartWindows::OpenCharts() {
         m_selWindow->move(static_cast<int>(0.006 * area.width()),
                           static_cast<int>(0.077 * area.height()));
         sel->Load();
+        m_main.FitChild(m_selWindow);
     } else if (ChtSel* s = chtSel()) {
         s->Activate();
     }

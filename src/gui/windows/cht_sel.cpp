@@ -104,7 +104,7 @@ ChtSel::ChtSel(app::Session& session, app::ChartState& state, QWidget* parent)
     m_osc = new QComboBox(chart);
     m_osc->setObjectName(QStringLiteral("Combo2"));
     for (const auto& row : app::OscChoices())
-        m_osc->addItem(QString::fromLatin1(row.Caption));
+        m_osc->addItem(QString::fromLatin1(row.Caption.c_str()));
     m_bands = new QComboBox(chart);
     m_bands->setObjectName(QStringLiteral("Combo3"));
     for (const char* c : app::kBandCaptions)

@@ -227,7 +227,7 @@ void Chts::BuildToolBar() {
     });
     m_oscBox->setObjectName(QStringLiteral("cboOsc"));
     for (const auto& row : app::OscChoices())
-        m_oscBox->addItem(QString::fromLatin1(row.Caption));
+        m_oscBox->addItem(QString::fromLatin1(row.Caption.c_str()));
     m_oscBox->setToolTip(QStringLiteral("Oscillator"));
     connect(m_oscBox, &QComboBox::activated, this, [this](int i) {
         const auto& row = app::OscChoices()[static_cast<std::size_t>(i)];
@@ -311,7 +311,7 @@ void Chts::LeaveChart() {
 bool Chts::NextChart(int delta) {
     LeaveChart();
     if (!m_walk.Open(m_state.Request)) {
-        m_session.dialogs().MsgBox("The name file cannot be read", "Chart Display");
+        m_session.dialogs().MsgBox(m_walk.status().message(), "Chart Display");
         return false;
     }
     const bool classWalk = (m_state.ClassWalk || m_state.GicsWalk) && m_state.Request.ListMode == 1;

@@ -9,6 +9,7 @@
 #include <QAction>
 #include <QApplication>
 #include <QCloseEvent>
+#include <QGuiApplication>
 #include <QMdiArea>
 #include <QMdiSubWindow>
 #include <QMenuBar>
@@ -30,11 +31,19 @@ MainWindow::MainWindow(app::Session& session, QWidget* parent)
     setObjectName(QStringLiteral("Main"));
     setCentralWidget(m_mdi);
     m_mdi->setViewMode(QMdiArea::SubWindowView);
+    // A child window larger than the work area is reached by scrolling, never clipped.
+    m_mdi->setHorizontalScrollBarPolicy(Qt::ScrollBarAsNeeded);
+    m_mdi->setVerticalScrollBarPolicy(Qt::ScrollBarAsNeeded);
     // Sizes in the settings store are twips, scaled when the screen is not the one they were
     // written on.
     const auto place = app::LoadMainWindowPlace(m_session.services().settings, ScreenTwips(this));
-    const QSize size(std::max(place.width / kTwipsPerPixel, 640),
-                     std::max(place.height / kTwipsPerPixel, 480));
+    QSize size(std::max(place.width / kTwipsPerPixel, 640),
+               std::max(place.height / kTwipsPerPixel, 480));
+    m_firstStart = !place.sizeStored;
+    if (m_firstStart) {
+        const auto first = app::FirstStartSize({size.width(), size.height()}, FreeScreen());
+        size = QSize(first.width, first.height);
+    }
     resize(size);
     if (place.left && place.top) {
         // The same client geometry that closing wrote, unless no screen shows it any more.
@@ -53,6 +62,23 @@ MainWindow::MainWindow(app::Session& session, QWidget* parent)
 }
 
 MainWindow::~MainWindow() = default;
+
+app::PixelSize MainWindow::FreeScreen() const {
+    const QScreen* s = screen() ? screen() : QGuiApplication::primaryScreen();
+    if (!s) return {};
+    // The frame and title bar take a little of the free area.
+    const QSize free = s->availableGeometry().size() - QSize(16, 40);
+    return {free.width(), free.height()};
+}
+
+void MainWindow::FitChild(QMdiSubWindow* child) {
+    if (!child || !m_firstStart || isMaximized() || isFullScreen()) return;
+    const QRect frame = child->geometry();
+    const QSize area = m_mdi->viewport()->size();
+    const auto grown = app::GrowToFit({width(), height()}, {area.width(), area.height()},
+                                      {frame.right() + 1, frame.bottom() + 1}, FreeScreen());
+    if (grown.width != width() || grown.height != height()) resize(grown.width, grown.height);
+}
 
 void MainWindow::UpdateCaption() {
     setWindowTitle(Q("Kori Charting 8 " + std::string("  -   Current Data Folder ") +

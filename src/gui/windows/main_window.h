@@ -2,6 +2,7 @@
 // Main: the frame that holds the menus and every other window as a child.
 #include "app/menu_model.h"
 #include "app/session.h"
+#include "app/window_position.h"
 
 #include <QMainWindow>
 
@@ -10,6 +11,7 @@
 #include <string>
 
 class QMdiArea;
+class QMdiSubWindow;
 class QMenu;
 
 namespace kori::gui {
@@ -23,6 +25,11 @@ public:
     ~MainWindow() override;
 
     QMdiArea* mdiArea() const { return m_mdi; }
+    // On the first start (no size kept yet) the main window grows, within the screen, until a
+    // child window shows whole; what still does not fit is reached by the work area's scroll
+    // bars. A size the user chose is left alone.
+    void FitChild(QMdiSubWindow* child);
+    bool firstStart() const { return m_firstStart; }
     QtProgress& progress() { return *m_progress; }
 
     // Sets the caption from the current data folder.
@@ -53,6 +60,7 @@ private:
     void AddItems(QMenu* menu, const std::vector<app::MenuItem>& items);
     app::MenuConditions Conditions() const;
     void ShowAbout();
+    app::PixelSize FreeScreen() const;
 
     app::Session& m_session;
     QMdiArea* m_mdi;
@@ -62,6 +70,7 @@ private:
     bool m_modal = false;
     bool m_ending = false;
     bool m_hideDownloadProgram = false;
+    bool m_firstStart = false;
 };
 
 } // namespace kori::gui
