@@ -40,7 +40,12 @@ int RunKori(int argc, const char* const* argv, std::ostream& out, std::ostream& 
         err << "kori: " << e.what() << "\n";
         return 1;
     }
+    // Results that did not reach their reader (a full disk, a closed pipe) are a failure too.
     out.flush();
+    if (!out) {
+        err << "kori: cannot write the output\n";
+        return 1;
+    }
     return 0;
 }
 

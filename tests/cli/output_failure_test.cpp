@@ -122,5 +122,24 @@ TEST_F(KoriOnAFullDisk, EveryOutputWorksAgainWithRoom) {
     EXPECT_EQ(ReadFile(out).substr(0, 4), "%PDF");
 }
 
+// Standard output on a full disk: the buffer takes nothing.
+class FullBuffer : public std::streambuf {
+protected:
+    int_type overflow(int_type) override { return traits_type::eof(); }
+    std::streamsize xsputn(const char*, std::streamsize) override { return 0; }
+};
+
+TEST_F(KoriOnAFullDisk, ResultsThatCannotBeWrittenFailTheCommand) {
+    FullBuffer full;
+    std::ostream out(&full);
+    std::ostringstream err;
+    const std::vector<std::string> args{"kori", "names", "--json", "--root", Root()};
+    std::vector<const char*> argv;
+    for (const auto& a : args)
+        argv.push_back(a.c_str());
+    EXPECT_EQ(cli::RunKori(static_cast<int>(argv.size()), argv.data(), out, err), 1);
+    EXPECT_EQ(err.str(), "kori: cannot write the output\n");
+}
+
 } // namespace
 } // namespace kori::test
