@@ -102,36 +102,38 @@ TEST(MainWindow, AboutNamesTheVersionOfThisBuild) {
     gui::MainWindow w(f.session);
     EXPECT_TRUE(w.AboutText().startsWith(QStringLiteral("KORI Charting\nVersion 8.0\n")))
         << w.AboutText().toStdString();
-    TEST(MainWindow, FirstStartShowsChartSelectionWholeOrScrollsToIt) {
-        test::SampleSession s;
-        gui::MainWindow main{s.session};
-        gui::RegisterWindows(main);
-        main.show();
-        QApplication::processEvents();
-        ASSERT_TRUE(main.firstStart());
-        EXPECT_GT(main.width(), 640) << "not the clipping design size";
-        EXPECT_GT(main.height(), 480);
-        const QRect free = main.screen()->availableGeometry();
-        EXPECT_LE(main.width(), free.width());
-        EXPECT_LE(main.height(), free.height());
+}
 
-        ASSERT_TRUE(main.Trigger("mnuChartDisplay"));
-        QApplication::processEvents();
-        QMdiSubWindow* sel = nullptr;
-        for (auto* w : main.mdiArea()->subWindowList())
-            if (qobject_cast<gui::ChtSel*>(w->widget())) sel = w;
-        ASSERT_NE(sel, nullptr);
-        const QRect area = main.mdiArea()->viewport()->rect();
-        const bool whole = area.contains(sel->geometry());
-        const bool scrolls = main.mdiArea()->horizontalScrollBar()->isVisible() ||
-                             main.mdiArea()->verticalScrollBar()->isVisible();
-        EXPECT_TRUE(whole || scrolls) << "clipped with no way to reach the rest";
-        // Where the screen has the room, nothing needs scrolling.
-        if (free.width() >= 1200 && free.height() >= 900) EXPECT_TRUE(whole);
+TEST(MainWindow, FirstStartShowsChartSelectionWholeOrScrollsToIt) {
+    test::SampleSession s;
+    gui::MainWindow main{s.session};
+    gui::RegisterWindows(main);
+    main.show();
+    QApplication::processEvents();
+    ASSERT_TRUE(main.firstStart());
+    EXPECT_GT(main.width(), 640) << "not the clipping design size";
+    EXPECT_GT(main.height(), 480);
+    const QRect free = main.screen()->availableGeometry();
+    EXPECT_LE(main.width(), free.width());
+    EXPECT_LE(main.height(), free.height());
 
-        // A size kept from an earlier run is the size the next run opens at.
-        app::SaveMainWindowPlace(s.settings, {0, 0, 700 * 15, 500 * 15}, gui::ScreenTwips(&main));
-        gui::MainWindow again{s.session};
-        EXPECT_FALSE(again.firstStart());
-        EXPECT_EQ(again.size(), QSize(700, 500));
-    }
+    ASSERT_TRUE(main.Trigger("mnuChartDisplay"));
+    QApplication::processEvents();
+    QMdiSubWindow* sel = nullptr;
+    for (auto* w : main.mdiArea()->subWindowList())
+        if (qobject_cast<gui::ChtSel*>(w->widget())) sel = w;
+    ASSERT_NE(sel, nullptr);
+    const QRect area = main.mdiArea()->viewport()->rect();
+    const bool whole = area.contains(sel->geometry());
+    const bool scrolls = main.mdiArea()->horizontalScrollBar()->isVisible() ||
+                         main.mdiArea()->verticalScrollBar()->isVisible();
+    EXPECT_TRUE(whole || scrolls) << "clipped with no way to reach the rest";
+    // Where the screen has the room, nothing needs scrolling.
+    if (free.width() >= 1200 && free.height() >= 900) EXPECT_TRUE(whole);
+
+    // A size kept from an earlier run is the size the next run opens at.
+    app::SaveMainWindowPlace(s.settings, {0, 0, 700 * 15, 500 * 15}, gui::ScreenTwips(&main));
+    gui::MainWindow again{s.session};
+    EXPECT_FALSE(again.firstStart());
+    EXPECT_EQ(again.size(), QSize(700, 500));
+}
