@@ -231,8 +231,7 @@ TEST_F(KoriCommands, EachRunBuildsIntoItsOwnStreamAndRemovesIt) {
     EXPECT_EQ(ReadFile(temp / "TCht.Tmp"), "the chart window's own stream\r\n");
     EXPECT_EQ(ReadFile(Out("own.cht")).find("the chart window"), std::string::npos);
     EXPECT_NE(ReadFile(Out("own.cht")).find("HBK"), std::string::npos);
-    for (const auto& e : std::filesystem::directory_iterator(temp))
-        EXPECT_EQ(e.path().filename(), "TCht.Tmp") << "left behind: " << e.path();
+    EXPECT_EQ(FilesIn(temp), std::vector<std::string>{"TCht.Tmp"}) << "something left behind";
 }
 
 TEST_F(KoriCommands, JsonExportsCarryOddValuesAsUtf8TextAndNull) {

@@ -9,10 +9,6 @@
 
 #include <gtest/gtest.h>
 
-#include <filesystem>
-#include <string>
-#include <vector>
-
 namespace kori::gui {
 namespace {
 
@@ -117,10 +113,7 @@ TEST(PdfPrinter, A4PagesInDotsAndAWholeDocument) {
     EXPECT_TRUE(pdf->starts_with("%PDF"));
     EXPECT_NE(pdf->find("/Count 2"), std::string::npos);
     // The document and nothing beside it: no scratch file stays behind.
-    std::vector<std::string> left;
-    for (const auto& e : std::filesystem::directory_iterator(root.path()))
-        left.push_back(e.path().filename().string());
-    EXPECT_EQ(left, std::vector<std::string>{"chart.pdf"});
+    EXPECT_EQ(test::FilesIn(root.path()), std::vector<std::string>{"chart.pdf"});
 }
 
 TEST(PdfPrinter, PaperPlayerPrintsAPage) {

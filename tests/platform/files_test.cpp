@@ -9,6 +9,7 @@
 #include <sys/stat.h>
 
 using namespace kori::platform;
+using kori::test::FilesIn;
 using kori::test::TempRoot;
 
 TEST(Files, ResolverFindsAFileWhateverItsCase) {
@@ -32,16 +33,6 @@ TEST(Files, FolderTestsIgnoreTheClosingSeparatorAndBackSlashes) {
     EXPECT_TRUE(FileExists(root.path() / "empty"));
     EXPECT_FALSE(FileHasData(root.path() / "empty"));
 }
-
-namespace {
-std::vector<std::string> FilesIn(const std::filesystem::path& dir) {
-    std::vector<std::string> names;
-    for (const auto& e : std::filesystem::directory_iterator(dir))
-        names.push_back(e.path().filename().string());
-    std::sort(names.begin(), names.end());
-    return names;
-}
-} // namespace
 
 TEST(Files, AFailedAtomicWriteLeavesTheOldFileWholeAndNoScratch) {
     TempRoot root;

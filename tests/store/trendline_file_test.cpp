@@ -8,16 +8,6 @@
 
 using namespace kori::store;
 
-namespace {
-std::vector<std::string> FilesIn(const std::filesystem::path& dir) {
-    std::vector<std::string> names;
-    for (const auto& e : std::filesystem::directory_iterator(dir))
-        names.push_back(e.path().filename().string());
-    std::sort(names.begin(), names.end());
-    return names;
-}
-} // namespace
-
 TEST(TrendlineFile, RecordsRoundTripAndDeletedPlacesAreReusedThenPacked) {
     kori::test::TempRoot root;
     const auto path = TrendlineFile::PathFor(root.folder(), "BHP");
@@ -41,7 +31,7 @@ TEST(TrendlineFile, RecordsRoundTripAndDeletedPlacesAreReusedThenPacked) {
     all = TrendlineFile::ReadAll(path);
     ASSERT_EQ(all.size(), 1u);
     EXPECT_EQ(all[0].Period, 'M');
-    EXPECT_EQ(FilesIn(root.path()), std::vector<std::string>{"BHP.TND"})
+    EXPECT_EQ(kori::test::FilesIn(root.path()), std::vector<std::string>{"BHP.TND"})
         << "no scratch file is left";
 }
 
@@ -59,7 +49,7 @@ TEST(TrendlineFile, AFailedPackLeavesTheFileWholeAndNoScratchBehind) {
         EXPECT_FALSE(TrendlineFile::Pack(path).ok());
     }
     EXPECT_EQ(root.Read("BHP.TND"), before);
-    EXPECT_EQ(FilesIn(root.path()), std::vector<std::string>{"BHP.TND"});
+    EXPECT_EQ(kori::test::FilesIn(root.path()), std::vector<std::string>{"BHP.TND"});
     ASSERT_TRUE(TrendlineFile::Pack(path).ok()) << "the fault ends with its scope";
     EXPECT_EQ(TrendlineFile::ReadAll(path).size(), 2u);
 }

@@ -3,6 +3,7 @@
 #include <filesystem>
 #include <string>
 #include <string_view>
+#include <vector>
 
 namespace kori::test {
 
@@ -22,6 +23,9 @@ public:
 private:
     std::filesystem::path m_path;
 };
+
+// The names of the files in `dir`, sorted: what a write left behind.
+std::vector<std::string> FilesIn(const std::filesystem::path& dir);
 
 // Path of a file under tests/fixtures.
 std::filesystem::path Fixture(std::string_view name);
