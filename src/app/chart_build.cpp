@@ -59,6 +59,9 @@ ChartOutcome BuildChartWithPanel(Session& session, const ChartJob& job, chart::C
     out.Panel = DrawSecurityOscillator(session, own, chart, panel, panelArea);
     if (*out.Panel != osc::OscOutcome::DailyOnly) {
         out.PanelShown = true;
+        // The panel is appended to the stream after the price chart: a failed write there
+        // leaves a torn stream, which the screen, the page and a saved chart must not use.
+        if (own.WriteStream) out.Status = chart.Stream.status();
         return out;
     }
     // The price chart goes back to the whole area.

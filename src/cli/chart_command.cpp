@@ -212,10 +212,7 @@ void Run(CliContext& ctx, const ChartOptions& o) {
     if (!o.split.empty()) ApplySplit(session, o.split, o, job, split);
     const auto build = [&](chart::Chart& into, platform::Surface& area) {
         split.Apply(job.Request);
-        const platform::Status s = BuildChartWithPanel(session, job, into, area, o.osc);
-        // The panel is added to the stream after the price chart: a failed write there too
-        // leaves a torn stream.
-        return s ? into.Stream.status() : s;
+        return BuildChartWithPanel(session, job, into, area, o.osc);
     };
 
     chart::Chart c;
