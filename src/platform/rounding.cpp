@@ -105,30 +105,6 @@ std::optional<Money> Money::Times(Money o) const {
     return Money(static_cast<std::int64_t>(product));
 }
 
-std::optional<Money> Money::Times(std::int64_t n) const {
-    std::int64_t product = 0;
-    if (__builtin_mul_overflow(m_raw, n, &product)) return std::nullopt;
-    return Money(product);
-}
-
-std::optional<Money> Money::DividedBy(std::int64_t n) const {
-    if (n == 0) return std::nullopt;
-    if (n == -1 && m_raw == std::numeric_limits<std::int64_t>::min()) return std::nullopt;
-    std::int64_t q = m_raw / n;
-    const std::int64_t r = m_raw % n;
-    // Twice the remainder against the divisor, in unsigned so neither can overflow.
-    const std::uint64_t twice = 2 * static_cast<std::uint64_t>(r < 0 ? -(r + 1) + 1ULL : r);
-    const std::uint64_t absN = n < 0 ? static_cast<std::uint64_t>(-(n + 1)) + 1 : n;
-    if (twice > absN || (twice == absN && q % 2 != 0)) q += (m_raw < 0) != (n < 0) ? -1 : 1;
-    return Money(q);
-}
-
-std::optional<Money> Money::Plus(Money o) const {
-    std::int64_t sum = 0;
-    if (__builtin_add_overflow(m_raw, o.m_raw, &sum)) return std::nullopt;
-    return Money(sum);
-}
-
 std::optional<double> Money::DividedBy(Money o) const {
     if (o.m_raw == 0) return std::nullopt;
     return static_cast<double>(m_raw) / static_cast<double>(o.m_raw);
