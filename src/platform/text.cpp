@@ -132,13 +132,14 @@ double Val(std::string_view text) {
     while (i < text.size() && IsBlank(text[i]))
         ++i;
     if (i + 1 < text.size() && text[i] == '&' && (text[i + 1] == 'H' || text[i + 1] == 'h')) {
-        long long v = 0;
+        // In a double: a hex run longer than any integer holds must not overflow.
+        double v = 0;
         std::size_t j = i + 2;
         while (j < text.size() && std::isxdigit(static_cast<unsigned char>(text[j]))) {
             v = v * 16 + std::stoi(std::string(1, text[j]), nullptr, 16);
             ++j;
         }
-        return static_cast<double>(v);
+        return v;
     }
     std::string num;
     if (i < text.size() && (text[i] == '-' || text[i] == '+')) num += text[i++];

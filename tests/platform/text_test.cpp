@@ -26,6 +26,8 @@ TEST(Text, ValReadsTheLeadingNumberElseZero) {
     EXPECT_EQ(Val("1E3"), 1000);
     EXPECT_EQ(Val("1E"), 1);
     EXPECT_EQ(Val("&HFF"), 255);
+    // Longer than any integer: a large number, not an overflow (caught by the fuzzing).
+    EXPECT_EQ(Val("&H10000000000000000"), 18446744073709551616.0);
     EXPECT_EQ(Val("-"), 0);
 }
 
