@@ -263,7 +263,7 @@ ChartEffects ChartWindowModel::MouseMove(double x, double y, bool leftHeld) {
     return fx;
 }
 
-ChartEffects ChartWindowModel::FibonacciClick(double x, double y) {
+ChartEffects ChartWindowModel::FibonacciClick(double y) {
     ChartEffects fx;
     const double price = m_chart->YToPrice(y);
     if (price <= 0) return fx;
@@ -329,7 +329,7 @@ ChartEffects ChartWindowModel::MousePress(double x, double y, ChartButton button
     case ChartTool::FibRetracement: {
         const double start = m_fibStart;
         const int stage = m_clickStage;
-        fx = FibonacciClick(x, y);
+        fx = FibonacciClick(y);
         if (stage == 1 && m_tool == ChartTool::FibRetracement && fx.Panes) {
             const auto levels = chart::FibonacciLevels(start, m_chart->YToPrice(y));
             Paint(picture, chart::FibonacciLines(frame, x, levels));

@@ -98,6 +98,10 @@ public:
     int PriceRecordCount() const;
 
     ChartEffects SetTool(ChartTool tool);
+    // A tool key pressed again puts the tool down.
+    ChartEffects ToggleTool(ChartTool tool) {
+        return SetTool(m_tool == tool ? ChartTool::None : tool);
+    }
     ChartTool tool() const { return m_tool; }
     int clickStage() const { return m_clickStage; }
     void SetCalendarTimeLines(bool calendar) { m_calendarLines = calendar; }
@@ -122,7 +126,7 @@ public:
 private:
     bool ToolsQuiet() const;
     bool InPanel(double y) const;
-    ChartEffects FibonacciClick(double x, double y);
+    ChartEffects FibonacciClick(double y);
     ChartEffects TextNote(double x, double y);
     void Paint(platform::Surface& picture, const std::vector<chart::Segment>& lines);
 

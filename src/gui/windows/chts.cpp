@@ -245,52 +245,26 @@ void Chts::BuildToolBar() {
     bar = m_toolbar2;
     add(
         "tline", "Trend", "Draw trendlines",
-        [this] {
-            SetTool(tool() == app::ChartTool::Trendline ? app::ChartTool::None
-                                                        : app::ChartTool::Trendline);
-        },
-        true);
+        [this] { Apply(m_model.ToggleTool(app::ChartTool::Trendline)); }, true);
     add(
         "terase", "Erase", "Delete a trendline", [this] { SetTool(app::ChartTool::Erase); }, true);
     add(
         "fib", "Fib", "Fibonacci retracement",
-        [this] {
-            SetTool(tool() == app::ChartTool::FibRetracement ? app::ChartTool::None
-                                                             : app::ChartTool::FibRetracement);
-        },
-        true);
+        [this] { Apply(m_model.ToggleTool(app::ChartTool::FibRetracement)); }, true);
     add(
         "sFibLines", "FibT", "Fibonacci time lines",
-        [this] {
-            SetTool(tool() == app::ChartTool::FibTimeLines ? app::ChartTool::None
-                                                           : app::ChartTool::FibTimeLines);
-        },
-        true);
+        [this] { Apply(m_model.ToggleTool(app::ChartTool::FibTimeLines)); }, true);
     add(
         "sGannAng", "Gann", "Gann angles",
-        [this] {
-            SetTool(tool() == app::ChartTool::Gann ? app::ChartTool::None : app::ChartTool::Gann);
-        },
-        true);
+        [this] { Apply(m_model.ToggleTool(app::ChartTool::Gann)); }, true);
     add(
-        "text", "Text", "Text notes",
-        [this] {
-            SetTool(tool() == app::ChartTool::Text ? app::ChartTool::None : app::ChartTool::Text);
-        },
+        "text", "Text", "Text notes", [this] { Apply(m_model.ToggleTool(app::ChartTool::Text)); },
         true);
     add(
         "sDayCount", "Days", "Count the days between two bars",
-        [this] {
-            SetTool(tool() == app::ChartTool::DayCount ? app::ChartTool::None
-                                                       : app::ChartTool::DayCount);
-        },
-        true);
+        [this] { Apply(m_model.ToggleTool(app::ChartTool::DayCount)); }, true);
     add(
-        "sZoom", "Zoom", "Zoom",
-        [this] {
-            SetTool(tool() == app::ChartTool::Zoom ? app::ChartTool::None : app::ChartTool::Zoom);
-        },
-        true);
+        "sZoom", "Zoom", "Zoom", [this] { Apply(m_model.ToggleTool(app::ChartTool::Zoom)); }, true);
     m_toolbar2->addSeparator();
     add("scroll", "Scroll", "Scroll through the history",
         [this] { ShowScrollBar(m_koriScroll->isHidden()); });
