@@ -1,0 +1,62 @@
+// The floor of every walk over the whole market: read each price file once, and the shared walk
+// over the name file that the scans, the update and the repair tools stand on.
+#include "synthetic_market.h"
+
+#include "platform/progress.h"
+#include "store/security_walk.h"
+
+#include <benchmark/benchmark.h>
+
+#include <cstdlib>
+
+namespace {
+
+using namespace kori;
+
+std::filesystem::path MarketFolder() {
+    if (const char* dir = std::getenv("KORI_BENCH_MARKET")) return dir;
+    return std::filesystem::temp_directory_path() / "kori-bench-market-2000x5000";
+}
+
+const std::string& Market() {
+    static const std::string folder = bench::MakeSyntheticMarket(MarketFolder());
+    return folder;
+}
+
+// Machine floor: open and read every price file whole, nothing else.
+void BM_ReadEveryPriceFile(benchmark::State& state) {
+    const std::string folder = Market();
+    std::vector<std::string> files;
+    for (int i = 0; i < bench::MarketShape{}.Securities; ++i)
+        files.push_back(folder + bench::SyntheticCode(i) + ".WDT");
+    std::string buffer(5000 * store::PriceRecord::kSize, '\0');
+    for (auto _ : state) {
+        std::size_t total = 0;
+        for (const auto& f : files) {
+            std::FILE* fp = std::fopen(f.c_str(), "rb");
+            total += std::fread(buffer.data(), 1, buffer.size(), fp);
+            std::fclose(fp);
+        }
+        benchmark::DoNotOptimize(total);
+    }
+}
+BENCHMARK(BM_ReadEveryPriceFile)->Unit(benchmark::kMillisecond)->UseRealTime();
+
+// The shared walk alone: name file, limits, each price file's length checked.
+void BM_ForEachSecurity(benchmark::State& state) {
+    const store::SecurityList list{Market(), 0};
+    platform::NullProgress progress;
+    for (auto _ : state) {
+        int seen = 0;
+        const auto result = store::ForEachSecurity(list, progress, [&](const store::WalkItem&) {
+            ++seen;
+            return store::WalkStep::Continue;
+        });
+        benchmark::DoNotOptimize(result.Visited + seen);
+    }
+}
+BENCHMARK(BM_ForEachSecurity)->Unit(benchmark::kMillisecond)->UseRealTime();
+
+} // namespace
+
+BENCHMARK_MAIN();
