@@ -5,7 +5,6 @@
 #include "platform/date_text.h"
 #include "platform/files.h"
 #include "platform/text.h"
-#include "store/name_file.h"
 
 #include <CLI/CLI.hpp>
 
@@ -84,45 +83,20 @@ void AddDataCommand(CLI::App* parent, CliContext& ctx) {
         if (o->format == "day" && o->output.empty())
             throw CliError{"Day files need a folder: -o DIR"};
         auto& session = ctx.OpenSession();
-        const maint::DateRange range{o->from, o->to};
-        std::string csv;
-        maint::DayFiles days;
-        auto add = [&](const std::string& code, const std::filesystem::path& path, bool withCode) {
-            store::PriceFile file(path);
-            std::vector<store::PriceRecord> records;
-            if (auto s = file.ReadAll(records); !s) throw CliError{s.message()};
-            if (o->format == "day") {
-                days.Add(code, records, range);
-                return;
-            }
-            auto part = maint::HistoryCsv(code, records, range, withCode);
-            csv += csv.empty() ? part : part.substr(part.find('\n') + 1);
-        };
-        if (!o->code.empty()) {
-            platform::Status why;
-            const auto found = store::FindCode(session.folders.DataFolder, o->code, why);
-            if (!why) throw CliError{why.message()};
-            if (!found) throw CliError{"No File For That Name: " + platform::Trim(o->code)};
-            add(found->Record.TrimmedCode(), found->CurrentFile, false);
-        } else {
-            const store::SecurityList list{session.folders.DataFolder, ListLetter(o->list)};
-            const auto walk = store::ForEachSecurity(
-                list, session.services().progress, [&](const store::WalkItem& it) {
-                    add(it.Name.TrimmedCode(), it.PriceFile, true);
-                    return store::WalkStep::Continue;
-                });
-            if (!walk.Status) throw CliError{walk.Status.message()};
-            for (const auto& issue : walk.Issues)
-                ctx.err << "kori: " << issue.text << "\n";
-            if (walk.Cancelled) throw CliError{"Export cancelled", 3};
-        }
+        const store::SecurityList list{session.folders.DataFolder, ListLetter(o->list)};
+        const auto r = maint::ExportData(list, o->code, {o->from, o->to}, o->format == "day",
+                                         session.services().progress);
+        if (!r.Status) throw CliError{r.Status.message()};
+        for (const auto& issue : r.Skipped)
+            ctx.err << "kori: " << issue.text << "\n";
+        if (r.Cancelled) throw CliError{"Export cancelled", 3};
         if (o->format == "day") {
             std::vector<std::string> written;
-            if (auto s = days.WriteTo(o->output, &written); !s) throw CliError{s.message()};
+            if (auto s = r.Days.WriteTo(o->output, &written); !s) throw CliError{s.message()};
             ctx.err << written.size() << " day files written to " << o->output << "\n";
             return;
         }
-        Deliver(ctx, csv, o->output);
+        Deliver(ctx, r.Csv, o->output);
     });
 }
 

@@ -3,6 +3,7 @@
 #include "platform/date_text.h"
 #include "platform/files.h"
 #include "platform/text.h"
+#include "store/name_file.h"
 
 #include <charconv>
 
@@ -117,6 +118,44 @@ std::string HistoryCsv(std::string_view code, const std::vector<store::PriceReco
                PriceText(r.Low) + "," + PriceText(r.Close) + "," + std::to_string(r.Volume) + "\n";
     }
     return csv;
+}
+
+DataExport ExportData(const store::SecurityList& list, std::string_view code,
+                      const DateRange& range, bool dayFiles, platform::Progress& progress) {
+    DataExport out;
+    auto add = [&](const std::string& c, const std::filesystem::path& path, bool withCode) {
+        std::vector<store::PriceRecord> records;
+        if (auto s = store::PriceFile(path).ReadAll(records); !s) return s;
+        if (dayFiles) {
+            out.Days.Add(c, records, range);
+        } else {
+            auto part = HistoryCsv(c, records, range, withCode);
+            out.Csv += out.Csv.empty() ? part : part.substr(part.find('\n') + 1);
+        }
+        ++out.Securities;
+        return platform::Status::Ok();
+    };
+    if (!code.empty()) {
+        platform::Status why;
+        const auto found = store::FindCode(list.DataFolder, code, why);
+        if (!why)
+            out.Status = why;
+        else if (!found)
+            out.Status = platform::Status::Error("No File For That Name");
+        else
+            out.Status = add(found->Record.TrimmedCode(), found->CurrentFile, false);
+        return out;
+    }
+    const auto walk = store::ForEachSecurity(list, progress, [&](const store::WalkItem& it) {
+        if (auto s = add(it.Name.TrimmedCode(), it.PriceFile, true); !s)
+            out.Skipped.push_back(
+                {platform::Severity::Warning, s.message(), it.PriceFile.filename().string(), 0});
+        return store::WalkStep::Continue;
+    });
+    out.Status = walk.Status;
+    out.Cancelled = walk.Cancelled;
+    out.Skipped.insert(out.Skipped.end(), walk.Issues.begin(), walk.Issues.end());
+    return out;
 }
 
 std::string DayFileName(std::string_view d) {

@@ -2,6 +2,7 @@
 // Text exports of the library: the closing prices of one day for a list, and the records of a
 // security or a list over a date range, as CSV or as day files in the download format, so that
 // an export reads back in unchanged.
+#include "platform/issues.h"
 #include "platform/progress.h"
 #include "platform/status.h"
 #include "store/price_file.h"
@@ -58,6 +59,20 @@ public:
 private:
     std::map<std::string, std::string> m_lines; // by date, the lines of that day
 };
+
+struct DataExport {
+    platform::Status Status;
+    std::string Csv; // CSV output
+    DayFiles Days;   // day-file output
+    int Securities = 0;
+    bool Cancelled = false;
+    platform::Issues Skipped; // securities of a list whose price file could not be read
+};
+
+// The records of one security (`code`) or, with `code` empty, of the securities of `list`, in
+// the range: CSV (a list's with a Code column) or, with `dayFiles`, day files.
+DataExport ExportData(const store::SecurityList& list, std::string_view code,
+                      const DateRange& range, bool dayFiles, platform::Progress& progress);
 
 // The name of the day file of a date: "20080115" -> "15JAN08.D".
 std::string DayFileName(std::string_view yyyymmdd);
