@@ -730,7 +730,9 @@ FillResult FillNoTradeDays(const std::string& folder, const std::string& dayDate
             if (item.Name.RecordType != 4) return store::WalkStep::Continue;
             store::PriceFile pf(item.PriceFile);
             if (result.Status = pf.Open(); !result.Status) return store::WalkStep::Stop;
-            if (pf.Count() < 1) return store::WalkStep::Continue;
+            // A full file was refused by the update itself; the fill passes it by.
+            if (pf.Count() < 1 || pf.Count() >= store::kMaxRecords)
+                return store::WalkStep::Continue;
             PriceRecord last;
             if (result.Status = pf.Read(pf.Count(), last); !result.Status)
                 return store::WalkStep::Stop;
