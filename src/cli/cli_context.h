@@ -60,5 +60,6 @@ void AddChartCommand(CLI::App& app, CliContext& ctx);
 void AddScaleCommand(CLI::App& app, CliContext& ctx);
 void AddIndicatorCommand(CLI::App& app, CliContext& ctx);
 void AddUpdateCommand(CLI::App& app, CliContext& ctx);
+void AddCheckCommand(CLI::App& app, CliContext& ctx);
 
 } // namespace kori::cli
