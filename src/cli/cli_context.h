@@ -59,6 +59,7 @@ void AddPlayCommand(CLI::App& app, CliContext& ctx);
 void AddChartCommand(CLI::App& app, CliContext& ctx);
 void AddScaleCommand(CLI::App& app, CliContext& ctx);
 void AddIndicatorCommand(CLI::App& app, CliContext& ctx);
+void AddUpdateCommand(CLI::App& app, CliContext& ctx);
 void AddCheckCommand(CLI::App& app, CliContext& ctx);
 void AddExportCommand(CLI::App& app, CliContext& ctx);
 

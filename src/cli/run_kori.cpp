@@ -28,6 +28,7 @@ int RunKori(int argc, const char* const* argv, std::ostream& out, std::ostream& 
     AddChartCommand(app, ctx);
     AddScaleCommand(app, ctx);
     AddIndicatorCommand(app, ctx);
+    AddUpdateCommand(app, ctx);
     AddCheckCommand(app, ctx);
     AddExportCommand(app, ctx);
 
