@@ -1,6 +1,7 @@
 #include "gui/windows/register_windows.h"
 
 #include "gui/windows/chart_windows.h"
+#include "gui/windows/entry_windows.h"
 #include "gui/windows/list_windows.h"
 #include "gui/windows/main_window.h"
 #include "gui/windows/settings_windows.h"
@@ -12,6 +13,7 @@ void RegisterWindows(MainWindow& main) {
     RegisterSettingsWindows(main);
     RegisterChartWindows(main);
     RegisterListWindows(main);
+    RegisterEntryWindows(main);
     main.RebuildMenus();
 }
 
