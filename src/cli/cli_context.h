@@ -60,5 +60,6 @@ void AddChartCommand(CLI::App& app, CliContext& ctx);
 void AddScaleCommand(CLI::App& app, CliContext& ctx);
 void AddIndicatorCommand(CLI::App& app, CliContext& ctx);
 void AddTargetsCommand(CLI::App& app, CliContext& ctx);
+void AddEntryCommand(CLI::App& app, CliContext& ctx);
 
 } // namespace kori::cli

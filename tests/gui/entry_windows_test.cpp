@@ -1,6 +1,7 @@
 // The targets, keyboard entry and import windows on the sample library, opened from the menus
 // and driven as the user would, with what they leave on disk.
 #include "gui/widgets/grid_view.h"
+#include "gui/windows/data_entry.h"
 #include "gui/windows/main_window.h"
 #include "gui/windows/register_windows.h"
 #include "gui/windows/targets.h"
@@ -9,8 +10,12 @@
 
 #include <QAction>
 #include <QApplication>
+#include <QCheckBox>
 #include <QLabel>
+#include <QLineEdit>
 #include <QMenuBar>
+#include <QPushButton>
+#include <QTest>
 #include <gtest/gtest.h>
 
 using namespace kori;
@@ -74,4 +79,42 @@ TEST_F(EntryWindows, TargetsOpensFromTheMenuEditsAndSaves) {
     EXPECT_EQ(file.find("FRG"), std::string::npos);
     EXPECT_FALSE(w->form().changed());
     w->reject();
+}
+
+TEST_F(EntryWindows, DataEntryShowsTheRecordTypesFieldsAndSaves) {
+    ASSERT_TRUE(main.Trigger("mnuKBUpdate"));
+    auto* w = main.findChild<gui::DataEntry*>();
+    ASSERT_NE(w, nullptr);
+    EXPECT_EQ(w->windowTitle(), "Data Entry - Keyboard");
+    EXPECT_EQ(w->findChild<QCheckBox*>("Check1")->text(), "Auto Date Advance");
+    EXPECT_EQ(w->findChild<QCheckBox*>("Check2")->text(), "Advance after Save");
+    EXPECT_EQ(w->codeField()->text(), "XAO");
+    EXPECT_EQ(w->findChild<QLabel*>("lblRecType")->text(), "Rec.Tp  1");
+    EXPECT_EQ(w->dateField()->text(), "23/11/26");
+
+    w->codeField()->setText("advdec");
+    QTest::keyClick(w->codeField(), Qt::Key_Return);
+    EXPECT_EQ(w->findChild<QLabel*>("lblName")->text(), "Advance Decline Line (sample)");
+    EXPECT_EQ(w->figureLabel(1)->text(), "Rises");
+    EXPECT_EQ(w->figureLabel(3)->text(), "Cum.Total");
+    EXPECT_TRUE(w->figureField(0)->isHidden());
+    EXPECT_TRUE(w->figureField(4)->isHidden());
+
+    w->codeField()->setText("KRM");
+    QTest::keyClick(w->codeField(), Qt::Key_Return);
+    EXPECT_EQ(w->figureLabel(4)->text(), "Volume");
+    EXPECT_FALSE(w->figureField(4)->isHidden());
+    const std::string prevClose = w->previousLabel(3)->text().toStdString();
+    EXPECT_FALSE(prevClose.empty());
+    const char* figures[] = {"3.10", "3.30", "0", "3.20", "5000"};
+    for (int i = 0; i < 5; ++i)
+        w->figureField(i)->setText(figures[i]);
+    QTest::mouseClick(w->findChild<QPushButton*>("Command1"), Qt::LeftButton);
+    EXPECT_EQ(s.dialogs.shown().back().text, "Data should not be 0\nUse previous close ");
+    w->figureField(2)->setText("3.00");
+    QTest::mouseClick(w->findChild<QPushButton*>("Command1"), Qt::LeftButton);
+    EXPECT_EQ(w->previousLabel(3)->text(), "3.20") << "the day saved is now the previous one";
+    EXPECT_EQ(w->dateField()->text(), "24/11/26");
+    EXPECT_TRUE(w->figureField(3)->text().isEmpty());
+    QTest::mouseClick(w->findChild<QPushButton*>("Command3"), Qt::LeftButton);
 }

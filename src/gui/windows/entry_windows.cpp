@@ -1,5 +1,6 @@
 #include "gui/windows/entry_windows.h"
 
+#include "gui/windows/data_entry.h"
 #include "gui/windows/main_window.h"
 #include "gui/windows/targets.h"
 
@@ -20,6 +21,9 @@ template <typename Make> void ShowOnce(MainWindow& main, const char* name, Make 
 } // namespace
 
 void RegisterEntryWindows(MainWindow& main) {
+    main.SetAction("DataEntry", [&main] {
+        ShowOnce(main, "DataEntry", [&main] { return new DataEntry(main.session(), &main); });
+    });
     main.SetAction("Targets", [&main] {
         ShowOnce(main, "Targets", [&main] { return new Targets(main.session(), &main); });
     });

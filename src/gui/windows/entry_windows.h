@@ -5,7 +5,7 @@ namespace kori::gui {
 
 class MainWindow;
 
-// Adds the actions of the targets window ("Quoren Alerts").
+// Adds the actions of "Data Entry via &Keyboard" and of the targets window ("Quoren Alerts").
 void RegisterEntryWindows(MainWindow& main);
 
 } // namespace kori::gui
