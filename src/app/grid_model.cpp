@@ -19,7 +19,7 @@ const std::string& GridModel::cell(int row, int column) const {
 }
 
 CellVerdict GridModel::Check(int column, const std::string& text) const {
-    if (!m_check) return {true, text, {}};
+    if (!m_check) return {true, text, {}, {}};
     return m_check(column, text);
 }
 
@@ -37,7 +37,7 @@ void GridModel::Load(std::vector<Row> rows) {
 
 CellVerdict GridModel::SetCell(int row, int column, std::string text) {
     if (row < 0 || row >= rowCount() || column < 0 || column >= columnCount())
-        return {false, text, "No such cell"};
+        return {false, text, "No such cell", {}};
     CellVerdict v = Check(column, text);
     m_rows[static_cast<std::size_t>(row)][static_cast<std::size_t>(column)] =
         v.Accepted ? v.Text : text;
@@ -64,7 +64,7 @@ std::optional<CellRefusal> GridModel::FirstRefusal() const {
     for (int r = 0; r < rowCount(); ++r)
         for (int c = 0; c < columnCount(); ++c) {
             const CellVerdict v = Check(c, cell(r, c));
-            if (!v.Accepted) return CellRefusal{r, c, v.Message};
+            if (!v.Accepted) return CellRefusal{r, c, v.Message, v.Title};
         }
     return std::nullopt;
 }

@@ -16,11 +16,13 @@ struct CellVerdict {
     bool Accepted = true;
     std::string Text;
     std::string Message;
+    std::string Title; // of the message box; empty: the grid's own title
 };
 
 struct CellRefusal {
     int Row = 0, Column = 0;
     std::string Message;
+    std::string Title; // empty: the grid's own title
 };
 
 class GridModel {

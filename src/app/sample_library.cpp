@@ -2,9 +2,11 @@
 
 #include "platform/date_text.h"
 #include "platform/files.h"
+#include "platform/number_format.h"
 #include "store/chart_list.h"
 #include "store/name_file.h"
 #include "store/price_file.h"
+#include "store/targets_file.h"
 
 #include <algorithm>
 #include <cmath>
@@ -215,6 +217,27 @@ platform::Status WriteClassFiles(const std::string& systemFolder) {
     return platform::WriteFileAtomic(platform::ResolveIn(systemFolder, "Gics.dat"), gics);
 }
 
+// Targets that the last day of the sample meets in each of the four ways, and a security on two
+// lines whose targets stay out of reach, worked out from that day's prices.
+platform::Status WriteSampleTargets(const std::string& systemFolder,
+                                    const std::map<std::string, store::PriceRecord>& lastDay) {
+    const auto price = [](float p) { return platform::FormatSingle(p, "0.00#"); };
+    const auto& frg = lastDay.at("FRG");
+    const auto& gln = lastDay.at("GLN");
+    const auto& twr = lastDay.at("TWR");
+    const auto& vnt = lastDay.at("VNT");
+    const auto& yra = lastDay.at("YRA");
+    const std::vector<store::TargetLine> lines = {
+        {"FRG", price(frg.Low), "U"},          // the day's low: reached
+        {"GLN", price(gln.Low * 0.95f), "U"},  // below the whole day: exceeded
+        {"TWR", price(twr.High), "D"},         // the day's high: reached
+        {"VNT", price(vnt.High * 1.05f), "D"}, // above the whole day: exceeded
+        {"YRA", price(yra.High * 1.1f), "U"},  // out of reach either way
+        {"YRA", price(yra.Low * 0.9f), "D"},
+    };
+    return store::WriteTargetsFile(store::TargetsFilePath(systemFolder), lines);
+}
+
 } // namespace
 
 platform::Status MakeSampleLibrary(const std::string& systemFolder, const std::string& dataFolder,
@@ -223,6 +246,7 @@ platform::Status MakeSampleLibrary(const std::string& systemFolder, const std::s
     const auto dates = Weekdays();
     Random rng(20261120);
     std::vector<store::NameRecord> names;
+    std::map<std::string, store::PriceRecord> lastDay;
     summary = SampleSummary{};
     for (const auto& s : Securities()) {
         store::NameRecord n;
@@ -242,6 +266,7 @@ platform::Status MakeSampleLibrary(const std::string& systemFolder, const std::s
         store::PriceFile pf(store::PriceFile::PathFor(dataFolder, s.code));
         if (auto st = pf.WriteAll(recs); !st) return st;
         summary.Records += static_cast<int>(recs.size());
+        lastDay[s.code] = recs.back();
     }
     names[names.size() - 4].OtherDetails = "Exp 30/06/27"; // a warrant's details
     names[3].PercentBandUp = 8;
@@ -252,6 +277,7 @@ platform::Status MakeSampleLibrary(const std::string& systemFolder, const std::s
     summary.LastDate = kLastDate;
 
     if (auto st = WriteClassFiles(systemFolder); !st) return st;
+    if (auto st = WriteSampleTargets(systemFolder, lastDay); !st) return st;
     if (auto st = store::SaveListFromCodes(dataFolder, 'A', {"HBK", "IRB", "JNS", "KST", "LMT"});
         !st)
         return st;

@@ -60,6 +60,8 @@ void AddChartCommand(CLI::App& app, CliContext& ctx);
 void AddScaleCommand(CLI::App& app, CliContext& ctx);
 void AddIndicatorCommand(CLI::App& app, CliContext& ctx);
 void AddUpdateCommand(CLI::App& app, CliContext& ctx);
+void AddTargetsCommand(CLI::App& app, CliContext& ctx);
+void AddEntryCommand(CLI::App& app, CliContext& ctx);
 void AddCheckCommand(CLI::App& app, CliContext& ctx);
 void AddExportCommand(CLI::App& app, CliContext& ctx);
 

@@ -29,6 +29,8 @@ int RunKori(int argc, const char* const* argv, std::ostream& out, std::ostream& 
     AddScaleCommand(app, ctx);
     AddIndicatorCommand(app, ctx);
     AddUpdateCommand(app, ctx);
+    AddTargetsCommand(app, ctx);
+    AddEntryCommand(app, ctx);
     AddCheckCommand(app, ctx);
     AddExportCommand(app, ctx);
 

@@ -1,6 +1,7 @@
 #include "gui/windows/register_windows.h"
 
 #include "gui/windows/chart_windows.h"
+#include "gui/windows/entry_windows.h"
 #include "gui/windows/list_windows.h"
 #include "gui/windows/main_window.h"
 #include "gui/windows/settings_windows.h"
@@ -14,6 +15,7 @@ void RegisterWindows(MainWindow& main) {
     RegisterChartWindows(main);
     RegisterListWindows(main);
     RegisterToolWindows(main);
+    RegisterEntryWindows(main);
     main.RebuildMenus();
 }
 
