@@ -59,5 +59,7 @@ void AddPlayCommand(CLI::App& app, CliContext& ctx);
 void AddChartCommand(CLI::App& app, CliContext& ctx);
 void AddScaleCommand(CLI::App& app, CliContext& ctx);
 void AddIndicatorCommand(CLI::App& app, CliContext& ctx);
+// scan1, scan2, scan3, scan6, stats, adtotals.
+void AddScanCommands(CLI::App& app, CliContext& ctx);
 
 } // namespace kori::cli
