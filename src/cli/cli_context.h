@@ -61,5 +61,6 @@ void AddScaleCommand(CLI::App& app, CliContext& ctx);
 void AddIndicatorCommand(CLI::App& app, CliContext& ctx);
 // scan1, scan2, scan3, scan6, stats, adtotals.
 void AddScanCommands(CLI::App& app, CliContext& ctx);
+void AddCheckCommand(CLI::App& app, CliContext& ctx);
 
 } // namespace kori::cli

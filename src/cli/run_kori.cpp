@@ -29,6 +29,7 @@ int RunKori(int argc, const char* const* argv, std::ostream& out, std::ostream& 
     AddScaleCommand(app, ctx);
     AddIndicatorCommand(app, ctx);
     AddScanCommands(app, ctx);
+    AddCheckCommand(app, ctx);
 
     try {
         app.parse(argc, argv);

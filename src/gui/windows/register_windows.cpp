@@ -4,6 +4,7 @@
 #include "gui/windows/list_windows.h"
 #include "gui/windows/main_window.h"
 #include "gui/windows/settings_windows.h"
+#include "gui/windows/tool_windows.h"
 
 namespace kori::gui {
 
@@ -12,6 +13,7 @@ void RegisterWindows(MainWindow& main) {
     RegisterSettingsWindows(main);
     RegisterChartWindows(main);
     RegisterListWindows(main);
+    RegisterToolWindows(main);
     main.RebuildMenus();
 }
 
