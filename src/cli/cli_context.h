@@ -62,6 +62,8 @@ void AddIndicatorCommand(CLI::App& app, CliContext& ctx);
 void AddUpdateCommand(CLI::App& app, CliContext& ctx);
 void AddTargetsCommand(CLI::App& app, CliContext& ctx);
 void AddEntryCommand(CLI::App& app, CliContext& ctx);
+// scan1, scan2, scan3, scan6, stats, adtotals.
+void AddScanCommands(CLI::App& app, CliContext& ctx);
 void AddCheckCommand(CLI::App& app, CliContext& ctx);
 void AddExportCommand(CLI::App& app, CliContext& ctx);
 
