@@ -240,8 +240,10 @@ Status ChooseAdjustmentDate(std::string_view dataFolder, std::string_view code,
     out.Record = result;
     out.FirstShown = std::max(1, result - 20);
     const int last = std::min(h.Count, result + 20);
-    for (int r = out.FirstShown; r <= last; ++r)
+    for (int r = out.FirstShown; r <= last; ++r) {
         out.Lines.push_back(EntryLine(h.Date(r), h.Close(r)));
+        out.Dates.emplace_back(h.Date(r));
+    }
     out.Selected = result - out.FirstShown;
     out.RecordDate = std::string(h.Date(result));
     out.Close = h.Close(result);
@@ -359,6 +361,7 @@ Status RemoveLatestAdjustment(std::string_view dataFolder, std::string_view code
 
     // The reciprocal as the original arithmetic gives it, in single precision.
     const float m = 1.0f + (1.0f - f) / f;
+    const std::string note = platform::Trim(std::string_view(h.At(n) + kNote, kNoteWidth));
     for (int r = n; r >= 1; --r)
         if (!ScalePrices(h.At(r), m)) return WouldNotFit(h, r);
     codec::PutText(h.At(n) + kNote, "", kNoteWidth);
@@ -366,6 +369,8 @@ Status RemoveLatestAdjustment(std::string_view dataFolder, std::string_view code
     if (auto s = platform::WriteFileAtomic(h.Path, h.Bytes, kPriceScratch); !s) return s;
     out.Record = n;
     out.Factor = f;
+    out.Date = std::string(h.Date(n));
+    out.Note = note;
     return Status::Ok();
 }
 

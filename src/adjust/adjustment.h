@@ -70,6 +70,7 @@ struct DateChoice {
     int Record = 0;
     int FirstShown = 0;             // record number of Lines[0]
     std::vector<std::string> Lines; // "d/m/yy" padded, three blanks, close "######.00"
+    std::vector<std::string> Dates; // "yyyymmdd" of each line
     int Selected = -1;              // index into Lines of the chosen record
     std::string RecordDate;         // "yyyymmdd" of the chosen record
     float Close = 0;
@@ -137,6 +138,8 @@ struct Removed {
     int Entries = 0;  // adjustments found on file before this removal (0: none, nothing done)
     int Record = 0;   // the record whose adjustment was taken off
     float Factor = 0; // its factor
+    std::string Date; // "yyyymmdd" of that record
+    std::string Note; // the note it carried, trimmed
 };
 
 // `RemoveLatestAdjustment`, one step: finds the adjustments from record 2 up, takes the last,

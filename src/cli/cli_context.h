@@ -59,5 +59,6 @@ void AddPlayCommand(CLI::App& app, CliContext& ctx);
 void AddChartCommand(CLI::App& app, CliContext& ctx);
 void AddScaleCommand(CLI::App& app, CliContext& ctx);
 void AddIndicatorCommand(CLI::App& app, CliContext& ctx);
+void AddAdjustCommand(CLI::App& app, CliContext& ctx);
 
 } // namespace kori::cli
