@@ -1,5 +1,6 @@
 #include "gui/windows/register_windows.h"
 
+#include "gui/windows/adjust_windows.h"
 #include "gui/windows/chart_windows.h"
 #include "gui/windows/list_windows.h"
 #include "gui/windows/main_window.h"
@@ -12,6 +13,7 @@ void RegisterWindows(MainWindow& main) {
     RegisterSettingsWindows(main);
     RegisterChartWindows(main);
     RegisterListWindows(main);
+    RegisterAdjustWindows(main);
     main.RebuildMenus();
 }
 
