@@ -1,6 +1,7 @@
 // A manual adjustment and its removal on a 30,000-record history in the page cache, rewrite
 // included, beside the floor: reading and rewriting the same file with nothing else.
 #include "adjust/adjustment.h"
+#include "adjust/bulletin_filter.h"
 #include "bench_history.h"
 #include "platform/files.h"
 
@@ -97,6 +98,36 @@ void BM_ReadAndRewriteFloor(benchmark::State& state) {
     state.SetBytesProcessed(state.iterations() * static_cast<long long>(plain.size()));
 }
 BENCHMARK(BM_ReadAndRewriteFloor)->Unit(benchmark::kMillisecond);
+
+// A 5000-line bulletin of every action, with long names to shorten and warrants to test.
+void BM_FilterBulletin(benchmark::State& state) {
+    static constexpr const char* kForms[] = {
+        "nl,c%04d,asx.stk,0,n,Karoo Exploration Limited Macquarie Warrant,abc\r\n",
+        "ni,c%04d,asx.stk,0,n,Karoo Expl\r\n",
+        "di,c%04d,asx.stk,0,n,05jan24,,,12.5\r\n",
+        "bi,c%04dw,asx.stk,0,n,05jan24,1,4\r\n",
+        "nc,c%04d,asx.opt,0,n,05jan24,d%04d\r\n",
+        "dc,c%04d,lsx.stk,0,n,05jan24\r\n"};
+    std::string bulletin;
+    for (int i = 0; i < 5000; ++i) {
+        char line[128];
+        std::snprintf(line, sizeof line, kForms[i % 6], i, i);
+        bulletin += line;
+    }
+    adjust::BulletinOptions o;
+    o.DateStem = "05JAN24";
+    o.WarrantFilter = true;
+    o.NoShortNames = true;
+    o.Divs = adjust::DividendRule::MarkY;
+    o.HasPriceFile = [](std::string_view code) { return code.size() % 2 == 0; };
+    for (auto _ : state) {
+        auto lines = adjust::FilterBulletin(bulletin, o);
+        benchmark::DoNotOptimize(lines);
+        if (lines.size() < 3000) state.SkipWithError("lines lost");
+    }
+    state.SetBytesProcessed(state.iterations() * static_cast<long long>(bulletin.size()));
+}
+BENCHMARK(BM_FilterBulletin)->Unit(benchmark::kMillisecond);
 
 } // namespace
 
