@@ -60,5 +60,7 @@ void AddChartCommand(CLI::App& app, CliContext& ctx);
 void AddScaleCommand(CLI::App& app, CliContext& ctx);
 void AddIndicatorCommand(CLI::App& app, CliContext& ctx);
 void AddAdjustCommand(CLI::App& app, CliContext& ctx);
+void AddCheckCommand(CLI::App& app, CliContext& ctx);
+void AddExportCommand(CLI::App& app, CliContext& ctx);
 
 } // namespace kori::cli

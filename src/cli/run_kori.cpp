@@ -29,6 +29,8 @@ int RunKori(int argc, const char* const* argv, std::ostream& out, std::ostream& 
     AddScaleCommand(app, ctx);
     AddIndicatorCommand(app, ctx);
     AddAdjustCommand(app, ctx);
+    AddCheckCommand(app, ctx);
+    AddExportCommand(app, ctx);
 
     try {
         app.parse(argc, argv);

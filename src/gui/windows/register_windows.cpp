@@ -5,6 +5,7 @@
 #include "gui/windows/list_windows.h"
 #include "gui/windows/main_window.h"
 #include "gui/windows/settings_windows.h"
+#include "gui/windows/tool_windows.h"
 
 namespace kori::gui {
 
@@ -14,6 +15,7 @@ void RegisterWindows(MainWindow& main) {
     RegisterChartWindows(main);
     RegisterListWindows(main);
     RegisterAdjustWindows(main);
+    RegisterToolWindows(main);
     main.RebuildMenus();
 }
 
