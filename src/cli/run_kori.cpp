@@ -32,6 +32,7 @@ int RunKori(int argc, const char* const* argv, std::ostream& out, std::ostream& 
     AddTargetsCommand(app, ctx);
     AddEntryCommand(app, ctx);
     AddScanCommands(app, ctx);
+    AddAdjustCommand(app, ctx);
     AddCheckCommand(app, ctx);
     AddExportCommand(app, ctx);
 

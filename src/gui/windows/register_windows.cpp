@@ -1,5 +1,6 @@
 #include "gui/windows/register_windows.h"
 
+#include "gui/windows/adjust_windows.h"
 #include "gui/windows/chart_windows.h"
 #include "gui/windows/entry_windows.h"
 #include "gui/windows/list_windows.h"
@@ -14,6 +15,7 @@ void RegisterWindows(MainWindow& main) {
     RegisterSettingsWindows(main);
     RegisterChartWindows(main);
     RegisterListWindows(main);
+    RegisterAdjustWindows(main);
     RegisterToolWindows(main);
     RegisterEntryWindows(main);
     main.RebuildMenus();
