@@ -381,18 +381,25 @@ std::optional<std::string> OptionDetailsFromName(std::string_view name) {
         } else if (auto e = ExpiryOf(w); e && date.empty()) {
             date = std::to_string(e->day) + "/" + std::to_string(e->month) + "/" +
                    platform::Format(e->year % 100, "00");
-        } else if (CellNumber(w) && strike.empty()) {
-            strike = Trim(w);
+        } else if (const auto v = CellNumber(w); v && strike.empty()) {
+            strike = platform::Format(*v, "0.####"); // no trailing zeros: the field is short
+            if (strike.back() == '.') strike.pop_back();
         }
     }
     if (kind.empty()) return std::nullopt;
-    std::string out = date;
-    for (const std::string* part : {&strike, &kind}) {
-        if (part->empty()) continue;
-        if (!out.empty()) out += ' ';
-        out += *part;
-    }
-    return out.substr(0, 15);
+    const auto join = [](std::initializer_list<const std::string*> parts) {
+        std::string out;
+        for (const std::string* part : parts) {
+            if (part->empty()) continue;
+            if (!out.empty()) out += ' ';
+            out += *part;
+        }
+        return out;
+    };
+    // The strike goes when all three do not fit the 15 characters of the field.
+    std::string out = join({&date, &strike, &kind});
+    if (out.size() > 15) out = join({&date, &kind});
+    return out;
 }
 
 int RefreshOptionDetails(std::vector<TextRow>& rows) {
