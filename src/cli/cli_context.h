@@ -59,5 +59,7 @@ void AddPlayCommand(CLI::App& app, CliContext& ctx);
 void AddChartCommand(CLI::App& app, CliContext& ctx);
 void AddScaleCommand(CLI::App& app, CliContext& ctx);
 void AddIndicatorCommand(CLI::App& app, CliContext& ctx);
+void AddDataCommand(CLI::App& app, CliContext& ctx);
+void AddRepairCommand(CLI::App& app, CliContext& ctx);
 
 } // namespace kori::cli

@@ -28,6 +28,8 @@ int RunKori(int argc, const char* const* argv, std::ostream& out, std::ostream& 
     AddChartCommand(app, ctx);
     AddScaleCommand(app, ctx);
     AddIndicatorCommand(app, ctx);
+    AddDataCommand(app, ctx);
+    AddRepairCommand(app, ctx);
 
     try {
         app.parse(argc, argv);
