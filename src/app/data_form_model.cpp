@@ -47,7 +47,7 @@ bool DataFormModel::ShowData() {
         m_grid.Load({});
         return false;
     }
-    m_grid.Load(std::move(load.Rows));
+    m_grid.LoadInForm(std::move(load.Rows)); // the cells are as the checks would leave them
     return true;
 }
 
@@ -78,7 +78,7 @@ bool DataFormModel::SortData() {
         m_dialogs.MsgBox(std::string(dt::kSaveFailed) + "\n" + s.message(), dt::kTitle);
         return false;
     }
-    m_grid.Load(std::move(sorted)); // the file now holds what the grid shows
+    m_grid.LoadInForm(std::move(sorted)); // the file now holds what the grid shows
     return true;
 }
 

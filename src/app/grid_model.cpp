@@ -58,6 +58,13 @@ void GridModel::Load(std::vector<Row> rows) {
     m_changed = false;
 }
 
+void GridModel::LoadInForm(std::vector<Row> rows) {
+    m_rows = std::move(rows);
+    for (Row& r : m_rows)
+        if (r.size() != Width()) r.resize(Width());
+    m_changed = false;
+}
+
 void GridModel::ReplaceRows(std::vector<Row> rows) {
     m_rows = std::move(rows);
     PutInForm(m_rows);

@@ -55,6 +55,9 @@ public:
     // Rows as read from a file: cut or padded to the columns, each cell put in the form its
     // check gives where it passes. Nothing counts as changed.
     void Load(std::vector<Row> rows);
+    // Rows the program made already in the form their checks give: taken as they are, without
+    // running a check over every cell (a long file loads at the speed of its reading).
+    void LoadInForm(std::vector<Row> rows);
     // A cell the user left: kept in the form the check gives, or kept as typed when refused
     // (the verdict carries the message). Either way the grid has changed.
     CellVerdict SetCell(int row, int column, std::string text);

@@ -183,21 +183,32 @@ Status SaveNameFile(std::string_view dataFolder, const std::vector<NameRecord>& 
     return file.WriteAll(records, {"Names.dat.new", "names.bak"});
 }
 
-NameSortKey SortKeyOf(const NameRecord& r, NameSortOrder order) {
+namespace {
+
+// The key text of an order from the fields it reads.
+NameSortKey MakeKey(std::string_view code, std::string_view industry, std::string_view gics,
+                    std::int16_t category, std::int16_t type, NameSortOrder order) {
     std::string text;
     switch (order) {
     case NameSortOrder::Code:
-        text = r.TrimmedCode();
+        text = Trim(code);
         break;
     case NameSortOrder::Industry:
-        text = Trim(r.IndustryClass) + r.TrimmedCode();
+        text = Trim(industry) + Trim(code);
         break;
     case NameSortOrder::Gics:
-        text = Trim(r.GicsSector) + r.TrimmedCode();
+        text = Trim(gics) + Trim(code);
         break;
-    case NameSortOrder::Category:
-        text = platform::Format(r.Category, "000") + std::to_string(r.RecordType) + r.TrimmedCode();
+    case NameSortOrder::Category: {
+        char lead[8];
+        // "000" of the category, as the format gives a number of up to three digits.
+        if (category >= 0 && category <= 999)
+            std::snprintf(lead, sizeof lead, "%03d", static_cast<int>(category));
+        else
+            std::snprintf(lead, sizeof lead, "%s", platform::Format(category, "000").c_str());
+        text = std::string(lead) + std::to_string(type) + Trim(code);
         break;
+    }
     }
     NameSortKey key;
     key.fill(' ');
@@ -205,22 +216,38 @@ NameSortKey SortKeyOf(const NameRecord& r, NameSortOrder order) {
     return key;
 }
 
+struct KeyEntry {
+    NameSortKey Key;
+    std::size_t Index;
+};
+
+void SortKeys(std::vector<KeyEntry>& keys) {
+    ShellSort(keys, [](const KeyEntry& a, const KeyEntry& b) {
+        return std::memcmp(a.Key.data(), b.Key.data(), a.Key.size()) < 0;
+    });
+}
+
+std::int16_t Int16At(const char* p) {
+    return static_cast<std::int16_t>(static_cast<unsigned char>(p[0]) |
+                                     (static_cast<unsigned char>(p[1]) << 8));
+}
+
+} // namespace
+
+NameSortKey SortKeyOf(const NameRecord& r, NameSortOrder order) {
+    return MakeKey(r.Code, r.IndustryClass, r.GicsSector, r.Category, r.RecordType, order);
+}
+
 std::vector<NameRecord> SortNameRecords(const std::vector<NameRecord>& records,
                                         NameSortOrder order) {
-    struct Entry {
-        NameSortKey Key;
-        std::size_t Index;
-    };
-    std::vector<Entry> keys;
+    std::vector<KeyEntry> keys;
     keys.reserve(records.size());
     for (std::size_t i = 0; i < records.size(); ++i)
         if (records[i].Status != 1) keys.push_back({SortKeyOf(records[i], order), i});
-    ShellSort(keys, [](const Entry& a, const Entry& b) {
-        return std::memcmp(a.Key.data(), b.Key.data(), a.Key.size()) < 0;
-    });
+    SortKeys(keys);
     std::vector<NameRecord> out;
     out.reserve(keys.size());
-    for (const Entry& e : keys)
+    for (const KeyEntry& e : keys)
         out.push_back(records[e.Index]);
     return out;
 }
@@ -228,18 +255,33 @@ std::vector<NameRecord> SortNameRecords(const std::vector<NameRecord>& records,
 namespace {
 
 // A scratch file of the editor: written whole, no back-up; it holds nothing the user keeps.
-Status WriteScratchRecords(const std::filesystem::path& path,
-                           const std::vector<NameRecord>& records) {
-    std::string bytes;
-    bytes.reserve(records.size() * NameRecord::kSize);
-    for (const auto& r : records) {
-        const auto b = r.Encode();
-        bytes.append(b.data(), b.size());
-    }
+Status WriteScratch(const std::filesystem::path& path, const std::string& bytes) {
     std::ofstream out(path, std::ios::binary | std::ios::trunc);
     if (!out.write(bytes.data(), static_cast<std::streamsize>(bytes.size())) || !out.flush())
         return Status::Error("Cannot write " + path.string());
     return Status::Ok();
+}
+
+// The sort on the records as the scratch file holds them: keys read from their fields in
+// place, whole records copied in key order, those with `Status` 1 left out.
+std::string SortedRecordBytes(const std::string& bytes, NameSortOrder order) {
+    constexpr std::size_t size = NameRecord::kSize;
+    const std::size_t n = bytes.size() / size;
+    std::vector<KeyEntry> keys;
+    keys.reserve(n);
+    for (std::size_t i = 0; i < n; ++i) {
+        const char* p = bytes.data() + i * size;
+        if (Int16At(p) == 1) continue;
+        keys.push_back(
+            {MakeKey({p + 2, 6}, {p + 87, 3}, {p + 90, 4}, Int16At(p + 84), Int16At(p + 8), order),
+             i});
+    }
+    SortKeys(keys);
+    std::string out;
+    out.reserve(keys.size() * size);
+    for (const KeyEntry& e : keys)
+        out.append(bytes, e.Index * size, size);
+    return out;
 }
 
 } // namespace
@@ -252,13 +294,18 @@ Status SortNamesThroughFiles(std::string_view dataFolder, const std::vector<Name
     const auto wk2 = platform::ResolveIn(dataFolder, "Temp.WK2");
     const auto wk1 = platform::ResolveIn(dataFolder, "Temp.Wk1");
     progress.SetRange(100);
-    if (auto s = WriteScratchRecords(wk2, records); !s) return s;
+    std::string bytes;
+    bytes.reserve(records.size() * NameRecord::kSize);
+    for (const auto& r : records) {
+        const auto b = r.Encode();
+        bytes.append(b.data(), b.size());
+    }
+    if (auto s = WriteScratch(wk2, bytes); !s) return s;
     progress.SetValue(40);
-    std::vector<NameRecord> fromFile;
-    if (auto s = NameFile(wk2).ReadAll(fromFile); !s) return s;
-    const auto inOrder = SortNameRecords(fromFile, order);
+    const auto fromFile = platform::ReadWholeFile(wk2);
+    if (!fromFile) return Status::Error("Cannot read " + wk2.string());
+    if (auto s = WriteScratch(wk1, SortedRecordBytes(*fromFile, order)); !s) return s;
     progress.SetValue(60);
-    if (auto s = WriteScratchRecords(wk1, inOrder); !s) return s;
     std::error_code ec;
     std::filesystem::rename(wk1, wk2, ec);
     if (ec) return Status::Error("Cannot replace " + wk2.string() + ": " + ec.message());
