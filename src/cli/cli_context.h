@@ -61,5 +61,6 @@ void AddScaleCommand(CLI::App& app, CliContext& ctx);
 void AddIndicatorCommand(CLI::App& app, CliContext& ctx);
 void AddDataCommand(CLI::App& app, CliContext& ctx);
 void AddRepairCommand(CLI::App& app, CliContext& ctx);
+void AddCheckCommand(CLI::App& app, CliContext& ctx);
 
 } // namespace kori::cli

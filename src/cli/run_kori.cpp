@@ -30,6 +30,7 @@ int RunKori(int argc, const char* const* argv, std::ostream& out, std::ostream& 
     AddIndicatorCommand(app, ctx);
     AddDataCommand(app, ctx);
     AddRepairCommand(app, ctx);
+    AddCheckCommand(app, ctx);
 
     try {
         app.parse(argc, argv);

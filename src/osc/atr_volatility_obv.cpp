@@ -13,26 +13,29 @@ std::optional<Money> ToMoney(float v) {
 }
 
 // The largest of the bar's range and the two gaps to the close before, the range taking ties;
-// the gaps keep their sign. None when a price cannot be held in currency (not a number, or
+// the gaps keep their sign. False when a price cannot be held in currency (not a number, or
 // beyond its range), rather than a wrapped-around value.
-std::optional<Money> TrueRange(const store::ChartBar& bar, const store::ChartBar& before) {
+bool TrueRange(const store::ChartBar& bar, const store::ChartBar& before, Money& out) {
     const float a = bar.High - bar.Low;
     const float b = before.Close - bar.Low;
     const float c = bar.High - before.Close;
-    if (std::isnan(a) || std::isnan(b) || std::isnan(c)) return std::nullopt;
+    if (std::isnan(a) || std::isnan(b) || std::isnan(c)) return false;
     // The conversion keeps order, so the largest price converts to the largest currency.
-    return ToMoney(std::max({a, b, c}));
+    return Money::TryFromDouble(std::max({a, b, c}), out);
 }
 
 // The routine's first scale stops it when every non-zero true range is the same.
 bool HasSpread(const Series<Money>& tr) {
-    std::optional<Money> hi, lo;
+    bool any = false;
+    std::int64_t hi = 0, lo = 0;
     for (const auto& v : tr) {
         if (!v || v->raw() == 0) continue;
-        hi = hi ? std::max(*hi, *v) : *v;
-        lo = lo ? std::min(*lo, *v) : *v;
+        const std::int64_t raw = v->raw();
+        hi = any ? std::max(hi, raw) : raw;
+        lo = any ? std::min(lo, raw) : raw;
+        any = true;
     }
-    return !hi || *hi != *lo;
+    return !any || hi != lo;
 }
 
 std::int32_t AddVolume(std::int32_t obv, std::int64_t volume) {
@@ -51,13 +54,16 @@ AtrResult ComputeATR(const store::ChartSeries& series, std::int16_t period) {
     const int p = period;
     if (p <= 0) return r;
     // The average stops at the first bar whose true range cannot be held in currency.
+    // Values are kept in plain locals and stored once: copying optionals through the loop
+    // costs more than the arithmetic.
     std::size_t usable = r.tr.size();
     for (std::size_t i = 1; i < r.tr.size(); ++i) {
-        r.tr[i] = TrueRange(series.ChartBars[i], series.ChartBars[i - 1]);
-        if (!r.tr[i]) {
+        Money tr;
+        if (!TrueRange(series.ChartBars[i], series.ChartBars[i - 1], tr)) {
             usable = i;
             break;
         }
+        r.tr[i].emplace(tr);
     }
     r.NoSpread = !HasSpread(r.tr);
     if (r.NoSpread || usable <= static_cast<std::size_t>(p)) return r;
@@ -66,13 +72,17 @@ AtrResult ComputeATR(const store::ChartSeries& series, std::int16_t period) {
     float sum = 0.0f;
     for (std::size_t i = 1; i <= static_cast<std::size_t>(p); ++i)
         sum += r.tr[i]->ToFloat();
-    std::optional<Money> atr = ToMoney(sum / static_cast<float>(p));
-    for (std::size_t i = static_cast<std::size_t>(p) + 1; atr && i < usable; ++i) {
-        const Money before = *atr;
-        const auto scaled = atr->Times(p);
-        const auto total = scaled ? r.tr[i]->Plus(*scaled) : std::nullopt;
-        atr = total ? total->DividedBy(std::int64_t{p} + 1) : std::nullopt;
-        if (atr && before.raw() != 0) r.atr[i] = *atr;
+    const auto first = ToMoney(sum / static_cast<float>(p));
+    if (!first) return r;
+    Money atr = *first;
+    for (std::size_t i = static_cast<std::size_t>(p) + 1; i < usable; ++i) {
+        const Money before = atr;
+        const auto scaled = atr.Times(p);
+        if (!scaled) break;
+        const auto total = r.tr[i]->Plus(*scaled);
+        if (!total) break;
+        atr = *total->DividedBy(std::int64_t{p} + 1); // p + 1 > 0
+        if (before.raw() != 0) r.atr[i].emplace(atr);
     }
     return r;
 }

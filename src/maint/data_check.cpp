@@ -1,0 +1,283 @@
+#include "maint/data_check.h"
+
+#include "platform/date_text.h"
+#include "platform/number_format.h"
+#include "platform/text.h"
+
+#include <algorithm>
+#include <cmath>
+#include <filesystem>
+#include <unordered_map>
+
+namespace kori::maint {
+
+namespace {
+
+std::string Price(float v) {
+    return platform::FormatSingle(v, "0.00##");
+}
+
+bool IsWeekend(std::string_view date) {
+    const auto wd = platform::Weekday(date);
+    return wd && (*wd == 1 || *wd == 7);
+}
+
+class HistoryChecker {
+public:
+    HistoryChecker(const store::NameRecord& name, const DataCheckSettings& settings)
+        : m_code(name.TrimmedCode()), m_name(platform::Trim(name.Name)),
+          m_closeOnly(store::IsCloseOnly(name.RecordType)),
+          m_signed(name.RecordType == 3), // advance-decline totals may go below zero
+          m_settings(settings) {}
+
+    std::vector<Finding> Run(const std::vector<store::PriceRecord>& records) {
+        for (std::size_t i = 0; i < records.size(); ++i)
+            Check(records, static_cast<int>(i));
+        return std::move(m_findings);
+    }
+
+private:
+    void Add(const store::PriceRecord& r, int index, std::string_view what, std::string detail) {
+        m_findings.push_back(
+            {m_code, m_name, r.Date, index + 1, std::string(what), std::move(detail)});
+    }
+
+    void Check(const std::vector<store::PriceRecord>& records, int i) {
+        const auto& r = records[static_cast<std::size_t>(i)];
+        CheckDate(r, i);
+        CheckPrices(r, i);
+        if (r.Volume < 0) Add(r, i, finding::NegativeVolume, std::to_string(r.Volume));
+        CheckMove(records, i);
+    }
+
+    void CheckDate(const store::PriceRecord& r, int i) {
+        if (!platform::IsValidDateText(r.Date)) {
+            Add(r, i, finding::NotADate, "\"" + r.Date + "\"");
+            return;
+        }
+        if (IsWeekend(r.Date)) Add(r, i, finding::Weekend, platform::FormatDate(r.Date, "dddd"));
+        if (!m_lastDate.empty()) {
+            if (r.Date < m_lastDate) {
+                Add(r, i, finding::OutOfOrder, "after " + platform::DateTextToDisplay(m_lastDate));
+                return; // the order is broken: the last good date stays the reference
+            }
+            if (r.Date == m_lastDate) {
+                Add(r, i, finding::Duplicated, "also record " + std::to_string(m_lastIndex + 1));
+                return;
+            }
+            const int missing = WeekdaysBetween(m_lastDate, r.Date);
+            if (missing > m_settings.GapWeekdays)
+                Add(r, i, finding::Gap,
+                    std::to_string(missing) + " weekdays without a record since " +
+                        platform::DateTextToDisplay(m_lastDate));
+        }
+        m_lastDate = r.Date;
+        m_lastIndex = i;
+    }
+
+    void CheckPrices(const store::PriceRecord& r, int i) {
+        const float fields[] = {r.Open, r.High, r.Low, r.Close};
+        if (std::any_of(std::begin(fields), std::end(fields),
+                        [](float v) { return !std::isfinite(v); })) {
+            Add(r, i, finding::NotANumber, "");
+            return;
+        }
+        if (r.Close == 0 || m_signed) return; // no trade that day, or a signed series
+        if (m_closeOnly) {
+            if (r.Close < 0) Add(r, i, finding::ZeroPrice, "close " + Price(r.Close));
+            return;
+        }
+        if (r.Open <= 0 || r.High <= 0 || r.Low <= 0 || r.Close < 0) {
+            Add(r, i, finding::ZeroPrice,
+                "open " + Price(r.Open) + " high " + Price(r.High) + " low " + Price(r.Low) +
+                    " close " + Price(r.Close));
+            return;
+        }
+        if (r.High < r.Low) {
+            Add(r, i, finding::HighBelowLow, Price(r.High) + " < " + Price(r.Low));
+            return;
+        }
+        if (r.Open < r.Low || r.Open > r.High)
+            Add(r, i, finding::OpenOutside,
+                Price(r.Open) + " not in " + Price(r.Low) + " - " + Price(r.High));
+        if (r.Close < r.Low || r.Close > r.High)
+            Add(r, i, finding::CloseOutside,
+                Price(r.Close) + " not in " + Price(r.Low) + " - " + Price(r.High));
+    }
+
+    // An overnight move beyond the setting between two traded closes, with no adjustment
+    // factor on any record within two records of the move's day.
+    void CheckMove(const std::vector<store::PriceRecord>& records, int i) {
+        const auto& r = records[static_cast<std::size_t>(i)];
+        if (r.Close == 0 || !std::isfinite(r.Close) || m_signed) return;
+        if (m_lastTraded >= 0) {
+            const float before = records[static_cast<std::size_t>(m_lastTraded)].Close;
+            if (before > 0 && r.Close > 0) {
+                const double percent = (static_cast<double>(r.Close) / before - 1.0) * 100.0;
+                if (std::fabs(percent) > m_settings.MoveAlertPercent && !AdjustedNear(records, i)) {
+                    Add(r, i, finding::MissedAdjustment,
+                        platform::Format(percent, "+0.0;-0.0") + "% from " + Price(before) +
+                            " to " + Price(r.Close));
+                }
+            }
+        }
+        m_lastTraded = i;
+    }
+
+    static bool AdjustedNear(const std::vector<store::PriceRecord>& records, int i) {
+        const int first = std::max(0, i - 2);
+        const int last = std::min(static_cast<int>(records.size()) - 1, i + 2);
+        for (int k = first; k <= last; ++k)
+            if (records[static_cast<std::size_t>(k)].AdjFactor != 0) return true;
+        return false;
+    }
+
+    std::string m_code, m_name;
+    bool m_closeOnly, m_signed;
+    const DataCheckSettings& m_settings;
+    std::vector<Finding> m_findings;
+    std::string m_lastDate;
+    int m_lastIndex = -1;
+    int m_lastTraded = -1;
+};
+
+constexpr std::string_view kGapKey = "Data Check Gap Weekdays";
+constexpr std::string_view kStoppedKey = "Data Check Stopped Weekdays";
+constexpr std::string_view kMoveKey = "Data Check Move Percent";
+
+} // namespace
+
+DataCheckSettings LoadDataCheckSettings(const platform::SettingsStore& store) {
+    DataCheckSettings s;
+    auto read = [&](std::string_view key, double fallback, double low, double high) {
+        const std::string text = platform::Trim(store.Get(key, ""));
+        if (text.empty()) return fallback;
+        const double v = platform::Val(text);
+        return v >= low && v <= high ? v : fallback;
+    };
+    s.GapWeekdays = static_cast<int>(read(kGapKey, s.GapWeekdays, 1, 9999));
+    s.StoppedWeekdays = static_cast<int>(read(kStoppedKey, s.StoppedWeekdays, 1, 9999));
+    s.MoveAlertPercent = read(kMoveKey, s.MoveAlertPercent, 1, 10000);
+    return s;
+}
+
+void SaveDataCheckSettings(platform::SettingsStore& store, const DataCheckSettings& settings) {
+    store.Save(kGapKey, std::to_string(settings.GapWeekdays));
+    store.Save(kStoppedKey, std::to_string(settings.StoppedWeekdays));
+    store.Save(kMoveKey, platform::Format(settings.MoveAlertPercent, "0.##"));
+}
+
+int WeekdaysBetween(std::string_view fromDate, std::string_view toDate) {
+    const auto a = platform::DaySerial(fromDate);
+    const auto b = platform::DaySerial(toDate);
+    if (!a || !b || *b <= *a + 1) return 0;
+    // Serial 1 (31 December 1899) was a Sunday; count Mondays to Fridays in (a, b).
+    auto weekdaysUpTo = [](std::int32_t s) { // weekdays in serials 1..s
+        const std::int32_t weeks = s / 7, rest = s % 7;
+        // rest days after whole weeks start on a Sunday: Sun, Mon, ..., Sat
+        return weeks * 5 + std::clamp(rest - 1, 0, 5);
+    };
+    return static_cast<int>(weekdaysUpTo(*b - 1) - weekdaysUpTo(*a));
+}
+
+std::vector<Finding> CheckHistory(const store::NameRecord& name,
+                                  const std::vector<store::PriceRecord>& records,
+                                  const DataCheckSettings& settings) {
+    return HistoryChecker(name, settings).Run(records);
+}
+
+std::string LastValidDate(const std::vector<store::PriceRecord>& records) {
+    std::string last;
+    for (const auto& r : records)
+        if (platform::IsValidDateText(r.Date) && r.Date > last) last = r.Date;
+    return last;
+}
+
+std::vector<Finding> StoppedTrading(const store::NameRecord& name, std::string_view lastDate,
+                                    int lastRecord, std::string_view libraryLatest,
+                                    const DataCheckSettings& settings) {
+    if (lastDate.empty() || libraryLatest.empty()) return {};
+    const int behind = WeekdaysBetween(lastDate, libraryLatest) + 1;
+    if (behind <= settings.StoppedWeekdays) return {};
+    return {{name.TrimmedCode(), platform::Trim(name.Name), std::string(lastDate), lastRecord,
+             std::string(finding::Stopped),
+             "last record " + std::to_string(behind) + " weekdays before " +
+                 platform::DateTextToDisplay(libraryLatest)}};
+}
+
+DataCheckResult CheckLibrary(const store::SecurityList& list, const DataCheckSettings& settings,
+                             platform::Progress& progress) {
+    DataCheckResult result;
+    struct Last {
+        store::NameRecord Name;
+        std::string Date;
+        int Record = 0;
+        std::size_t FindingsEnd = 0; // where its stopped-trading row goes
+    };
+    std::vector<Last> lasts;
+    std::vector<store::PriceRecord> records;
+    progress.SetStatus("Checking data");
+    const auto walk = store::ForEachSecurity(list, progress, [&](const store::WalkItem& item) {
+        store::PriceFile file(item.PriceFile);
+        if (auto s = file.ReadAll(records); !s) {
+            result.Findings.push_back({item.Name.TrimmedCode(), platform::Trim(item.Name.Name), "",
+                                       0, std::string(finding::Damaged), s.message()});
+            return store::WalkStep::Continue;
+        }
+        auto found = CheckHistory(item.Name, records, settings);
+        result.Findings.insert(result.Findings.end(), std::make_move_iterator(found.begin()),
+                               std::make_move_iterator(found.end()));
+        Last last{item.Name, LastValidDate(records), 0, result.Findings.size()};
+        for (int k = static_cast<int>(records.size()); k >= 1; --k)
+            if (records[static_cast<std::size_t>(k - 1)].Date == last.Date) {
+                last.Record = k;
+                break;
+            }
+        if (last.Date > result.LatestDate) result.LatestDate = last.Date;
+        lasts.push_back(std::move(last));
+        ++result.Checked;
+        return store::WalkStep::Continue;
+    });
+    result.Status = walk.Status;
+    result.Cancelled = walk.Cancelled;
+
+    // Stopped trading needs the latest date of all: each row goes after its security's others.
+    std::vector<Finding> merged;
+    merged.reserve(result.Findings.size());
+    std::size_t from = 0;
+    for (const auto& last : lasts) {
+        merged.insert(merged.end(), result.Findings.begin() + static_cast<long>(from),
+                      result.Findings.begin() + static_cast<long>(last.FindingsEnd));
+        from = last.FindingsEnd;
+        for (auto& f :
+             StoppedTrading(last.Name, last.Date, last.Record, result.LatestDate, settings))
+            merged.push_back(std::move(f));
+    }
+    merged.insert(merged.end(), result.Findings.begin() + static_cast<long>(from),
+                  result.Findings.end());
+    for (const auto& issue : walk.Issues) {
+        const std::string code = std::filesystem::path(issue.file).stem().string();
+        merged.push_back({code, "", "", issue.record, std::string(finding::Damaged), issue.text});
+    }
+    result.Findings = std::move(merged);
+    return result;
+}
+
+std::string FindingsCsv(const std::vector<Finding>& findings) {
+    auto field = [](std::string_view s) {
+        if (s.find_first_of(",\"\n") == std::string_view::npos) return std::string(s);
+        std::string q = "\"";
+        for (const char c : s) {
+            if (c == '"') q += '"';
+            q += c;
+        }
+        return q + "\"";
+    };
+    std::string csv = "Code,Name,Date,Record,Finding,Detail\n";
+    for (const auto& f : findings)
+        csv += field(f.Code) + "," + field(f.Name) + "," + field(f.Date) + "," +
+               std::to_string(f.Record) + "," + field(f.What) + "," + field(f.Detail) + "\n";
+    return csv;
+}
+
+} // namespace kori::maint
