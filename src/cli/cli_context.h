@@ -65,6 +65,8 @@ void AddEntryCommand(CLI::App& app, CliContext& ctx);
 // scan1, scan2, scan3, scan6, stats, adtotals.
 void AddScanCommands(CLI::App& app, CliContext& ctx);
 void AddAdjustCommand(CLI::App& app, CliContext& ctx);
+void AddDataCommand(CLI::App& app, CliContext& ctx);
+void AddRepairCommand(CLI::App& app, CliContext& ctx);
 void AddCheckCommand(CLI::App& app, CliContext& ctx);
 void AddExportCommand(CLI::App& app, CliContext& ctx);
 

@@ -33,6 +33,8 @@ int RunKori(int argc, const char* const* argv, std::ostream& out, std::ostream& 
     AddEntryCommand(app, ctx);
     AddScanCommands(app, ctx);
     AddAdjustCommand(app, ctx);
+    AddDataCommand(app, ctx);
+    AddRepairCommand(app, ctx);
     AddCheckCommand(app, ctx);
     AddExportCommand(app, ctx);
 
