@@ -1,6 +1,7 @@
 #include "scan/cht_scan1.h"
 
 #include "platform/text.h"
+#include "scan/two_thread_walk.h"
 #include "store/price_file.h"
 #include "store/security_walk.h"
 
@@ -69,19 +70,25 @@ std::string_view DateOf(const char* record) {
     return {record, 8};
 }
 
-// Per-walk state reused for every security, so that the walk allocates nothing per file.
+// What one thread keeps: its buffers, reused for every security so that the work allocates
+// nothing per file, and its finds with their places in the walk.
+struct ThreadState {
+    std::string bytes;
+    DailyTail tail;
+    std::vector<std::pair<int, Scan1Row>> rows;
+    std::string lastDate;
+    platform::Issues issues;
+};
+
 struct Scan1Walk {
     const Scan1Options& o;
     const osc::OscDef& def;
-    bool runOscs;
-    bool wholeFile;
-    int wanted;
-    double risePct, fallPct;
-    std::int16_t category;
-    std::string bytes;
-    DailyTail tail;
-    Scan1Result& result;
-    std::vector<ListedCode> listed;
+    bool runOscs = false;
+    bool wholeFile = false;
+    int wanted = 2;
+    double risePct = 0, fallPct = 0;
+    std::int16_t category = 0;
+    ThreadState state[2];
 
     bool Filtered(const store::NameRecord& n) const {
         if (o.CategoryOn && (n.RecordType != 4 || n.Category != category)) return true;
@@ -90,21 +97,21 @@ struct Scan1Walk {
         return o.NoWarrants && IsWarrant(n);
     }
 
-    void Visit(const store::WalkItem& item) {
+    void Visit(ThreadState& st, const store::WalkItem& item) {
         const store::NameRecord& n = item.Name;
         if (Filtered(n) || item.PriceRecords < 2) return;
         const int records = item.PriceRecords;
         if (auto s = ReadDailyTail(item.PriceFile, records, wholeFile ? 0 : wanted, n.RecordType,
-                                   bytes, tail);
+                                   st.bytes, st.tail);
             !s) {
-            result.Issues.push_back(
+            st.issues.push_back(
                 {platform::Severity::Warning, s.message(), item.PriceFile.filename().string(), 0});
             return;
         }
-        const char* lastRec = bytes.data() + bytes.size() - store::PriceRecord::kSize;
+        const char* lastRec = st.bytes.data() + st.bytes.size() - store::PriceRecord::kSize;
         const char* prevRec = lastRec - store::PriceRecord::kSize;
-        if (result.LastDate.empty() || DateOf(lastRec) > result.LastDate)
-            result.LastDate = std::string(DateOf(lastRec));
+        if (st.lastDate.empty() || DateOf(lastRec) > st.lastDate)
+            st.lastDate = std::string(DateOf(lastRec));
         const float last = store::PriceField(lastRec, store::kCloseAt);
         const float prev = store::PriceField(prevRec, store::kCloseAt);
         if (!o.Range.Holds(last)) return;
@@ -116,19 +123,15 @@ struct Scan1Walk {
             if (!row.Move.empty()) row.Change = ChangePercent(prev, last);
         }
         int kept = 0, ticked = 0;
-        if (runOscs) {
-            for (std::size_t k = 0; k < kScanOscs.size(); ++k) {
-                if (!o.Osc[k]) continue;
-                ++ticked;
-                const std::string_view ind = IndicationOf(kScanOscs[k], item, n);
-                if (!ind.empty() && Kept(ind, o.Indications)) {
-                    row.Indications[k] = std::string(ind);
-                    ++kept;
-                }
+        for (std::size_t k = 0; k < kScanOscs.size(); ++k) {
+            if (!o.Osc[k]) continue;
+            ++ticked;
+            if (!runOscs) continue;
+            const std::string_view ind = IndicationOf(st, kScanOscs[k], item);
+            if (!ind.empty() && Kept(ind, o.Indications)) {
+                row.Indications[k] = std::string(ind);
+                ++kept;
             }
-        } else {
-            for (bool t : o.Osc)
-                ticked += t ? 1 : 0;
         }
         if (row.Move.empty() && kept == 0) return;
         row.All = (!(o.Rise || o.Fall) || !row.Move.empty()) && kept == ticked;
@@ -136,23 +139,39 @@ struct Scan1Walk {
         row.Code = n.TrimmedCode();
         row.Name = platform::Trim(n.Name);
         row.Close = last;
-        listed.push_back({item.NameRecordNumber, row.Code});
-        result.Rows.push_back(std::move(row));
+        st.rows.emplace_back(item.Position, std::move(row));
     }
 
-    std::string_view IndicationOf(ScanOsc osc, const store::WalkItem& item,
-                                  const store::NameRecord& n) {
+    std::string_view IndicationOf(ThreadState& st, ScanOsc osc, const store::WalkItem& item) {
+        const store::NameRecord& n = item.Name;
         const int period = ScanPeriod(osc, def);
         const bool closeOnly = store::IsCloseOnly(n.RecordType);
-        OscReading r = ReadOscillator(osc, tail, period, closeOnly);
+        OscReading r = ReadOscillator(osc, st.tail, period, closeOnly);
         if (r.Outcome == OscOutcome::NeedMore) {
             // Flat stretches reach further back than the part read: take the whole file.
-            if (!ReadDailyTail(item.PriceFile, item.PriceRecords, 0, n.RecordType, bytes, tail))
+            if (!ReadDailyTail(item.PriceFile, item.PriceRecords, 0, n.RecordType, st.bytes,
+                               st.tail))
                 return {};
-            r = ReadOscillator(osc, tail, period, closeOnly);
+            r = ReadOscillator(osc, st.tail, period, closeOnly);
         }
         if (r.Outcome != OscOutcome::Positions) return {};
         return Indication(r.Positions);
+    }
+
+    // The finds of both threads in the order of the walk.
+    void Gather(Scan1Result& result) {
+        std::vector<std::pair<int, Scan1Row>> all;
+        for (auto& st : state) {
+            for (auto& r : st.rows)
+                all.push_back(std::move(r));
+            if (!st.lastDate.empty() && st.lastDate > result.LastDate)
+                result.LastDate = st.lastDate;
+            result.Issues.insert(result.Issues.end(), st.issues.begin(), st.issues.end());
+        }
+        std::sort(all.begin(), all.end(),
+                  [](const auto& a, const auto& b) { return a.first < b.first; });
+        for (auto& r : all)
+            result.Rows.push_back(std::move(r.second));
     }
 };
 
@@ -215,26 +234,21 @@ Scan1Result RunScan1(std::string_view dataFolder, const Scan1Options& o, const o
             if (w == 0) wholeFile = true;
             wanted = std::max(wanted, w);
         }
-    Scan1Walk walk{o,
-                   def,
-                   runOscs,
-                   wholeFile,
-                   wanted,
-                   platform::Val(o.RisePercent),
-                   platform::Val(o.FallPercent),
-                   static_cast<std::int16_t>(platform::Val(o.Category)),
-                   {},
-                   {},
-                   result,
-                   {}};
+    Scan1Walk walk{o, def};
+    walk.runOscs = runOscs;
+    walk.wholeFile = wholeFile;
+    walk.wanted = wanted;
+    walk.risePct = platform::Val(o.RisePercent);
+    walk.fallPct = platform::Val(o.FallPercent);
+    walk.category = static_cast<std::int16_t>(platform::Val(o.Category));
     progress.SetStatus(kCheckingData);
     store::SecurityList list{std::string(dataFolder), o.List};
-    const auto walked = store::ForEachSecurity(list, progress, [&](const store::WalkItem& item) {
-        walk.Visit(item);
-        return store::WalkStep::Continue;
+    const auto walked = WalkOnTwoThreads(list, progress, [&](int thread, const store::WalkItem& i) {
+        walk.Visit(walk.state[thread], i);
     });
     result.Cancelled = walked.Cancelled;
-    result.Issues.insert(result.Issues.begin(), walked.Issues.begin(), walked.Issues.end());
+    result.Issues = walked.Issues;
+    walk.Gather(result);
     if (!walked.Status) {
         result.Status = walked.Status;
         return result;
@@ -244,7 +258,10 @@ Scan1Result RunScan1(std::string_view dataFolder, const Scan1Options& o, const o
         result.Message = ScanMessage{NothingFound(o), " Chart Scan"};
         return result;
     }
-    if (auto s = StoreScanList(dataFolder, walk.listed); !s) {
+    std::vector<ListedCode> listed;
+    for (const auto& row : result.Rows)
+        listed.push_back({row.NameRecord, row.Code});
+    if (auto s = StoreScanList(dataFolder, listed); !s) {
         result.Status = s;
         return result;
     }

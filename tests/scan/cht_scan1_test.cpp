@@ -251,17 +251,37 @@ TEST(ChtScan1, ChartListEntriesPastTheNameFileAreSkipped) {
 
 TEST(ChtScan1, CancelKeepsTheRowsSoFarAndWritesNoList) {
     TempRoot root;
-    WriteRig(root, {{"AAA", {1.0f, 1.5f}}, {"BBB", {1.0f, 1.5f}}, {"CCC", {1.0f, 1.5f}}});
+    std::vector<RigSecurity> list;
+    for (int i = 0; i < 60; ++i)
+        list.push_back({"C" + std::to_string(i), {1.0f, 1.5f}});
+    WriteRig(root, list);
     ASSERT_TRUE(
         kori::store::WriteList(kori::store::ListPath(root.folder(), 'Z'), {{1, "OLD"}}).ok());
-    RecordingProgress progress(3);
+    RecordingProgress progress(5);
     const auto r = RunScan1(root.folder(), Rises(), {}, progress);
     EXPECT_TRUE(r.Cancelled);
-    EXPECT_EQ(Codes(r), (std::vector<std::string>{"AAA:U", "BBB:U"}));
+    // Both threads stop at the cancel: what was done is kept, in the order of the walk.
+    EXPECT_GE(r.Rows.size(), 1u);
+    EXPECT_LT(r.Rows.size(), 60u);
+    for (std::size_t i = 1; i < r.Rows.size(); ++i)
+        EXPECT_LT(r.Rows[i - 1].NameRecord, r.Rows[i].NameRecord);
     EXPECT_FALSE(r.Message);
     EXPECT_EQ(ListZ(root), (std::vector<std::string>{"1 OLD"}));
     EXPECT_EQ(progress.statuses.front(), "Checking Data - WAIT");
-    EXPECT_EQ(progress.range, 3);
+    EXPECT_EQ(progress.range, 60);
+}
+
+TEST(ChtScan1, RowsComeInTheOrderOfTheWalk) {
+    TempRoot root;
+    std::vector<RigSecurity> list;
+    std::vector<std::string> expected;
+    for (int i = 0; i < 200; ++i) {
+        const bool up = i % 3 == 0;
+        list.push_back({"C" + std::to_string(i), {1.0f, up ? 1.5f : 1.0f}});
+        if (up) expected.push_back("C" + std::to_string(i) + ":U");
+    }
+    WriteRig(root, list);
+    EXPECT_EQ(Codes(Scan(root, Rises())), expected);
 }
 
 TEST(ChtScan1, ReadsBackToTheCloseANoTradeRecordRepeats) {
