@@ -61,6 +61,7 @@ void AddScaleCommand(CLI::App& app, CliContext& ctx);
 void AddIndicatorCommand(CLI::App& app, CliContext& ctx);
 void AddTargetsCommand(CLI::App& app, CliContext& ctx);
 void AddEntryCommand(CLI::App& app, CliContext& ctx);
+void AddImportCommand(CLI::App& app, CliContext& ctx);
 void AddCheckCommand(CLI::App& app, CliContext& ctx);
 
 } // namespace kori::cli
