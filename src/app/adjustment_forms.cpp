@@ -226,13 +226,13 @@ bool AdjustmentEntry::TermsComplete() {
 
 bool AdjustmentEntry::DateStep(std::string_view typedDate) {
     if (!TermsComplete()) return false;
-    const auto date = platform::CheckEnteredDate(typedDate);
-    if (!date.Ok) {
+    const auto date = platform::ParseEntryDate(typedDate);
+    if (!date.Date) {
         dialogs().MsgBox(date.Message, date.Title, Buttons::Ok, Icon::Exclamation);
         return false;
     }
-    m_dateField = date.Display;
-    m_inputs.AdjDate = date.Text;
+    m_dateField = date.Date->Shown;
+    m_inputs.AdjDate = date.Date->Text;
     m_closeLabel.clear();
     if (auto s = adjust::ChooseAdjustmentDate(m_session.folders.DataFolder, m_inputs.Code,
                                               m_inputs.AdjDate, m_choice);

@@ -38,7 +38,7 @@ void GridModel::SetHiddenCell(int row, int column, std::string text) {
 }
 
 CellVerdict GridModel::Check(int column, const std::string& text) const {
-    if (!m_check) return {true, text, {}, {}};
+    if (!m_check) return {true, text, {}, {}, false};
     return m_check(column, text);
 }
 
@@ -73,7 +73,7 @@ void GridModel::ReplaceRows(std::vector<Row> rows) {
 
 CellVerdict GridModel::SetCell(int row, int column, std::string text) {
     if (row < 0 || row >= rowCount() || column < 0 || column >= columnCount())
-        return {false, text, "No such cell", {}};
+        return {false, text, "No such cell", {}, false};
     for (const auto& ro : m_readOnly)
         if (ro.Column == column) {
             const std::string& had =

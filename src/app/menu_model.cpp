@@ -59,6 +59,7 @@ std::vector<MenuItem> BuildMenuTree() {
             {open, Item("mnuPaths", "&Folder Locations", "CPath", true),
              Item("mnFnts", "&Fonts", "ChtFonts"), Item("mnTPSU", "&Page Setup (Text)", "CHTPage"),
              Item("mnPrSU", "Printer &Setup", "PrinterDialog"), backup,
+             Item("mnuImportCsv", "Import CSV History ...", "ImportCsv", true),
              Item("mnuExit", "E&XIT", "Exit", true)}));
     tops.push_back(Top("mnuData", "&Edit",
                        {Item("mnuKBUpdate", "Data Entry via &Keyboard", "DataEntry"),

@@ -16,26 +16,41 @@ enum Column { CodeColumn = 0, TargetColumn = 1, DirectionColumn = 2 };
 constexpr const char* kUpOrDown = "Up or Down";
 constexpr const char* kMustBeUorD = "Must be either U or D";
 
+CellVerdict Accept(std::string text) {
+    CellVerdict v;
+    v.Text = std::move(text);
+    return v;
+}
+
+CellVerdict Refuse(const std::string& typed, std::string message, std::string title = {}) {
+    CellVerdict v;
+    v.Accepted = false;
+    v.Text = typed;
+    v.Message = std::move(message);
+    v.Title = std::move(title);
+    return v;
+}
+
 // Blank cells pass, so a half-typed row can be left; Save asks for the missing fields.
 CellVerdict CheckTargetCell(int column, const std::string& typed) {
     const std::string text = platform::Trim(typed);
-    if (text.empty()) return {true, text, {}, {}};
-    if (text.find(',') != std::string::npos) return {false, typed, "Commas cannot be used", {}};
+    if (text.empty()) return Accept(text);
+    if (text.find(',') != std::string::npos) return Refuse(typed, "Commas cannot be used");
     switch (column) {
     case CodeColumn:
-        if (!store::IsValidCode(text)) return {false, typed, "Not a valid security code", {}};
-        return {true, platform::Upper(text), {}, {}};
+        if (!store::IsValidCode(text)) return Refuse(typed, "Not a valid security code");
+        return Accept(platform::Upper(text));
     case TargetColumn:
         if (!platform::IsNumber(text) || !(platform::Val(text) > 0))
-            return {false, typed, "The target must be a price above 0", {}};
-        return {true, platform::Format(platform::Val(text), "0.00#"), {}, {}};
+            return Refuse(typed, "The target must be a price above 0");
+        return Accept(platform::Format(platform::Val(text), "0.00#"));
     case DirectionColumn: {
         const std::string d = platform::Upper(text);
-        if (d != "U" && d != "D") return {false, typed, kMustBeUorD, kUpOrDown};
-        return {true, d, {}, {}};
+        if (d != "U" && d != "D") return Refuse(typed, kMustBeUorD, kUpOrDown);
+        return Accept(d);
     }
     default:
-        return {true, text, {}, {}};
+        return Accept(text);
     }
 }
 

@@ -111,16 +111,17 @@ void Apply(CliContext& ctx, const AdjustOptions& o) {
     const auto terms = TermsOf(o);
     if (!o.date) throw CliError{"--date d/m/yy is required"};
     const std::string code = AdjustableCode(session, o.code);
-    const auto date = platform::CheckEnteredDate(*o.date);
-    if (!date.Ok) throw CliError{date.Message};
+    const auto date = platform::ParseEntryDate(*o.date);
+    if (!date.Date) throw CliError{date.Message};
 
     adjust::DateChoice choice;
-    if (auto s = adjust::ChooseAdjustmentDate(session.folders.DataFolder, code, date.Text, choice);
+    if (auto s =
+            adjust::ChooseAdjustmentDate(session.folders.DataFolder, code, date.Date->Text, choice);
         !s)
         throw CliError{s.message()};
     if (choice.Record == 0)
         throw CliError{"No record of " + code + " after its first lies on or before " +
-                       date.Display + ": nothing to adjust"};
+                       date.Date->Shown + ": nothing to adjust"};
     if (!choice.ExactDate) ctx.err << choice.Message << "\n";
 
     platform::Status why;

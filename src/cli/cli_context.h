@@ -62,6 +62,7 @@ void AddIndicatorCommand(CLI::App& app, CliContext& ctx);
 void AddUpdateCommand(CLI::App& app, CliContext& ctx);
 void AddTargetsCommand(CLI::App& app, CliContext& ctx);
 void AddEntryCommand(CLI::App& app, CliContext& ctx);
+void AddImportCommand(CLI::App& app, CliContext& ctx);
 // scan1, scan2, scan3, scan6, stats, adtotals.
 void AddScanCommands(CLI::App& app, CliContext& ctx);
 void AddAdjustCommand(CLI::App& app, CliContext& ctx);

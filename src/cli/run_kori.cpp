@@ -31,6 +31,7 @@ int RunKori(int argc, const char* const* argv, std::ostream& out, std::ostream& 
     AddUpdateCommand(app, ctx);
     AddTargetsCommand(app, ctx);
     AddEntryCommand(app, ctx);
+    AddImportCommand(app, ctx);
     AddScanCommands(app, ctx);
     AddAdjustCommand(app, ctx);
     AddDataCommand(app, ctx);

@@ -1,5 +1,7 @@
 #include "intake/csv_import.h"
 
+#include "intake/download_line.h"
+
 #include "platform/csv_line.h"
 #include "platform/date_entry.h"
 #include "platform/date_text.h"
@@ -335,15 +337,18 @@ struct DayLine {
 
 // One line of a day file; the fault when it is not one.
 std::optional<std::string> ReadDayLine(const std::string& line, std::string& code, DayLine& out) {
-    const int commas = platform::CountSeparators(line, ',');
+    // The same reading of a line as the update makes: commas counted in the raw line, fields
+    // split with quotes honoured, the code as it arrives.
+    const int commas = CountCommas(line);
     if (commas != 7 && commas != 8)
         return "an incorrect number of fields in the record (7 commas for 8 fields, 8 for an "
                "option)";
-    const auto f = platform::SplitQuoted(line, ',');
-    code = Trim(Trim(f[0]).substr(0, 6));
+    const auto f = SplitFields(line);
+    if (f.size() < static_cast<std::size_t>(commas) + 1)
+        return "an incorrect number of fields in the record";
+    code = ArrivalCode(f[0]);
     if (code.empty()) return std::nullopt; // a blank code skips the record
     if (!store::IsValidCode(code)) return "the code " + Quoted(code) + " cannot name a file";
-    code = Trim(store::PadCode(code));
     const std::string date = Trim(f[1]);
     if (!AllDigits(date) || !platform::IsValidDateText(date))
         return Quoted(date) + " is not a date";

@@ -105,8 +105,8 @@ std::optional<store::PriceRecord> LastPriceRecord(const std::filesystem::path& p
 EntryResult SaveKeyedDay(std::string_view dataFolder, const store::NameRecord& name,
                          const KeyedDay& day) {
     EntryResult result;
-    const auto date = platform::CheckEnteredDate(day.Date);
-    if (!date.Ok) {
+    const auto date = platform::ParseEntryDate(day.Date);
+    if (!date.Date) {
         result.Refusal = {date.Message, date.Title};
         return result;
     }
@@ -127,7 +127,7 @@ EntryResult SaveKeyedDay(std::string_view dataFolder, const store::NameRecord& n
         return result;
     }
     store::PriceFile file(path);
-    result.Record = KeyedRecord(name.RecordType, date.Text, day);
+    result.Record = KeyedRecord(name.RecordType, date.Date->Text, day);
     if (auto s = file.Open(); !s) {
         result.Refusal = {s.message(), std::string(kDataEntryTitle)};
         return result;

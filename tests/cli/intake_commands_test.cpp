@@ -92,3 +92,40 @@ TEST_F(IntakeCommands, EntryOfAnAdvanceDeclineDayNeedsTheRunningTotal) {
 
 } // namespace
 } // namespace kori::test
+
+namespace kori::test {
+namespace {
+
+TEST_F(IntakeCommands, ImportACsvHistoryAndAFolderOfDayFiles) {
+    const auto csv = dir.Write("new.csv", "date;close;open;high;low;volume\n"
+                                          "2026-11-19;1.05;1;1.1;0.95;500\n"
+                                          "20/11/2026;1.10;1.05;1.15;1.0;700\n");
+    auto r = Kori({"import", csv.string(), "--code", "nwc", "--name", "New Co"});
+    ASSERT_EQ(r.status, 0) << r.err;
+    EXPECT_EQ(r.out, "NWC: 2 records read; 2 added, 0 replaced, 0 already on file; 2 on file; "
+                     "new in the name file\n");
+    const auto names = json::parse(Kori({"names", "--json"}).out);
+    EXPECT_EQ(names.back()["code"], "NWC");
+    EXPECT_EQ(names.back()["name"], "New Co");
+    EXPECT_EQ(json::parse(Kori({"bars", "NWC", "--json"}).out)["bars"][1]["close"], 1.1);
+
+    // A bad line: the message names it and the exit is not 0.
+    const auto bad = dir.Write("bad.csv", "Date,Open,High,Low,Close\n2026-11-23,1,1,1,1\n"
+                                          "2026-11-24,1,one,1,1\n");
+    r = Kori({"import", bad.string(), "--code", "NWC", "--replace"});
+    EXPECT_NE(r.status, 0);
+    EXPECT_NE(r.err.find("Line 3: the High \"one\" is not a number"), std::string::npos) << r.err;
+    EXPECT_NE(Kori({"import", csv.string()}).status, 0) << "a CSV history needs a code";
+
+    std::filesystem::create_directory(dir.path() / "days");
+    dir.Write("days/23NOV26.D", "NWC,20261123,1.1,1.2,1.0,1.15,800,0\r\n"
+                                "DAY,20261123,5,5,5,5,10,0\r\n");
+    r = Kori({"import", "--day-files", (dir.path() / "days").string()});
+    ASSERT_EQ(r.status, 0) << r.err;
+    EXPECT_EQ(r.out, "1 day files read: 2 records for 2 securities; 2 added, 0 replaced, 0 "
+                     "already on file; 1 new in the name file\n");
+    EXPECT_EQ(json::parse(Kori({"bars", "NWC", "--json"}).out)["last_bar"], 2);
+}
+
+} // namespace
+} // namespace kori::test

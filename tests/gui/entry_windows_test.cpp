@@ -2,6 +2,7 @@
 // and driven as the user would, with what they leave on disk.
 #include "gui/widgets/grid_view.h"
 #include "gui/windows/data_entry.h"
+#include "gui/windows/import_csv.h"
 #include "gui/windows/main_window.h"
 #include "gui/windows/register_windows.h"
 #include "gui/windows/targets.h"
@@ -117,4 +118,26 @@ TEST_F(EntryWindows, DataEntryShowsTheRecordTypesFieldsAndSaves) {
     EXPECT_EQ(w->dateField()->text(), "24/11/26");
     EXPECT_TRUE(w->figureField(3)->text().isEmpty());
     QTest::mouseClick(w->findChild<QPushButton*>("Command3"), Qt::LeftButton);
+}
+
+TEST_F(EntryWindows, ImportCsvFromTheFileMenu) {
+    ASSERT_TRUE(main.Trigger("mnuImportCsv"));
+    auto* w = main.findChild<gui::ImportCsv*>();
+    ASSERT_NE(w, nullptr);
+    EXPECT_EQ(w->windowTitle(), "Import CSV History");
+    const auto csv = s.root.Write("h.csv", "Date,Open,High,Low,Close,Volume\n"
+                                           "2026-11-23,3,3.5,2.9,3.4,100\n");
+    w->fileField()->setText(QString::fromStdString(csv.string()));
+    w->codeField()->setText("KRM");
+    emit w->codeField()->editingFinished();
+    EXPECT_EQ(w->nameField()->text(), "Karoo Minerals");
+    EXPECT_FALSE(w->nameField()->isEnabled());
+    QTest::mouseClick(w->findChild<QPushButton*>("cmdImport"), Qt::LeftButton);
+    EXPECT_TRUE(w->resultLabel()->text().startsWith("KRM: 1 records read; 1 added"))
+        << w->resultLabel()->text().toStdString();
+    QTest::mouseClick(w->findChild<QPushButton*>("cmdImport"), Qt::LeftButton);
+    EXPECT_TRUE(w->resultLabel()->text().contains("1 already on file"));
+    w->replaceBox()->setChecked(true);
+    QTest::mouseClick(w->findChild<QPushButton*>("cmdImport"), Qt::LeftButton);
+    EXPECT_TRUE(w->resultLabel()->text().contains("1 replaced"));
 }

@@ -5,7 +5,8 @@ namespace kori::gui {
 
 class MainWindow;
 
-// Adds the actions of "Data Entry via &Keyboard" and of the targets window ("Quoren Alerts").
+// Adds the actions of "Data Entry via &Keyboard", "Import CSV History ..." and of the targets
+// window ("Quoren Alerts").
 void RegisterEntryWindows(MainWindow& main);
 
 } // namespace kori::gui
