@@ -8,6 +8,7 @@
 #include <fcntl.h>
 #include <fstream>
 #include <optional>
+#include <sstream>
 #include <sys/stat.h>
 #include <system_error>
 #include <unistd.h>
@@ -85,24 +86,11 @@ bool FileHasData(const fs::path& path) {
 }
 
 std::optional<std::string> ReadWholeFile(const fs::path& path) {
-    const fs::path resolved = ResolvePath(path);
-    std::ifstream in(resolved, std::ios::binary);
+    std::ifstream in(ResolvePath(path), std::ios::binary);
     if (!in) return std::nullopt;
-    // One read of the size the folder gives, then whatever follows it (a file that grew, or
-    // one whose size is not known in advance), so a large history is not copied piecemeal.
-    std::string out;
-    std::error_code ec;
-    const auto size = fs::file_size(resolved, ec);
-    if (!ec && size > 0) {
-        out.resize(static_cast<std::size_t>(size));
-        in.read(out.data(), static_cast<std::streamsize>(size));
-        out.resize(static_cast<std::size_t>(in.gcount()));
-    }
-    char buffer[65536];
-    while (in && (in.read(buffer, sizeof buffer), in.gcount() > 0))
-        out.append(buffer, static_cast<std::size_t>(in.gcount()));
-    if (in.bad()) return std::nullopt;
-    return out;
+    std::ostringstream ss;
+    ss << in.rdbuf();
+    return ss.str();
 }
 
 ScopedWriteFailure::ScopedWriteFailure(long long bytes) : m_previous(g_failAfterBytes) {
