@@ -3,6 +3,7 @@
 #include "gui/windows/chart_windows.h"
 #include "gui/windows/list_windows.h"
 #include "gui/windows/main_window.h"
+#include "gui/windows/maint_windows.h"
 #include "gui/windows/settings_windows.h"
 
 namespace kori::gui {
@@ -12,6 +13,7 @@ void RegisterWindows(MainWindow& main) {
     RegisterSettingsWindows(main);
     RegisterChartWindows(main);
     RegisterListWindows(main);
+    RegisterMaintWindows(main);
     main.RebuildMenus();
 }
 
