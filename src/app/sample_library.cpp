@@ -2,13 +2,16 @@
 
 #include "platform/date_text.h"
 #include "platform/files.h"
+#include "platform/number_format.h"
 #include "store/chart_list.h"
 #include "store/name_file.h"
 #include "store/price_file.h"
+#include "store/targets_file.h"
 
 #include <algorithm>
 #include <cmath>
 #include <cstdint>
+#include <map>
 #include <vector>
 
 namespace kori::app {
@@ -214,6 +217,93 @@ platform::Status WriteClassFiles(const std::string& systemFolder) {
     return platform::WriteFileAtomic(platform::ResolveIn(systemFolder, "Gics.dat"), gics);
 }
 
+// Targets that the last day of the sample meets in each of the four ways, and a security on two
+// lines whose targets stay out of reach, worked out from that day's prices.
+platform::Status WriteSampleTargets(const std::string& systemFolder,
+                                    const std::map<std::string, store::PriceRecord>& lastDay) {
+    const auto price = [](float p) { return platform::FormatSingle(p, "0.00#"); };
+    const auto& frg = lastDay.at("FRG");
+    const auto& gln = lastDay.at("GLN");
+    const auto& twr = lastDay.at("TWR");
+    const auto& vnt = lastDay.at("VNT");
+    const auto& yra = lastDay.at("YRA");
+    const std::vector<store::TargetLine> lines = {
+        {"FRG", price(frg.Low), "U"},          // the day's low: reached
+        {"GLN", price(gln.Low * 0.95f), "U"},  // below the whole day: exceeded
+        {"TWR", price(twr.High), "D"},         // the day's high: reached
+        {"VNT", price(vnt.High * 1.05f), "D"}, // above the whole day: exceeded
+        {"YRA", price(yra.High * 1.1f), "U"},  // out of reach either way
+        {"YRA", price(yra.Low * 0.9f), "D"},
+    };
+    return store::WriteTargetsFile(store::TargetsFilePath(systemFolder), lines);
+// Securities whose last days are placed so that every scan finds something: a rise of exactly
+// 10%, overbought and oversold oscillators, breaks of the parabolic stop up and down, a volume
+// spike, two averages together, and an advance-decline series whose totals need recomputing.
+platform::Status AddScanExamples(const std::string& dataFolder,
+                                 const std::vector<std::string>& dates,
+                                 std::vector<store::NameRecord>& names, SampleSummary& summary) {
+    struct Example {
+        const char* code;
+        const char* name;
+        std::int16_t type;
+        std::vector<float> lastCloses; // the closes of the last days; earlier days stand at the
+                                       // first of them
+        std::int32_t lastVolume = 0;   // 0: as the other days
+    };
+    auto ramp = [](float from, float step, int days) {
+        std::vector<float> v;
+        for (int i = 0; i < days; ++i)
+            v.push_back(std::round((from + step * static_cast<float>(i)) * 100) / 100);
+        return v;
+    };
+    auto then = [](std::vector<float> v, float last) {
+        v.push_back(last);
+        return v;
+    };
+    const std::vector<Example> examples = {
+        {"TENUP", "Tenfold Mining (ten per cent rise)", 4, {2.00f, 2.00f, 2.00f, 2.20f}},
+        {"OBHI", "Overbought Holdings", 4, ramp(1.00f, 0.05f, 40)},
+        {"OSLO", "Oversold Logistics", 4, ramp(4.00f, -0.05f, 40)},
+        {"PARUP", "Parabola Up Resources", 4, then(ramp(4.00f, -0.05f, 40), 4.50f)},
+        {"PARDN", "Parabola Down Resources", 4, then(ramp(1.00f, 0.05f, 40), 0.50f)},
+        {"VOLSP", "Volume Spike Ventures", 4, {0.80f, 0.80f, 0.81f}, 50000000},
+        {"AVGX", "Average Crossing Estates", 4, std::vector<float>(40, 0.95f)},
+        {"ADNEW", "New Advance Decline Series (sample)", 3, {}},
+    };
+    Random rng(77);
+    for (const auto& e : examples) {
+        store::NameRecord n;
+        n.Code = e.code;
+        n.Name = e.name;
+        n.RecordType = e.type;
+        n.Category = 1;
+        n.IndustryClass = "121";
+        names.push_back(n);
+        std::vector<store::PriceRecord> recs;
+        for (std::size_t i = 0; i < dates.size(); ++i) {
+            store::PriceRecord r;
+            r.Date = dates[i];
+            if (e.type == 3) { // advances and declines without their running total
+                r.High = static_cast<float>(300 + static_cast<int>(rng.Uniform() * 400));
+                r.Low = static_cast<float>(300 + static_cast<int>(rng.Uniform() * 400));
+                recs.push_back(r);
+                continue;
+            }
+            const std::size_t fromEnd = dates.size() - 1 - i;
+            const auto& c = e.lastCloses;
+            r.Close = fromEnd < c.size() ? c[c.size() - 1 - fromEnd] : c.front();
+            r.Open = r.High = r.Low = r.Close;
+            r.Volume = 100000 + static_cast<std::int32_t>(rng.Uniform() * 20000);
+            if (fromEnd == 0 && e.lastVolume > 0) r.Volume = e.lastVolume;
+            recs.push_back(r);
+        }
+        store::PriceFile pf(store::PriceFile::PathFor(dataFolder, e.code));
+        if (auto st = pf.WriteAll(recs); !st) return st;
+        summary.Records += static_cast<int>(recs.size());
+    }
+    return platform::Status::Ok();
+}
+
 } // namespace
 
 platform::Status MakeSampleLibrary(const std::string& systemFolder, const std::string& dataFolder,
@@ -222,6 +312,7 @@ platform::Status MakeSampleLibrary(const std::string& systemFolder, const std::s
     const auto dates = Weekdays();
     Random rng(20261120);
     std::vector<store::NameRecord> names;
+    std::map<std::string, store::PriceRecord> lastDay;
     summary = SampleSummary{};
     for (const auto& s : Securities()) {
         store::NameRecord n;
@@ -241,8 +332,10 @@ platform::Status MakeSampleLibrary(const std::string& systemFolder, const std::s
         store::PriceFile pf(store::PriceFile::PathFor(dataFolder, s.code));
         if (auto st = pf.WriteAll(recs); !st) return st;
         summary.Records += static_cast<int>(recs.size());
+        lastDay[s.code] = recs.back();
     }
     names[names.size() - 4].OtherDetails = "Exp 30/06/27"; // a warrant's details
+    if (auto st = AddScanExamples(dataFolder, dates, names, summary); !st) return st;
     names[3].PercentBandUp = 8;
     names[3].PercentBandDown = 8;
     store::NameFile nf(store::NameFile::PathIn(dataFolder));
@@ -251,6 +344,7 @@ platform::Status MakeSampleLibrary(const std::string& systemFolder, const std::s
     summary.LastDate = kLastDate;
 
     if (auto st = WriteClassFiles(systemFolder); !st) return st;
+    if (auto st = WriteSampleTargets(systemFolder, lastDay); !st) return st;
     if (auto st = store::SaveListFromCodes(dataFolder, 'A', {"HBK", "IRB", "JNS", "KST", "LMT"});
         !st)
         return st;
@@ -266,6 +360,205 @@ platform::Status MakeSampleLibrary(const std::string& systemFolder, const std::s
     listNames[1] = "Resources";
     listNames[2] = "Watching";
     store::SaveSLNames(settings, listNames);
+    return platform::Status::Ok();
+}
+
+} // namespace kori::app
+
+namespace kori::app {
+
+namespace {
+
+constexpr const char* kNextDate = "20261123"; // the Monday after the sample's last day
+
+// A price as a day file writes it: at most four decimals, no trailing zeros.
+std::string PriceText(double v) {
+    std::string s = std::to_string(std::round(v * 10000) / 10000);
+    while (!s.empty() && s.back() == '0')
+        s.pop_back();
+    if (!s.empty() && s.back() == '.') s.pop_back();
+    return s.empty() ? "0" : s;
+}
+
+// A line of a day file for a security whose last record is `last`, moved by `move` (a ratio).
+std::string DayLine(const std::string& code, const std::string& date,
+                    const store::PriceRecord& last, double move, std::int32_t volume,
+                    double spare = 0) {
+    const double base = last.Close != 0 ? last.Close : 1.0;
+    const double close = base * move;
+    const double open = base * (1 + (move - 1) / 3);
+    const double high = std::max(open, close) * 1.004;
+    const double low = std::min(open, close) * 0.996;
+    return code + "," + date + "," + PriceText(open) + "," + PriceText(high) + "," +
+           PriceText(low) + "," + PriceText(close) + "," + std::to_string(volume) + "," +
+           PriceText(spare) + "\r\n";
+}
+
+platform::Status LastRecord(const std::string& folder, const std::string& code,
+                            store::PriceRecord& last) {
+    store::PriceFile pf(store::PriceFile::PathFor(folder, code));
+    if (auto s = pf.OpenWithData(); !s) return s;
+    return pf.Read(pf.Count(), last);
+}
+
+platform::Status WriteDayFile(const std::string& folder, const std::string& name,
+                              const std::string& text, std::vector<std::string>& made) {
+    made.push_back(name);
+    return platform::WriteFileAtomic(platform::ResolveIn(folder, name), text);
+}
+
+// The advance/decline line: advances and declines in high and low, the running total in close.
+std::string AdvanceDeclineLine(const std::string& date, const store::PriceRecord& last, int adv,
+                               int dec) {
+    return "ADVDEC," + date + ",0," + std::to_string(adv) + "," + std::to_string(dec) + "," +
+           PriceText(last.Close + adv - dec) + ",0,0\r\n";
+}
+
+} // namespace
+
+platform::Status MakeSampleDayFiles(const std::string& dataFolder,
+                                    const std::string& downloadFolder,
+                                    std::vector<std::string>& made) {
+    platform::CreateFolder(downloadFolder);
+    made.clear();
+    Random rng(20261123);
+    std::string next, replace, insert;
+    for (const auto& s : Securities()) {
+        const std::string code = s.code;
+        store::PriceRecord last;
+        if (auto st = LastRecord(dataFolder, code, last); !st) return st;
+        const double move = 1 + 0.02 * rng.Normal() * s.volatility;
+        const auto volume = static_cast<std::int32_t>(s.volume * (0.6 + rng.Uniform()));
+        if (code == "ADVDEC") {
+            next += AdvanceDeclineLine(kNextDate, last, 412, 377);
+            continue;
+        }
+        if (code == "OCR") continue; // did not trade: the update gives it a filler
+        // The service corrects Friday's volume of KRM on Monday's line.
+        const double spare = code == "KRM" ? static_cast<double>(last.Volume) + 125000 : 0;
+        next += DayLine(code, kNextDate, last, move, volume, spare);
+        if (code == "KRM" || code == "ALX" || code == "BWG")
+            replace += DayLine(code, kLastDate, last, 1.0, last.Volume + 1000);
+        if (code == "KRM" || code == "ALX" || code == "CPR")
+            insert += DayLine(code, "20261114", last, 0.99, volume / 4);
+    }
+    store::PriceRecord krm;
+    if (auto st = LastRecord(dataFolder, "KRM", krm); !st) return st;
+    next += "NEWCO," + std::string(kNextDate) + ",0.5,0.52,0.48,0.51,250000,0\r\n";
+    // A Saturday session, delivered late: it goes in among the records already on file.
+    if (auto st = WriteDayFile(downloadFolder, "14NOV26.D", insert, made); !st) return st;
+    if (auto st = WriteDayFile(downloadFolder, "20NOV26.D", replace, made); !st) return st;
+    if (auto st = WriteDayFile(downloadFolder, "23NOV26.D", next, made); !st) return st;
+    // One line short of a field: the whole file is refused before anything is written.
+    const std::string bad = DayLine("KRM", "20261124", krm, 1.01, 1000000) +
+                            "ALX,20261124,12.1,12.3,12.0,12.2,900000\r\n";
+    return WriteDayFile(downloadFolder, "24NOV26.D", bad, made);
+}
+
+platform::Status MakeSampleBundle(const std::string& rootFolder, const std::string& dataFolder,
+                                  const std::string& downloadFolder,
+                                  std::array<std::string, 8>& segmentFolders,
+                                  std::vector<std::string>& made) {
+    platform::CreateFolder(downloadFolder);
+    made.clear();
+    segmentFolders = {};
+    segmentFolders[0] = dataFolder; // Australian stocks and warrants
+    const std::string idx = rootFolder + "indices/", fut = rootFolder + "futures/",
+                      ovs = rootFolder + "overseas/", opt = rootFolder + "options/";
+    segmentFolders[1] = idx;
+    segmentFolders[2] = fut;
+    segmentFolders[3] = ovs;
+    segmentFolders[4] = opt;
+    const auto dates = Weekdays();
+    Random rng(20261124);
+
+    // Each segment folder is a small library of its own.
+    struct Extra {
+        const char* folder;
+        Security security;
+        const char* details;
+    };
+    const std::vector<Extra> extras = {
+        {"indices/", {"XAO", "All Ordinaries Index (sample)", 5, "", "", 5200, 0.05, 0.14, 0}, ""},
+        {"indices/", {"XJO", "Top 200 Index (sample)", 5, "", "", 5100, 0.05, 0.15, 0}, ""},
+        {"futures/",
+         {"APZ6", "Share Price Index Dec (sample)", 4, "", "", 5150, 0.05, 0.16, 40000},
+         ""},
+        {"futures/", {"IRZ6", "90 Day Bills Dec (sample)", 4, "", "", 95.6, 0.0, 0.02, 25000}, ""},
+        {"overseas/",
+         {"DJIEZ", "Overseas Industrials (sample)", 4, "", "", 31000, 0.06, 0.15, 0},
+         ""},
+        {"options/",
+         {"KRMLZ6", "Karoo Minerals Dec Put (sample)", 4, "", "", 0.35, 0, 0.9, 20000},
+         "0P17/12/26"},
+        {"options/",
+         {"ALXOZ6", "Alexandra Dec Call (sample)", 4, "", "", 0.80, 0, 0.8, 15000},
+         "0C17/12/26"},
+        // Details never filled in: the no-trade check marks it for the user.
+        {"options/", {"BWGLX6", "Bowen Gold Nov Put (sample)", 4, "", "", 0.05, 0, 0.9, 5000}, ""},
+    };
+    std::map<std::string, std::vector<store::NameRecord>> names;
+    std::string dix, dsf, dov, dop;
+    for (const auto& e : extras) {
+        const std::string folder = rootFolder + e.folder;
+        if (!platform::CreateFolder(folder))
+            return platform::Status::Error("Cannot create " + folder);
+        store::NameRecord n;
+        n.Code = e.security.code;
+        n.Name = e.security.name;
+        n.RecordType = e.security.type;
+        n.OtherDetails = e.details;
+        n.Category = 1;
+        names[folder].push_back(n);
+        // Options trade for the last three months only.
+        const std::vector<std::string> span =
+            std::string(e.folder) == "options/"
+                ? std::vector<std::string>(dates.end() - 63, dates.end())
+                : dates;
+        const auto recs = PriceHistory(e.security, span, rng);
+        store::PriceFile pf(store::PriceFile::PathFor(folder, e.security.code));
+        if (auto st = pf.WriteAll(recs); !st) return st;
+        const std::string code = e.security.code;
+        const auto volume = static_cast<std::int32_t>(e.security.volume);
+        const std::string line = DayLine(code, kNextDate, recs.back(), 1.003, volume);
+        if (std::string(e.folder) == "indices/") dix += line;
+        if (std::string(e.folder) == "futures/") dsf += line;
+        if (std::string(e.folder) == "overseas/") dov += line;
+        if (std::string(e.folder) == "options/" && code != "BWGLX6") {
+            std::string l = line.substr(0, line.size() - 2); // the spare field holds days
+            l = l.substr(0, l.rfind(',')) + ",24," + (code == "KRMLZ6" ? "P" : "C") + "\r\n";
+            dop += l;
+        }
+    }
+    for (const auto& [folder, list] : names) {
+        store::NameFile nf(store::NameFile::PathIn(folder));
+        if (auto st = nf.WriteAll(list); !st) return st;
+    }
+    // A new series in two segments: an index and an option.
+    dix += "XNR," + std::string(kNextDate) + ",0,812.5,798.1,805.2,0,0\r\n";
+    dop += "KRMWZ6," + std::string(kNextDate) + ",0.21,0.23,0.2,0.22,3000,24,C\r\n";
+
+    std::string dsu;
+    Random move(20261125);
+    for (const auto& s : Securities()) {
+        const std::string code = s.code;
+        if (code == "ADVDEC" || code == "XAO" || code == "XJO" || code == "OCR") continue;
+        store::PriceRecord last;
+        if (auto st = LastRecord(dataFolder, code, last); !st) return st;
+        dsu += DayLine(code, kNextDate, last, 1 + 0.02 * move.Normal() * s.volatility,
+                       static_cast<std::int32_t>(s.volume * (0.6 + move.Uniform())));
+    }
+    dsu += "KRMWOE," + std::string(kNextDate) + ",0.1,0.11,0.09,0.1,50000,0\r\n";
+    const std::string stem = "23NOV26";
+    for (const auto& [ext, text] :
+         std::vector<std::pair<std::string, std::string>>{{".d", "23NOV26 bundle\r\n"},
+                                                          {".dix", dix},
+                                                          {".dov", dov},
+                                                          {".dsu", dsu},
+                                                          {".dsf", dsf},
+                                                          {".dop", dop}}) {
+        if (auto st = WriteDayFile(downloadFolder, stem + ext, text, made); !st) return st;
+    }
     return platform::Status::Ok();
 }
 

@@ -5,7 +5,9 @@
 #include "platform/settings_store.h"
 #include "platform/status.h"
 
+#include <array>
 #include <string>
+#include <vector>
 
 namespace kori::app {
 
@@ -19,5 +21,22 @@ struct SampleSummary {
 // Gics.dat into `systemFolder`, and the list names into the settings store.
 platform::Status MakeSampleLibrary(const std::string& systemFolder, const std::string& dataFolder,
                                    platform::SettingsStore& settings, SampleSummary& summary);
+
+// Day files waiting in `downloadFolder` for the "Other Internet data " service (names in the
+// form DDMMMYY.D), made from the sample's last records: the next trading day (a new security,
+// a corrected volume, one security missing so it gets a filler), the last day again (a
+// replace), a day inside the history (an insert) and a newer file with a line one field short.
+// Returns the names made, oldest first.
+platform::Status MakeSampleDayFiles(const std::string& dataFolder,
+                                    const std::string& downloadFolder,
+                                    std::vector<std::string>& made);
+
+// The bundle service's layout: a folder a market segment below `rootFolder` (the stocks are the
+// data folder itself), each with its own Names.dat and price files, their eight paths in the
+// order of ChtPaths.lst, and the next trading day's bundle waiting in `downloadFolder`.
+platform::Status MakeSampleBundle(const std::string& rootFolder, const std::string& dataFolder,
+                                  const std::string& downloadFolder,
+                                  std::array<std::string, 8>& segmentFolders,
+                                  std::vector<std::string>& made);
 
 } // namespace kori::app

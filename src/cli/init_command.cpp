@@ -48,7 +48,7 @@ void RenameIn(const fs::path& file, const std::string& from, const std::string& 
 
 // Kori.ini, the folders, the oscillator defaults, the colours and, when asked, the sample (its
 // summary is returned for the report).
-std::string BuildRoot(app::Session& session, bool sample) {
+std::string BuildRoot(app::Session& session, bool sample, int service) {
     const auto& f = session.folders;
     // The root and the folders below it are made whole; a folder Kori.ini puts elsewhere must
     // have a parent that exists.
@@ -72,11 +72,27 @@ std::string BuildRoot(app::Session& session, bool sample) {
     auto st =
         app::MakeSampleLibrary(f.SystemFolder, f.DataFolder, session.services().settings, summary);
     if (!st) throw CliError{st.message()};
+    std::vector<std::string> waiting;
+    if (service == 3) {
+        app::ChartDataPaths paths;
+        st = app::MakeSampleBundle(f.SystemFolder, f.DataFolder, f.DownloadFolder, paths, waiting);
+        if (st) st = app::WriteChartPathsFile(f.SystemFolder + "ChtPaths.lst", paths);
+        if (!st) throw CliError{st.message()};
+        session.chartDataPaths = paths;
+    } else {
+        st = app::MakeSampleDayFiles(f.DataFolder, f.DownloadFolder, waiting);
+        if (!st) throw CliError{st.message()};
+        (void)session.ini().Write("Download", "InternetDLfmt", "DDMMMYY.D");
+    }
     // The sample's charts keep their volume bars inside the volume panel.
     auto defaults = chart::LoadChartDefaults(session.ini());
     defaults.LimitVolumeHeight = true;
     chart::SaveChartDefaults(session.ini(), defaults);
-    return "Sample library: " + std::to_string(summary.Securities) + " securities, " +
+    std::string files;
+    for (const auto& w : waiting)
+        files += " " + w;
+    return "Waiting day files in the download folder:" + files +
+           "\nSample library: " + std::to_string(summary.Securities) + " securities, " +
            std::to_string(summary.Records) + " daily records to " + summary.LastDate + " in ";
 }
 
@@ -85,8 +101,12 @@ std::string BuildRoot(app::Session& session, bool sample) {
 void AddInitCommand(CLI::App& app, CliContext& ctx) {
     auto* cmd = app.add_subcommand("init", "Create the install root, Kori.ini and folders");
     auto sample = std::make_shared<bool>(false);
+    auto service = std::make_shared<int>(4);
     cmd->add_flag("--sample", *sample, "Also make the invented sample library");
-    cmd->callback([&ctx, sample] {
+    cmd->add_option("--service", *service,
+                    "Download service of the sample: 4 day files (default) or 3 bundles by market")
+        ->check(CLI::IsMember({3, 4}));
+    cmd->callback([&ctx, sample, service] {
         const fs::path root = app::FindInstallRoot(ctx.root);
         const bool fresh = AbsentOrEmpty(root);
         // The sample never goes over a library that is there: the user's files stay theirs.
@@ -96,7 +116,7 @@ void AddInitCommand(CLI::App& app, CliContext& ctx) {
                            "one with: kori init --sample --root NEW_FOLDER"};
         if (!fresh) {
             // Folders that are missing are made; the files there stay as they are.
-            (void)BuildRoot(ctx.OpenSession(false), false);
+            (void)BuildRoot(ctx.OpenSession(false), false, 0);
             ctx.out << "Install root ready at " << root.string() << "\n";
             return;
         }
@@ -111,12 +131,13 @@ void AddInitCommand(CLI::App& app, CliContext& ctx) {
         try {
             ctx.root = staging.string();
             auto& session = ctx.OpenSession(false);
-            report = BuildRoot(session, *sample);
+            if (*sample) session.download.DataService = static_cast<std::int16_t>(*service);
+            report = BuildRoot(session, *sample, *service);
             MoveFolders(session.folders, platform::FolderWithSlash(staging.string()), finalFolder);
             if (!report.empty()) report += session.folders.DataFolder + "\n";
             app::WritePaths(session);
             // Settings that name a file of the new library (the compare file) name it in place.
-            for (const char* name : {"Kori.ini", "settings.ini"})
+            for (const char* name : {"Kori.ini", "settings.ini", "ChtPaths.lst"})
                 RenameIn(staging / name, platform::FolderWithSlash(staging.string()), finalFolder);
             std::error_code ec;
             fs::rename(staging, root, ec);

@@ -2,6 +2,7 @@
 
 #include "platform/text.h"
 
+#include <algorithm>
 #include <cerrno>
 #include <cstdio>
 #include <cstring>
@@ -17,6 +18,21 @@ namespace kori::platform {
 
 namespace {
 long long g_failAfterBytes = -1;
+long long g_writeBudget = -1; // -1: no budget
+long long g_writeUsed = 0;
+bool g_deferSync = false;
+
+// How many of `size` bytes a write may put down under the injected faults.
+std::size_t AllowedBytes(std::size_t size) {
+    std::size_t limit = size;
+    if (g_failAfterBytes >= 0 && static_cast<std::size_t>(g_failAfterBytes) < limit)
+        limit = static_cast<std::size_t>(g_failAfterBytes);
+    if (g_writeBudget >= 0) {
+        const long long left = std::max(0LL, g_writeBudget - g_writeUsed);
+        if (static_cast<std::size_t>(left) < limit) limit = static_cast<std::size_t>(left);
+    }
+    return limit;
+}
 
 bool WriteAll(int fd, const char* data, std::size_t size) {
     while (size > 0) {
@@ -114,6 +130,38 @@ ScopedWriteFailure::~ScopedWriteFailure() {
     g_failAfterBytes = m_previous;
 }
 
+ScopedWriteBudget::ScopedWriteBudget(long long bytes)
+    : m_previousBudget(g_writeBudget), m_previousUsed(g_writeUsed) {
+    g_writeBudget = bytes;
+    g_writeUsed = 0;
+}
+
+ScopedWriteBudget::~ScopedWriteBudget() {
+    g_writeBudget = m_previousBudget;
+    g_writeUsed = m_previousUsed;
+}
+
+long long ScopedWriteBudget::Used() {
+    return g_writeUsed;
+}
+
+ScopedSyncDeferral::ScopedSyncDeferral(const fs::path& anyFileOnTheFileSystem)
+    : m_folder(anyFileOnTheFileSystem), m_previous(g_deferSync) {
+    g_deferSync = true;
+}
+
+ScopedSyncDeferral::~ScopedSyncDeferral() {
+    g_deferSync = m_previous;
+    if (m_previous) return;
+    const int fd = ::open(m_folder.c_str(), O_RDONLY | O_CLOEXEC);
+    if (fd < 0) {
+        ::sync();
+        return;
+    }
+    (void)::syncfs(fd);
+    ::close(fd);
+}
+
 namespace {
 
 // The file a path names once symbolic links are followed; a dangling link names the place
@@ -157,14 +205,14 @@ int CreateUnique(const fs::path& folder, const std::string& stem, fs::path& made
 }
 
 Status WriteAndSync(int fd, std::string_view content, const fs::path& target) {
-    std::size_t limit = content.size();
-    const bool inject =
-        g_failAfterBytes >= 0 && static_cast<std::size_t>(g_failAfterBytes) < content.size();
-    if (inject) limit = static_cast<std::size_t>(g_failAfterBytes);
+    const std::size_t limit = AllowedBytes(content.size());
+    const bool inject = limit < content.size();
     if (!WriteAll(fd, content.data(), limit))
         return Status::Error(Cannot(target, std::strerror(errno)));
+    g_writeUsed += static_cast<long long>(limit);
     if (inject) return Status::Error(Cannot(target, "write failed"));
-    if (::fsync(fd) != 0) return Status::Error(Cannot(target, std::strerror(errno)));
+    if (!g_deferSync && ::fsync(fd) != 0)
+        return Status::Error(Cannot(target, std::strerror(errno)));
     return Status::Ok();
 }
 
@@ -227,7 +275,8 @@ Status WriteFileAtomic(const fs::path& path, std::string_view content, const Scr
         }
     }
     if (auto s = RenameOver(scratch, target, target); !s) return s;
-    if (!SyncFolder(folder)) return Status::Error(Cannot(target, "the folder could not be synced"));
+    if (!g_deferSync && !SyncFolder(folder))
+        return Status::Error(Cannot(target, "the folder could not be synced"));
     return Status::Ok();
 }
 
@@ -236,10 +285,10 @@ Status AppendToFile(const fs::path& path, std::string_view bytes) {
     const int fd = ::open(target.c_str(), O_WRONLY | O_CREAT | O_APPEND | O_CLOEXEC, 0644);
     if (fd < 0)
         return Status::Error("Cannot write " + target.string() + ": " + std::strerror(errno));
-    const bool inject =
-        g_failAfterBytes >= 0 && static_cast<std::size_t>(g_failAfterBytes) < bytes.size();
+    const bool inject = AllowedBytes(bytes.size()) < bytes.size();
     // An injected failure writes nothing: an append is one record, whole or not at all.
     const bool ok = !inject && WriteAll(fd, bytes.data(), bytes.size());
+    if (ok) g_writeUsed += static_cast<long long>(bytes.size());
     const int savedErrno = inject ? EIO : errno;
     if (::close(fd) != 0 && ok)
         return Status::Error("Cannot write " + target.string() + ": " + std::strerror(errno));

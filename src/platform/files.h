@@ -65,6 +65,39 @@ private:
     long long m_previous;
 };
 
+// For tests: while one is alive, all writes through the gate and all appends together may put
+// down this many bytes; the write that would pass the budget puts down what is left of it (an
+// append: nothing) and fails, and every later write fails at once. Proves that a run stopped by
+// a full disk at any point leaves every file it touched whole.
+class ScopedWriteBudget {
+public:
+    explicit ScopedWriteBudget(long long bytes);
+    ~ScopedWriteBudget();
+    ScopedWriteBudget(const ScopedWriteBudget&) = delete;
+    ScopedWriteBudget& operator=(const ScopedWriteBudget&) = delete;
+    // Bytes the writes have put down so far.
+    static long long Used();
+
+private:
+    long long m_previousBudget;
+    long long m_previousUsed;
+};
+
+// For a bulk writer that replaces thousands of files in one run: while one is alive the gate
+// still writes beside and renames (a killed process leaves each file old or new, never half),
+// but leaves the flush to disk to the end of the scope, when the file system is synced once.
+class ScopedSyncDeferral {
+public:
+    explicit ScopedSyncDeferral(const fs::path& anyFileOnTheFileSystem);
+    ~ScopedSyncDeferral();
+    ScopedSyncDeferral(const ScopedSyncDeferral&) = delete;
+    ScopedSyncDeferral& operator=(const ScopedSyncDeferral&) = delete;
+
+private:
+    fs::path m_folder;
+    bool m_previous;
+};
+
 // Makes one folder inside a folder that exists; false when its parent is missing, so a path
 // read from a file never makes a tree of folders anywhere.
 bool CreateFolder(const fs::path& folder);

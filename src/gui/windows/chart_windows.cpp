@@ -7,6 +7,7 @@
 #include "gui/windows/chts.h"
 #include "gui/windows/main_window.h"
 #include "gui/windows/settings_windows.h"
+#include "platform/date_text.h"
 #include "store/name_file.h"
 
 #include <QApplication>
@@ -150,6 +151,17 @@ bool ChartWindows::ShowCode(const std::string& code) {
     OpenCharts();
     ChtSel* s = chtSel();
     if (!s || !s->selection().TypeCode(code)) return false;
+    s->ShowChart();
+    return chts() != nullptr;
+}
+
+bool ChartWindows::ShowCodeAt(const std::string& code, const std::string& date) {
+    OpenCharts();
+    ChtSel* s = chtSel();
+    if (!s || !s->selection().TypeCode(code)) return false;
+    s->selection().SetFinishDate(platform::IsValidDateText(date)
+                                     ? std::optional(platform::DateTextToDisplay(date))
+                                     : std::nullopt);
     s->ShowChart();
     return chts() != nullptr;
 }

@@ -31,6 +31,8 @@ public:
     void BackToSelection();
     // "&CHARTS", then the code typed into the selection: its chart when found.
     bool ShowCode(const std::string& code);
+    // The same chart ending at a date ("yyyymmdd"; a date that is not one shows the latest).
+    bool ShowCodeAt(const std::string& code, const std::string& date);
     // "Close" of ChtSel: both windows go.
     void CloseAll();
 

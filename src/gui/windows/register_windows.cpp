@@ -1,10 +1,13 @@
 #include "gui/windows/register_windows.h"
 
+#include "gui/windows/adjust_windows.h"
 #include "gui/windows/chart_windows.h"
+#include "gui/windows/entry_windows.h"
 #include "gui/windows/list_windows.h"
 #include "gui/windows/main_window.h"
 #include "gui/windows/maint_windows.h"
 #include "gui/windows/settings_windows.h"
+#include "gui/windows/tool_windows.h"
 
 namespace kori::gui {
 
@@ -14,6 +17,9 @@ void RegisterWindows(MainWindow& main) {
     RegisterChartWindows(main);
     RegisterListWindows(main);
     RegisterMaintWindows(main);
+    RegisterAdjustWindows(main);
+    RegisterToolWindows(main);
+    RegisterEntryWindows(main);
     main.RebuildMenus();
 }
 

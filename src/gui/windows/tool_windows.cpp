@@ -1,0 +1,37 @@
+#include "gui/windows/tool_windows.h"
+
+#include "gui/windows/chart_windows.h"
+#include "gui/windows/chk_dta.h"
+#include "gui/windows/main_window.h"
+#include "gui/windows/text_data.h"
+
+namespace kori::gui {
+
+namespace {
+
+// The chart of a code ending at a date, through the chart road of the main window.
+ShowChartAt ChartsOf(MainWindow& main) {
+    return [&main](const std::string& code, const std::string& date) {
+        if (auto* charts = main.findChild<ChartWindows*>()) charts->ShowCodeAt(code, date);
+    };
+}
+
+// A tool window over the session and the main window's progress, gone when closed.
+template <typename Window, typename... Extra>
+void Register(MainWindow& main, const char* opens, Extra... extra) {
+    main.SetAction(opens, [&main, extra...] {
+        auto* w = new Window(main.session(), main.progress(), extra..., &main);
+        w->setAttribute(Qt::WA_DeleteOnClose);
+        w->open();
+    });
+}
+
+} // namespace
+
+void RegisterToolWindows(MainWindow& main) {
+    Register<ChkDta>(main, "ChkDta", ChartsOf(main));
+    Register<TextData>(main, "TextData");
+    Register<TextFull>(main, "TextFull");
+}
+
+} // namespace kori::gui

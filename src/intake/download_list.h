@@ -1,0 +1,31 @@
+#pragma once
+// The waiting day files of the download folder: their names put into the one form
+// "DDMMMYY.D", listed oldest first, and the update date taken from a list item.
+#include "platform/dialogs.h"
+
+#include <string>
+#include <string_view>
+#include <vector>
+
+namespace kori::intake {
+
+// Sort key of a waiting file's name: century, year, month number, day, then the rest from the
+// eighth character ("15JAN08.D" -> "20080115.D"). Two-digit years 0 to 29 are of this century.
+std::string DownloadSortKey(std::string_view fileName);
+
+// Renames the day files of the other file-name forms to "DDMMMYY.d"; `format` is the setting
+// InternetDLfmt. False, after the message, when the setting names no known form.
+bool NormaliseInternetFileNames(const std::string& downloadFolder, std::string_view format,
+                                platform::Dialogs& dialogs);
+
+// The waiting files ("*.D", any case) oldest first. Service 4 first normalises the names. None
+// waiting shows the message of an empty list.
+std::vector<std::string> BuildDownloadFileList(const std::string& downloadFolder, int dataService,
+                                               std::string_view internetFormat,
+                                               platform::Dialogs& dialogs);
+
+// The update date of a list item as "yyyymmdd": a trimmed item of 9 characters is read as
+// DDMMMYY with years below 20 in this century; anything else gives `today`.
+std::string UpdateDateFromItem(std::string_view item, const std::string& today);
+
+} // namespace kori::intake

@@ -1,0 +1,122 @@
+// The data check from its menu item: the choices, the refusals, the report and its ways out.
+#include "desktop_fixture.h"
+
+#include "gui/widgets/grid_view.h"
+#include "gui/windows/chk_dta.h"
+#include "gui/windows/text_data.h"
+#include "store/price_file.h"
+
+#include <QComboBox>
+#include <QLabel>
+#include <QLineEdit>
+#include <QRadioButton>
+
+namespace kori::test {
+namespace {
+
+struct DataCheckWindows : DesktopTest {
+    gui::ChkDta* Open() {
+        EXPECT_TRUE(main.Trigger("mnuDataCk"));
+        QApplication::processEvents();
+        return main.findChild<gui::ChkDta*>();
+    }
+    void BreakRecord(const char* code, int n) {
+        store::PriceFile f(store::PriceFile::PathFor(s.session.folders.DataFolder, code));
+        ASSERT_TRUE(f.Open());
+        store::PriceRecord r;
+        ASSERT_TRUE(f.Read(n, r));
+        r.High = r.Low - 1;
+        ASSERT_TRUE(f.Write(n, r));
+    }
+};
+
+TEST_F(DataCheckWindows, ReportsAPlantedFaultAndOpensItsChartAtTheDate) {
+    BreakRecord("KRM", 100);
+    auto* chk = Open();
+    ASSERT_NE(chk, nullptr);
+    EXPECT_EQ(chk->listBox()->itemText(0).toStdString(), "Full List (Names.Dat)");
+    EXPECT_EQ(chk->gapEdit()->text().toStdString(), "10");
+    auto* report = chk->Check();
+    ASSERT_NE(report, nullptr);
+    const auto& rows = report->grid()->model().rows();
+    int krmRow = -1;
+    for (int i = 0; i < static_cast<int>(rows.size()); ++i)
+        if (rows[static_cast<std::size_t>(i)][0] == "KRM") krmRow = i;
+    ASSERT_GE(krmRow, 0);
+    EXPECT_EQ(rows[static_cast<std::size_t>(krmRow)][3], "100");
+    EXPECT_EQ(rows[static_cast<std::size_t>(krmRow)][4], "High below low");
+
+    report->grid()->setCurrentCell(krmRow, 0);
+    report->ShowChart();
+    QApplication::processEvents();
+    ASSERT_NE(chts(), nullptr);
+    const auto& request = charts()->state().Request;
+    EXPECT_TRUE(request.ByFinishDate);
+    EXPECT_EQ(request.FinishDate, report->findings()[static_cast<std::size_t>(krmRow)].Date);
+
+    const auto csv = s.root.path() / "report.csv";
+    ASSERT_TRUE(report->ExportCsv(csv.string()));
+    const auto text = platform::ReadWholeFile(csv);
+    ASSERT_TRUE(text);
+    EXPECT_NE(text->find("KRM,"), std::string::npos);
+}
+
+TEST_F(DataCheckWindows, RefusesLimitsThatAreNotNumbersAndKeepsGoodOnes) {
+    auto* chk = Open();
+    ASSERT_NE(chk, nullptr);
+    chk->gapEdit()->setText("ten");
+    EXPECT_EQ(chk->Check(), nullptr);
+    ASSERT_EQ(s.dialogs.messages().size(), 1u);
+    EXPECT_EQ(s.dialogs.messages()[0], "The gap must be a whole number of weekdays from 1 to 9999");
+    chk->gapEdit()->setText("4");
+    chk->moveEdit()->setText("50");
+    ASSERT_NE(chk->Check(), nullptr);
+    const auto kept = maint::LoadDataCheckSettings(s.settings);
+    EXPECT_EQ(kept.GapWeekdays, 4);
+    EXPECT_DOUBLE_EQ(kept.MoveAlertPercent, 50);
+}
+
+TEST_F(DesktopTest, ClosingPricesOfADayFromTheMenu) {
+    ASSERT_TRUE(main.Trigger("mnuTextFile"));
+    QApplication::processEvents();
+    auto* w = main.findChild<gui::TextData*>();
+    ASSERT_NE(w, nullptr);
+    const auto file = s.root.path() / "closes.csv";
+    w->fileEdit()->setText(QString::fromStdString(file.string()));
+    w->dateEdit()->setText(QStringLiteral("31/2/26"));
+    EXPECT_FALSE(w->Create().Ok);
+    ASSERT_EQ(s.dialogs.messages().size(), 1u);
+    EXPECT_EQ(s.dialogs.messages()[0], "Date must be entered as d/m/yy eg. 9/4/95 or 29/9/95");
+    w->dateEdit()->setText(QStringLiteral("20/11/26"));
+    const auto r = w->Create();
+    ASSERT_TRUE(r.Ok) << r.Message;
+    EXPECT_EQ(w->status()->text().toStdString(), r.Message);
+    const auto text = platform::ReadWholeFile(file);
+    ASSERT_TRUE(text);
+    EXPECT_NE(text->find("\nKRM,Karoo Minerals,2026-11-20,1.41,"), std::string::npos) << *text;
+}
+
+TEST_F(DesktopTest, DataOfAListAsDayFilesFromTheMenu) {
+    ASSERT_TRUE(main.Trigger("mnuTFD"));
+    QApplication::processEvents();
+    auto* w = main.findChild<gui::TextFull*>();
+    ASSERT_NE(w, nullptr);
+    w->aList()->setChecked(true);
+    w->fromEdit()->setText(QStringLiteral("19/11/26"));
+    w->toEdit()->setText(QStringLiteral("18/11/26"));
+    w->dayFiles()->setChecked(true);
+    const auto folder = s.root.path() / "days";
+    w->outputEdit()->setText(QString::fromStdString(folder.string()));
+    EXPECT_FALSE(w->Create().Ok); // the range runs backwards
+    EXPECT_EQ(s.dialogs.messages().back(), "The first day comes after the last");
+    w->toEdit()->clear();
+    const auto r = w->Create();
+    ASSERT_TRUE(r.Ok) << r.Message;
+    EXPECT_EQ(test::FilesIn(folder), (std::vector<std::string>{"19NOV26.D", "20NOV26.D"}));
+    const auto day = platform::ReadWholeFile(folder / "20NOV26.D");
+    ASSERT_TRUE(day);
+    EXPECT_NE(day->find("KRM,20261120,1.43,1.435,1.395,1.41,5755360,0\n"), std::string::npos);
+}
+
+} // namespace
+} // namespace kori::test
