@@ -16,7 +16,7 @@ struct CellVerdict {
     bool Accepted = true;
     std::string Text;
     std::string Message;
-    std::string Title;   // of the message; empty: the grid's own title
+    std::string Title;   // of the message box; empty: the grid's own title
     bool Revert = false; // refused, and the cell keeps the text it had (a column not edited)
 };
 

@@ -49,6 +49,28 @@ std::int32_t VolumeOf(std::string_view bytes, std::size_t i) {
     return static_cast<std::int32_t>(u);
 }
 
+bool DatesEqual(std::string_view bytes, std::size_t i, std::size_t j) {
+    const std::string_view a = DateField(bytes, i), b = DateField(bytes, j);
+    if (a == b) return true;
+    // Equal once trimmed only when a blank (or a zero byte) stands at either end of one of them.
+    const auto padded = [](std::string_view d) {
+        return d.front() == ' ' || d.back() == ' ' || d.back() == '\0';
+    };
+    return (padded(a) || padded(b)) && TrimmedDate(a) == TrimmedDate(b);
+}
+
+// Whether the records stand in date order with no date twice: the file needs no rewrite.
+bool AlreadyClean(std::string_view bytes) {
+    const std::size_t n = bytes.size() / kSize;
+    double previous = 0;
+    for (std::size_t i = 0; i < n; ++i) {
+        const double key = DateValue(DateField(bytes, i));
+        if (i > 0 && (key < previous || DatesEqual(bytes, i - 1, i))) return false;
+        previous = key;
+    }
+    return true;
+}
+
 } // namespace
 
 std::string SortRecordsByDate(std::string_view bytes) {
@@ -86,7 +108,7 @@ std::string RemoveDuplicateDates(std::string_view bytes) {
             out.append(bytes.substr(i * kSize, kSize));
             break;
         }
-        if (TrimmedDate(DateField(bytes, i)) != TrimmedDate(DateField(bytes, i + 1))) {
+        if (!DatesEqual(bytes, i, i + 1)) {
             out.append(bytes.substr(i * kSize, kSize));
             continue;
         }
@@ -115,7 +137,10 @@ RepairResult RemDupST(std::string_view folderIn, platform::Progress& progress) {
                     {platform::Severity::Error, "Cannot read " + name, name, 0});
                 return store::WalkStep::Continue;
             }
-            const std::string whole = bytes->substr(0, bytes->size() / kSize * kSize);
+            const std::string_view whole(bytes->data(), bytes->size() / kSize * kSize);
+            // Most files of a library are in order already: one pass tells, and they are left.
+            if (whole.size() == bytes->size() && AlreadyClean(whole))
+                return store::WalkStep::Continue;
             const std::string sorted = SortRecordsByDate(whole);
             progress.SetStatus(std::string(rd::kRemoving) + code);
             const std::string kept = RemoveDuplicateDates(sorted);

@@ -5,6 +5,7 @@
 #include "gui/windows/entry_windows.h"
 #include "gui/windows/list_windows.h"
 #include "gui/windows/main_window.h"
+#include "gui/windows/maint_windows.h"
 #include "gui/windows/settings_windows.h"
 #include "gui/windows/tool_windows.h"
 
@@ -15,6 +16,7 @@ void RegisterWindows(MainWindow& main) {
     RegisterSettingsWindows(main);
     RegisterChartWindows(main);
     RegisterListWindows(main);
+    RegisterMaintWindows(main);
     RegisterAdjustWindows(main);
     RegisterToolWindows(main);
     RegisterEntryWindows(main);
