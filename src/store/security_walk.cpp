@@ -39,12 +39,22 @@ Status WalkOrder(const SecurityList& list, std::int16_t nameCount, std::vector<i
 // whole number of records is reported and the whole records are still read.
 std::optional<Issue> PriceFileIssue(WalkItem& item, platform::Issues& issues) {
     const std::string name = item.PriceFile.filename().string();
-    if (!platform::FileExists(item.PriceFile))
+    // One look at the file: the walk meets thousands of them.
+    std::error_code ec;
+    const auto status = std::filesystem::status(item.PriceFile, ec);
+    if (ec || !std::filesystem::exists(status))
         return Issue{Severity::Warning, "No price file " + name, name, 0};
-    const auto size = platform::FileSizeOr0(item.PriceFile);
-    if (size == 0) return Issue{Severity::Warning, name + " holds no records", name, 0};
-    if (auto s = CountRecords(item.PriceFile, PriceRecord::kSize, item.PriceRecords); !s)
-        return Issue{Severity::Error, s.message(), name, 0};
+    const auto size = std::filesystem::is_regular_file(status)
+                          ? std::filesystem::file_size(item.PriceFile, ec)
+                          : std::uintmax_t{0};
+    if (ec || size == 0) return Issue{Severity::Warning, name + " holds no records", name, 0};
+    const auto records = size / PriceRecord::kSize;
+    if (records > static_cast<std::uintmax_t>(kMaxRecords))
+        return Issue{Severity::Error,
+                     name + " holds " + std::to_string(records) +
+                         " records; a file can hold at most 32767.",
+                     name, 0};
+    item.PriceRecords = static_cast<std::int16_t>(records);
     if (size % PriceRecord::kSize != 0)
         issues.push_back({Severity::Warning,
                           name + " ends in part of a record; the part is not read", name,
