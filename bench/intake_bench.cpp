@@ -46,8 +46,7 @@ std::vector<std::string> Codes() {
 // Every price file back to its 5000 records, Names.dat to its 3000.
 void CutBack(const std::string& folder) {
     for (const auto& c : Codes())
-        (void)::truncate((folder + c + ".WDT").c_str(),
-                         static_cast<off_t>(kShape.Records) * 50);
+        (void)::truncate((folder + c + ".WDT").c_str(), static_cast<off_t>(kShape.Records) * 50);
     (void)::truncate((folder + "Names.dat").c_str(), static_cast<off_t>(kShape.Securities) * 96);
 }
 
@@ -192,6 +191,39 @@ void BM_FloorOpenAndAppend(benchmark::State& state) {
     }
 }
 BENCHMARK(BM_FloorOpenAndAppend)->Unit(benchmark::kMillisecond)->UseRealTime()->Iterations(10);
+
+// Floor of an insert day: read each file whole, write it beside with one record more and rename
+// it over the old one, with nothing else (no search, no fsync).
+void BM_FloorRewriteBeside(benchmark::State& state) {
+    const std::string market = Market();
+    CutBack(market);
+    const fs::path work = BenchFolder() / "work";
+    LinkMarket(market, work);
+    const std::string record(50, 'x');
+    std::string bytes;
+    for (auto _ : state) {
+        for (const auto& c : Codes()) {
+            const std::string f = (work / (c + ".WDT")).string();
+            const int in = ::open(f.c_str(), O_RDONLY | O_CLOEXEC);
+            bytes.resize(static_cast<std::size_t>(kShape.Records) * 50);
+            const bool read =
+                ::read(in, bytes.data(), bytes.size()) == static_cast<ssize_t>(bytes.size());
+            ::close(in);
+            bytes.insert(bytes.size() - 500, record);
+            const std::string tmp = f + ".new";
+            const int out = ::open(tmp.c_str(), O_WRONLY | O_CREAT | O_TRUNC | O_CLOEXEC, 0644);
+            const bool wrote =
+                ::write(out, bytes.data(), bytes.size()) == static_cast<ssize_t>(bytes.size());
+            ::close(out);
+            if (!read || !wrote || ::rename(tmp.c_str(), f.c_str()) != 0)
+                state.SkipWithError("rewrite failed");
+        }
+        state.PauseTiming();
+        LinkMarket(market, work);
+        state.ResumeTiming();
+    }
+}
+BENCHMARK(BM_FloorRewriteBeside)->Unit(benchmark::kMillisecond)->UseRealTime()->Iterations(5);
 
 } // namespace
 

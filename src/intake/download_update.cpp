@@ -8,12 +8,12 @@
 #include "store/security_walk.h"
 
 #include <algorithm>
-#include <fcntl.h>
-#include <sys/stat.h>
-#include <unistd.h>
 #include <cmath>
+#include <fcntl.h>
 #include <map>
 #include <optional>
+#include <sys/stat.h>
+#include <unistd.h>
 
 namespace kori::intake {
 
@@ -529,25 +529,31 @@ bool DownloadRun::CreateSecurity(const DownloadLine& d, const std::string& code,
         n.Category = 1;
         if (target.Segment == "EQUITIES " && code.size() == 6) {
             switch (Upper(code.substr(3, 1))[0]) {
-            case 'E': n.Category = 86; break;
-            case 'I': n.Category = 87; break;
-            case 'W': n.Category = 84; break;
-            default: n.Category = 88;
+            case 'E':
+                n.Category = 86;
+                break;
+            case 'I':
+                n.Category = 87;
+                break;
+            case 'W':
+                n.Category = 84;
+                break;
+            default:
+                n.Category = 88;
             }
         }
         if (target.Options)
-            n.OtherDetails = "0" + d.OptType +
-                             ShortDate(platform::DateTextFromSerial(
-                                           platform::DaySerial(d.Date).value_or(0) +
-                                           static_cast<std::int32_t>(d.Spare))
-                                           .value_or(""));
+            n.OtherDetails =
+                "0" + d.OptType +
+                ShortDate(platform::DateTextFromSerial(platform::DaySerial(d.Date).value_or(0) +
+                                                       static_cast<std::int32_t>(d.Spare))
+                              .value_or(""));
         const auto namesPath = store::NameFile::PathIn(target.Folder);
         std::int16_t nameCount = 0;
         if (auto s = store::CountRecords(namesPath, NameRecord::kSize, nameCount); !s)
             return Fail(s.message());
         if (nameCount >= store::kMaxRecords)
-            return Fail(namesPath.string() + " holds 32767 records; " + code +
-                        " cannot be added.");
+            return Fail(namesPath.string() + " holds 32767 records; " + code + " cannot be added.");
         const auto bytes = n.Encode();
         if (auto s = platform::AppendToFile(namesPath, {bytes.data(), bytes.size()}); !s)
             return Fail(s.message());
@@ -793,9 +799,9 @@ FillResult FillNoTradeDays(const std::string& folder, const std::string& dayDate
             std::array<char, 50> lastBytes{};
             struct stat st {};
             const int fd = ::open(item.PriceFile.c_str(), O_RDONLY | O_CLOEXEC);
-            const bool read = fd >= 0 && ::fstat(fd, &st) == 0 &&
-                              ::pread(fd, lastBytes.data(), 50,
-                                      static_cast<off_t>(count - 1) * 50) == 50;
+            const bool read =
+                fd >= 0 && ::fstat(fd, &st) == 0 &&
+                ::pread(fd, lastBytes.data(), 50, static_cast<off_t>(count - 1) * 50) == 50;
             if (fd >= 0) ::close(fd);
             if (!read) {
                 result.Status = Status::Error("Cannot read " + item.PriceFile.string());
