@@ -10,37 +10,83 @@ namespace {
 const std::string kEmpty;
 }
 
-GridModel::GridModel(std::vector<std::string> headers, CellCheck check)
-    : m_headers(std::move(headers)), m_check(std::move(check)) {}
+GridModel::GridModel(std::vector<std::string> headers, CellCheck check, int hiddenColumns)
+    : m_headers(std::move(headers)), m_check(std::move(check)),
+      m_hidden(std::max(0, hiddenColumns)) {}
 
 const std::string& GridModel::cell(int row, int column) const {
-    if (row < 0 || row >= rowCount() || column < 0 || column >= columnCount()) return kEmpty;
+    if (row < 0 || row >= rowCount() || column < 0 || column >= columnCount() + m_hidden)
+        return kEmpty;
     return m_rows[static_cast<std::size_t>(row)][static_cast<std::size_t>(column)];
 }
 
+void GridModel::SetReadOnly(int column, std::string message, std::string title) {
+    m_readOnly.push_back({column, std::move(message), std::move(title)});
+}
+
+void GridModel::PutCell(int row, int column, std::string text) {
+    if (row < 0 || row >= rowCount() || column < 0 || column >= columnCount() + m_hidden) return;
+    m_rows[static_cast<std::size_t>(row)][static_cast<std::size_t>(column)] = std::move(text);
+    if (column < columnCount()) m_changed = true;
+}
+
+void GridModel::SetHiddenCell(int row, int column, std::string text) {
+    if (row < 0 || row >= rowCount() || column < columnCount() ||
+        column >= columnCount() + m_hidden)
+        return;
+    m_rows[static_cast<std::size_t>(row)][static_cast<std::size_t>(column)] = std::move(text);
+}
+
 CellVerdict GridModel::Check(int column, const std::string& text) const {
-    if (!m_check) return {true, text, {}};
+    if (!m_check) return {true, text, {}, {}};
     return m_check(column, text);
+}
+
+void GridModel::PutInForm(std::vector<Row>& rows) const {
+    for (Row& r : rows) {
+        r.resize(Width());
+        for (std::size_t c = 0; c < m_headers.size(); ++c) {
+            CellVerdict v = Check(static_cast<int>(c), r[c]);
+            if (v.Accepted) r[c] = std::move(v.Text);
+        }
+    }
 }
 
 void GridModel::Load(std::vector<Row> rows) {
     m_rows = std::move(rows);
-    for (Row& r : m_rows) {
-        r.resize(m_headers.size());
-        for (std::size_t c = 0; c < r.size(); ++c) {
-            const CellVerdict v = Check(static_cast<int>(c), r[c]);
-            if (v.Accepted) r[c] = v.Text;
-        }
-    }
+    PutInForm(m_rows);
     m_changed = false;
+}
+
+void GridModel::LoadInForm(std::vector<Row> rows) {
+    m_rows = std::move(rows);
+    for (Row& r : m_rows)
+        if (r.size() != Width()) r.resize(Width());
+    m_changed = false;
+}
+
+void GridModel::ReplaceRows(std::vector<Row> rows) {
+    m_rows = std::move(rows);
+    PutInForm(m_rows);
+    m_changed = true;
 }
 
 CellVerdict GridModel::SetCell(int row, int column, std::string text) {
     if (row < 0 || row >= rowCount() || column < 0 || column >= columnCount())
-        return {false, text, "No such cell"};
+        return {false, text, "No such cell", {}};
+    for (const auto& ro : m_readOnly)
+        if (ro.Column == column) {
+            const std::string& had =
+                m_rows[static_cast<std::size_t>(row)][static_cast<std::size_t>(column)];
+            return {false, had, ro.Message, ro.Title, true};
+        }
     CellVerdict v = Check(column, text);
-    m_rows[static_cast<std::size_t>(row)][static_cast<std::size_t>(column)] =
-        v.Accepted ? v.Text : text;
+    std::string& stored = m_rows[static_cast<std::size_t>(row)][static_cast<std::size_t>(column)];
+    if (!v.Accepted && v.Revert) {
+        v.Text = stored; // a column that is not edited keeps what it had
+        return v;
+    }
+    stored = v.Accepted ? v.Text : text;
     if (!v.Accepted) v.Text = text;
     m_changed = true;
     return v;
@@ -48,7 +94,7 @@ CellVerdict GridModel::SetCell(int row, int column, std::string text) {
 
 int GridModel::InsertRow(int at) {
     if (at < 0 || at > rowCount()) at = rowCount();
-    m_rows.insert(m_rows.begin() + at, Row(m_headers.size()));
+    m_rows.insert(m_rows.begin() + at, Row(Width()));
     m_changed = true;
     return at;
 }
@@ -64,7 +110,7 @@ std::optional<CellRefusal> GridModel::FirstRefusal() const {
     for (int r = 0; r < rowCount(); ++r)
         for (int c = 0; c < columnCount(); ++c) {
             const CellVerdict v = Check(c, cell(r, c));
-            if (!v.Accepted) return CellRefusal{r, c, v.Message};
+            if (!v.Accepted) return CellRefusal{r, c, v.Message, v.Title};
         }
     return std::nullopt;
 }

@@ -99,7 +99,8 @@ std::vector<MenuItem> BuildMenuTree() {
                         Item("mnuChtScan3", "Chart Scan &3 - Parabolic", "ChtScan3"),
                         Item("mnuMMAScan", "Chart Scan &4 - Multiple Moving Averages", "KoriMMA"),
                         Item("mnuAvCO", "Chart Scan &5 - Averages Crossover", "ChtScan6"),
-                        Item("mnStats", "Market S&tatistics", "Statistics")}));
+                        Item("mnStats", "Market S&tatistics", "Statistics"),
+                        Item("mnuTargets", "Price &Targets (Quoren Alerts)", "Targets", true)}));
     tops.push_back(Top("mnuHelp", "&Help",
                        {Item("mnSHlp", "KORI Charting Help", "Help"),
                         Item("mnuAboutKORI", "&About KORI", "AbtKori")}));

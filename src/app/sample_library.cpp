@@ -2,9 +2,11 @@
 
 #include "platform/date_text.h"
 #include "platform/files.h"
+#include "platform/number_format.h"
 #include "store/chart_list.h"
 #include "store/name_file.h"
 #include "store/price_file.h"
+#include "store/targets_file.h"
 
 #include <algorithm>
 #include <cmath>
@@ -215,6 +217,93 @@ platform::Status WriteClassFiles(const std::string& systemFolder) {
     return platform::WriteFileAtomic(platform::ResolveIn(systemFolder, "Gics.dat"), gics);
 }
 
+// Targets that the last day of the sample meets in each of the four ways, and a security on two
+// lines whose targets stay out of reach, worked out from that day's prices.
+platform::Status WriteSampleTargets(const std::string& systemFolder,
+                                    const std::map<std::string, store::PriceRecord>& lastDay) {
+    const auto price = [](float p) { return platform::FormatSingle(p, "0.00#"); };
+    const auto& frg = lastDay.at("FRG");
+    const auto& gln = lastDay.at("GLN");
+    const auto& twr = lastDay.at("TWR");
+    const auto& vnt = lastDay.at("VNT");
+    const auto& yra = lastDay.at("YRA");
+    const std::vector<store::TargetLine> lines = {
+        {"FRG", price(frg.Low), "U"},          // the day's low: reached
+        {"GLN", price(gln.Low * 0.95f), "U"},  // below the whole day: exceeded
+        {"TWR", price(twr.High), "D"},         // the day's high: reached
+        {"VNT", price(vnt.High * 1.05f), "D"}, // above the whole day: exceeded
+        {"YRA", price(yra.High * 1.1f), "U"},  // out of reach either way
+        {"YRA", price(yra.Low * 0.9f), "D"},
+    };
+    return store::WriteTargetsFile(store::TargetsFilePath(systemFolder), lines);
+// Securities whose last days are placed so that every scan finds something: a rise of exactly
+// 10%, overbought and oversold oscillators, breaks of the parabolic stop up and down, a volume
+// spike, two averages together, and an advance-decline series whose totals need recomputing.
+platform::Status AddScanExamples(const std::string& dataFolder,
+                                 const std::vector<std::string>& dates,
+                                 std::vector<store::NameRecord>& names, SampleSummary& summary) {
+    struct Example {
+        const char* code;
+        const char* name;
+        std::int16_t type;
+        std::vector<float> lastCloses; // the closes of the last days; earlier days stand at the
+                                       // first of them
+        std::int32_t lastVolume = 0;   // 0: as the other days
+    };
+    auto ramp = [](float from, float step, int days) {
+        std::vector<float> v;
+        for (int i = 0; i < days; ++i)
+            v.push_back(std::round((from + step * static_cast<float>(i)) * 100) / 100);
+        return v;
+    };
+    auto then = [](std::vector<float> v, float last) {
+        v.push_back(last);
+        return v;
+    };
+    const std::vector<Example> examples = {
+        {"TENUP", "Tenfold Mining (ten per cent rise)", 4, {2.00f, 2.00f, 2.00f, 2.20f}},
+        {"OBHI", "Overbought Holdings", 4, ramp(1.00f, 0.05f, 40)},
+        {"OSLO", "Oversold Logistics", 4, ramp(4.00f, -0.05f, 40)},
+        {"PARUP", "Parabola Up Resources", 4, then(ramp(4.00f, -0.05f, 40), 4.50f)},
+        {"PARDN", "Parabola Down Resources", 4, then(ramp(1.00f, 0.05f, 40), 0.50f)},
+        {"VOLSP", "Volume Spike Ventures", 4, {0.80f, 0.80f, 0.81f}, 50000000},
+        {"AVGX", "Average Crossing Estates", 4, std::vector<float>(40, 0.95f)},
+        {"ADNEW", "New Advance Decline Series (sample)", 3, {}},
+    };
+    Random rng(77);
+    for (const auto& e : examples) {
+        store::NameRecord n;
+        n.Code = e.code;
+        n.Name = e.name;
+        n.RecordType = e.type;
+        n.Category = 1;
+        n.IndustryClass = "121";
+        names.push_back(n);
+        std::vector<store::PriceRecord> recs;
+        for (std::size_t i = 0; i < dates.size(); ++i) {
+            store::PriceRecord r;
+            r.Date = dates[i];
+            if (e.type == 3) { // advances and declines without their running total
+                r.High = static_cast<float>(300 + static_cast<int>(rng.Uniform() * 400));
+                r.Low = static_cast<float>(300 + static_cast<int>(rng.Uniform() * 400));
+                recs.push_back(r);
+                continue;
+            }
+            const std::size_t fromEnd = dates.size() - 1 - i;
+            const auto& c = e.lastCloses;
+            r.Close = fromEnd < c.size() ? c[c.size() - 1 - fromEnd] : c.front();
+            r.Open = r.High = r.Low = r.Close;
+            r.Volume = 100000 + static_cast<std::int32_t>(rng.Uniform() * 20000);
+            if (fromEnd == 0 && e.lastVolume > 0) r.Volume = e.lastVolume;
+            recs.push_back(r);
+        }
+        store::PriceFile pf(store::PriceFile::PathFor(dataFolder, e.code));
+        if (auto st = pf.WriteAll(recs); !st) return st;
+        summary.Records += static_cast<int>(recs.size());
+    }
+    return platform::Status::Ok();
+}
+
 } // namespace
 
 platform::Status MakeSampleLibrary(const std::string& systemFolder, const std::string& dataFolder,
@@ -223,6 +312,7 @@ platform::Status MakeSampleLibrary(const std::string& systemFolder, const std::s
     const auto dates = Weekdays();
     Random rng(20261120);
     std::vector<store::NameRecord> names;
+    std::map<std::string, store::PriceRecord> lastDay;
     summary = SampleSummary{};
     for (const auto& s : Securities()) {
         store::NameRecord n;
@@ -242,8 +332,10 @@ platform::Status MakeSampleLibrary(const std::string& systemFolder, const std::s
         store::PriceFile pf(store::PriceFile::PathFor(dataFolder, s.code));
         if (auto st = pf.WriteAll(recs); !st) return st;
         summary.Records += static_cast<int>(recs.size());
+        lastDay[s.code] = recs.back();
     }
     names[names.size() - 4].OtherDetails = "Exp 30/06/27"; // a warrant's details
+    if (auto st = AddScanExamples(dataFolder, dates, names, summary); !st) return st;
     names[3].PercentBandUp = 8;
     names[3].PercentBandDown = 8;
     store::NameFile nf(store::NameFile::PathIn(dataFolder));
@@ -252,6 +344,7 @@ platform::Status MakeSampleLibrary(const std::string& systemFolder, const std::s
     summary.LastDate = kLastDate;
 
     if (auto st = WriteClassFiles(systemFolder); !st) return st;
+    if (auto st = WriteSampleTargets(systemFolder, lastDay); !st) return st;
     if (auto st = store::SaveListFromCodes(dataFolder, 'A', {"HBK", "IRB", "JNS", "KST", "LMT"});
         !st)
         return st;

@@ -1,29 +1,20 @@
 #include "chart/targets.h"
 
-#include "platform/files.h"
 #include "platform/text.h"
+#include "store/targets_file.h"
 
 #include <algorithm>
-#include <sstream>
 
 namespace kori::chart {
 
 std::vector<float> ReadTargetPrices(const std::filesystem::path& targetsFile,
                                     std::string_view code) {
     std::vector<float> prices;
-    const auto content = platform::ReadWholeFile(targetsFile);
-    if (!content) return prices;
-    std::istringstream in(*content);
-    std::string line;
-    const std::string wanted = platform::Trim(code);
-    while (prices.size() < 2 && std::getline(in, line)) {
-        if (!line.empty() && line.back() == '\r') line.pop_back();
-        const auto comma = line.find(',');
-        if (comma == std::string::npos) continue;
-        if (platform::Trim(line.substr(0, comma)) != wanted) continue;
-        const auto next = line.find(',', comma + 1);
-        prices.push_back(static_cast<float>(platform::Val(
-            line.substr(comma + 1, next == std::string::npos ? next : next - comma - 1))));
+    const std::string wanted = platform::Upper(platform::Trim(code));
+    for (const auto& line : store::ReadTargetsFile(targetsFile)) {
+        if (prices.size() == 2) break;
+        if (platform::Upper(line.Code) != wanted) continue;
+        prices.push_back(static_cast<float>(platform::Val(line.Target)));
     }
     return prices;
 }

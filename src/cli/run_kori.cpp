@@ -29,7 +29,14 @@ int RunKori(int argc, const char* const* argv, std::ostream& out, std::ostream& 
     AddScaleCommand(app, ctx);
     AddIndicatorCommand(app, ctx);
     AddUpdateCommand(app, ctx);
+    AddTargetsCommand(app, ctx);
+    AddEntryCommand(app, ctx);
+    AddScanCommands(app, ctx);
+    AddAdjustCommand(app, ctx);
+    AddDataCommand(app, ctx);
+    AddRepairCommand(app, ctx);
     AddCheckCommand(app, ctx);
+    AddExportCommand(app, ctx);
 
     try {
         app.parse(argc, argv);

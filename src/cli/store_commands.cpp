@@ -1,6 +1,7 @@
 // kori names, kori bars, kori lists: the library as text and JSON.
 #include "cli/cli_context.h"
 #include "cli/json_out.h"
+#include "cli/maint_commands.h"
 
 #include "platform/files.h"
 #include "platform/text.h"
@@ -39,8 +40,18 @@ void AddNamesCommand(CLI::App& app, CliContext& ctx) {
     auto codes = std::make_shared<bool>(false);
     cmd->add_flag("--json", *asJson, "JSON array of the name records");
     cmd->add_flag("--codes", *codes, "One code a line");
-    cmd->callback([&ctx, asJson, codes] {
+    auto sort = std::make_shared<std::string>();
+    auto dedupe = std::make_shared<bool>(false);
+    cmd->add_option("--sort", *sort, "Sort and save the file first")
+        ->check(CLI::IsMember({"code", "category", "industry", "gics"}));
+    cmd->add_flag("--dedupe", *dedupe,
+                  "Sort by code and remove duplicate codes, saving the file first");
+    cmd->callback([&ctx, asJson, codes, sort, dedupe] {
         auto& session = ctx.OpenSession();
+        if (!sort->empty() || *dedupe) {
+            (void)ReadNames(session); // no name file: say so
+            RunNamesMaintenance(ctx, session, *sort, *dedupe);
+        }
         const auto names = ReadNames(session);
         if (*codes) {
             for (const auto& n : names)

@@ -13,4 +13,10 @@ struct RsiResult {
 
 RsiResult ComputeRSI(const store::ChartSeries& series, std::int16_t period);
 
+// The figure of one bar from its own window alone (closes[i - P] .. closes[i - 1], P - 1
+// pairs added oldest first), for the scans that need the last bars only; nullopt when the
+// window holds no fall (the line would keep its earlier level). `i` must be at least P.
+std::optional<float> RsiWindowFigure(std::span<const float> closes, std::int16_t period,
+                                     std::size_t i);
+
 } // namespace kori::osc

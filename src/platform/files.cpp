@@ -104,9 +104,22 @@ bool FileHasData(const fs::path& path) {
 std::optional<std::string> ReadWholeFile(const fs::path& path) {
     std::ifstream in(ResolvePath(path), std::ios::binary);
     if (!in) return std::nullopt;
-    std::ostringstream ss;
-    ss << in.rdbuf();
-    return ss.str();
+    // One read of the size the file has; a file that grows meanwhile gives the rest below.
+    in.seekg(0, std::ios::end);
+    const auto size = in.tellg();
+    in.seekg(0, std::ios::beg);
+    std::string bytes;
+    if (size > 0) {
+        bytes.resize(static_cast<std::size_t>(size));
+        in.read(bytes.data(), static_cast<std::streamsize>(size));
+        bytes.resize(static_cast<std::size_t>(in.gcount()));
+        if (in.gcount() < static_cast<std::streamsize>(size)) return bytes;
+    }
+    in.clear();
+    std::ostringstream rest;
+    rest << in.rdbuf();
+    bytes += rest.str();
+    return bytes;
 }
 
 ScopedWriteFailure::ScopedWriteFailure(long long bytes) : m_previous(g_failAfterBytes) {

@@ -127,6 +127,30 @@ std::string StrSingle(float value) {
     return ClassicStr(static_cast<double>(value), 7);
 }
 
+bool IsNumber(std::string_view text) {
+    const std::string t = Trim(text);
+    std::size_t i = 0;
+    const auto digitsAt = [&t](std::size_t& at) {
+        const std::size_t from = at;
+        while (at < t.size() && std::isdigit(static_cast<unsigned char>(t[at])))
+            ++at;
+        return at - from;
+    };
+    if (i < t.size() && (t[i] == '-' || t[i] == '+')) ++i;
+    std::size_t digits = digitsAt(i);
+    if (i < t.size() && t[i] == '.') {
+        ++i;
+        digits += digitsAt(i);
+    }
+    if (digits == 0) return false;
+    if (i < t.size() && (t[i] == 'e' || t[i] == 'E')) {
+        ++i;
+        if (i < t.size() && (t[i] == '-' || t[i] == '+')) ++i;
+        if (digitsAt(i) == 0) return false;
+    }
+    return i == t.size();
+}
+
 double Val(std::string_view text) {
     std::size_t i = 0;
     while (i < text.size() && IsBlank(text[i]))

@@ -30,6 +30,11 @@ std::string StrSingle(float value);
 // read (sign, digits, point, exponent; "&H" hex), anything else reads 0.
 double Val(std::string_view text);
 
+// The whole text, blanks aside, is one decimal number: a sign, digits with at most one point
+// (at least one digit) and an exponent ("1.5", "-.25", "2e3"). What a field that must hold a
+// number accepts; Val alone would read "1.5x" as 1.5.
+bool IsNumber(std::string_view text);
+
 // Shortest text that reads back to the same 32-bit float ("0.1", "12.5", "1e+20").
 std::string FloatText(float value);
 

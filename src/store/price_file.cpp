@@ -6,7 +6,10 @@
 #include "store/record_codec.h"
 
 #include <algorithm>
+#include <cerrno>
+#include <fcntl.h>
 #include <fstream>
+#include <unistd.h>
 
 namespace kori::store {
 
@@ -55,6 +58,31 @@ Status PriceFile::OpenWithData() {
         return Status::Error("No Data for " + name);
     if (auto s = Open(); !s) return s;
     if (Count() < 1) return Status::Error("No Data for " + name);
+    return Status::Ok();
+}
+
+Status ReadPriceRecords(const std::filesystem::path& file, int first, int last,
+                        std::string& bytes) {
+    bytes.clear();
+    if (first < 1 || last < first) return Status::Ok();
+    const int fd = ::open(file.c_str(), O_RDONLY | O_CLOEXEC);
+    if (fd < 0) return Status::Error("Cannot open " + file.filename().string());
+    const std::size_t size = static_cast<std::size_t>(last - first + 1) * PriceRecord::kSize;
+    bytes.resize(size);
+    auto offset = static_cast<off_t>(first - 1) * static_cast<off_t>(PriceRecord::kSize);
+    std::size_t done = 0;
+    while (done < size) {
+        const ssize_t n = ::pread(fd, bytes.data() + done, size - done, offset);
+        if (n < 0 && errno == EINTR) continue;
+        if (n <= 0) break;
+        done += static_cast<std::size_t>(n);
+        offset += n;
+    }
+    ::close(fd);
+    if (done != size) {
+        bytes.clear();
+        return Status::Error("Cannot read " + file.filename().string());
+    }
     return Status::Ok();
 }
 

@@ -5,6 +5,7 @@
 
 #include <array>
 #include <cstdint>
+#include <cstring>
 #include <filesystem>
 #include <string>
 #include <string_view>
@@ -36,5 +37,24 @@ public:
     // record, the message of the record limit when it holds too many.
     platform::Status OpenWithData();
 };
+
+// The raw bytes of records `first` to `last` (1-based, inclusive) of a price file, in one open
+// and one read into `bytes`, whose storage is reused: the walks over the whole market read
+// thousands of files this way without allocating for each.
+platform::Status ReadPriceRecords(const std::filesystem::path& file, int first, int last,
+                                  std::string& bytes);
+
+// Fields of a record straight from its bytes, for the walks that only need a figure or two.
+inline constexpr std::size_t kOpenAt = 8, kHighAt = 12, kLowAt = 16, kCloseAt = 20, kVolumeAt = 24;
+inline float PriceField(const char* record, std::size_t offset) {
+    float v;
+    std::memcpy(&v, record + offset, sizeof v);
+    return v;
+}
+inline std::int32_t PriceVolume(const char* record) {
+    std::int32_t v;
+    std::memcpy(&v, record + kVolumeAt, sizeof v);
+    return v;
+}
 
 } // namespace kori::store

@@ -4,16 +4,22 @@ namespace kori::store {
 
 using platform::Status;
 
-Status CountRecords(const std::filesystem::path& file, std::size_t recordSize,
-                    std::int16_t& count) {
-    const auto records = platform::FileSizeOr0(file) / recordSize;
+Status CountRecordsOfLength(std::uintmax_t length, std::size_t recordSize, const std::string& name,
+                            std::int16_t& count) {
+    const auto records = length / recordSize;
     if (records > static_cast<std::uintmax_t>(kMaxRecords)) {
         count = 0;
-        return Status::Error(file.filename().string() + " holds " + std::to_string(records) +
+        return Status::Error(name + " holds " + std::to_string(records) +
                              " records; a file can hold at most 32767.");
     }
     count = static_cast<std::int16_t>(records);
     return Status::Ok();
+}
+
+Status CountRecords(const std::filesystem::path& file, std::size_t recordSize,
+                    std::int16_t& count) {
+    return CountRecordsOfLength(platform::FileSizeOr0(file), recordSize, file.filename().string(),
+                                count);
 }
 
 Status RecordFileBase::Open() {

@@ -15,6 +15,10 @@ namespace kori::store {
 
 inline constexpr std::int32_t kMaxRecords = 32767;
 
+// Number of whole records of `recordSize` bytes in `length` bytes of the file `name`, refused
+// when over 32,767.
+platform::Status CountRecordsOfLength(std::uintmax_t length, std::size_t recordSize,
+                                      const std::string& name, std::int16_t& count);
 // Number of whole records of `size` bytes in a file, refused when over 32,767.
 platform::Status CountRecords(const std::filesystem::path& file, std::size_t recordSize,
                               std::int16_t& count);

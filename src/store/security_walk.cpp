@@ -6,6 +6,9 @@
 #include "store/name_file.h"
 #include "store/price_file.h"
 
+#include <algorithm>
+#include <sys/stat.h>
+
 namespace kori::store {
 
 using platform::Issue;
@@ -35,26 +38,30 @@ Status WalkOrder(const SecurityList& list, std::int16_t nameCount, std::vector<i
     return Status::Ok();
 }
 
+// The price file of a code: the name as the walk builds it when that file is there (one stat,
+// no directory search), else whatever the case-insensitive search finds.
+std::filesystem::path PriceFileOf(const std::string& folderWithSlash, const std::string& code,
+                                  struct stat& st, bool& found) {
+    std::filesystem::path path(folderWithSlash + code + ".WDT");
+    found = ::stat(path.c_str(), &st) == 0;
+    if (found) return path;
+    path = platform::ResolvePath(path);
+    found = ::stat(path.c_str(), &st) == 0;
+    return path;
+}
+
 // Why a price file cannot be walked, as an issue; nullopt when it can. A length that is not a
-// whole number of records is reported and the whole records are still read.
-std::optional<Issue> PriceFileIssue(WalkItem& item, platform::Issues& issues) {
+// whole number of records is reported and the whole records are still read. Everything comes
+// from the one stat the walk made: a market of thousands of files is walked at the speed of
+// the file system, not of repeated look-ups.
+std::optional<Issue> PriceFileIssue(WalkItem& item, bool found, const struct stat& st,
+                                    platform::Issues& issues) {
     const std::string name = item.PriceFile.filename().string();
-    // One look at the file: the walk meets thousands of them.
-    std::error_code ec;
-    const auto status = std::filesystem::status(item.PriceFile, ec);
-    if (ec || !std::filesystem::exists(status))
-        return Issue{Severity::Warning, "No price file " + name, name, 0};
-    const auto size = std::filesystem::is_regular_file(status)
-                          ? std::filesystem::file_size(item.PriceFile, ec)
-                          : std::uintmax_t{0};
-    if (ec || size == 0) return Issue{Severity::Warning, name + " holds no records", name, 0};
-    const auto records = size / PriceRecord::kSize;
-    if (records > static_cast<std::uintmax_t>(kMaxRecords))
-        return Issue{Severity::Error,
-                     name + " holds " + std::to_string(records) +
-                         " records; a file can hold at most 32767.",
-                     name, 0};
-    item.PriceRecords = static_cast<std::int16_t>(records);
+    if (!found) return Issue{Severity::Warning, "No price file " + name, name, 0};
+    const auto size = S_ISREG(st.st_mode) ? static_cast<std::uintmax_t>(st.st_size) : 0;
+    if (size == 0) return Issue{Severity::Warning, name + " holds no records", name, 0};
+    if (auto s = CountRecordsOfLength(size, PriceRecord::kSize, name, item.PriceRecords); !s)
+        return Issue{Severity::Error, s.message(), name, 0};
     if (size % PriceRecord::kSize != 0)
         issues.push_back({Severity::Warning,
                           name + " ends in part of a record; the part is not read", name,
@@ -76,8 +83,10 @@ WalkResult ForEachSecurity(const SecurityList& list, platform::Progress& progres
     if (result.Status = WalkOrder(list, nameCount, order); !result.Status) return result;
 
     const int count = static_cast<int>(order.size());
+    const int stopAfter = list.StopAfter > 0 ? std::min(list.StopAfter, count) : count;
+    const std::string folder = platform::FolderWithSlash(list.DataFolder);
     progress.SetRange(count);
-    for (int i = 0; i < count; ++i) {
+    for (int i = 0; i < stopAfter; ++i) {
         progress.SetValue(i + 1);
         progress.Yield();
         if (progress.Cancelled()) {
@@ -97,8 +106,10 @@ WalkResult ForEachSecurity(const SecurityList& list, platform::Progress& progres
                                      "Names.dat", item.NameRecordNumber});
             continue;
         }
-        item.PriceFile = PriceFile::PathFor(list.DataFolder, code);
-        if (auto issue = PriceFileIssue(item, result.Issues)) {
+        struct stat st {};
+        bool found = false;
+        item.PriceFile = PriceFileOf(folder, code, st, found);
+        if (auto issue = PriceFileIssue(item, found, st, result.Issues)) {
             result.Issues.push_back(std::move(*issue));
             continue;
         }

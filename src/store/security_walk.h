@@ -26,6 +26,9 @@ namespace kori::store {
 struct SecurityList {
     std::string DataFolder;
     char Letter = 0;
+    // When above 0, the walk ends after this many places, whatever the count (the progress
+    // still runs to the whole count): the later securities are not looked at at all.
+    int StopAfter = 0;
 };
 
 // One security as the walk meets it.

@@ -3,10 +3,13 @@
 
 #include "gui/widgets/grid_view.h"
 #include "gui/windows/chk_dta.h"
+#include "gui/windows/text_data.h"
 #include "store/price_file.h"
 
 #include <QComboBox>
+#include <QLabel>
 #include <QLineEdit>
+#include <QRadioButton>
 
 namespace kori::test {
 namespace {
@@ -71,6 +74,48 @@ TEST_F(DataCheckWindows, RefusesLimitsThatAreNotNumbersAndKeepsGoodOnes) {
     const auto kept = maint::LoadDataCheckSettings(s.settings);
     EXPECT_EQ(kept.GapWeekdays, 4);
     EXPECT_DOUBLE_EQ(kept.MoveAlertPercent, 50);
+}
+
+TEST_F(DesktopTest, ClosingPricesOfADayFromTheMenu) {
+    ASSERT_TRUE(main.Trigger("mnuTextFile"));
+    QApplication::processEvents();
+    auto* w = main.findChild<gui::TextData*>();
+    ASSERT_NE(w, nullptr);
+    const auto file = s.root.path() / "closes.csv";
+    w->fileEdit()->setText(QString::fromStdString(file.string()));
+    w->dateEdit()->setText(QStringLiteral("31/2/26"));
+    EXPECT_FALSE(w->Create().Ok);
+    ASSERT_EQ(s.dialogs.messages().size(), 1u);
+    EXPECT_EQ(s.dialogs.messages()[0], "Date must be entered as d/m/yy eg. 9/4/95 or 29/9/95");
+    w->dateEdit()->setText(QStringLiteral("20/11/26"));
+    const auto r = w->Create();
+    ASSERT_TRUE(r.Ok) << r.Message;
+    EXPECT_EQ(w->status()->text().toStdString(), r.Message);
+    const auto text = platform::ReadWholeFile(file);
+    ASSERT_TRUE(text);
+    EXPECT_NE(text->find("\nKRM,Karoo Minerals,2026-11-20,1.41,"), std::string::npos) << *text;
+}
+
+TEST_F(DesktopTest, DataOfAListAsDayFilesFromTheMenu) {
+    ASSERT_TRUE(main.Trigger("mnuTFD"));
+    QApplication::processEvents();
+    auto* w = main.findChild<gui::TextFull*>();
+    ASSERT_NE(w, nullptr);
+    w->aList()->setChecked(true);
+    w->fromEdit()->setText(QStringLiteral("19/11/26"));
+    w->toEdit()->setText(QStringLiteral("18/11/26"));
+    w->dayFiles()->setChecked(true);
+    const auto folder = s.root.path() / "days";
+    w->outputEdit()->setText(QString::fromStdString(folder.string()));
+    EXPECT_FALSE(w->Create().Ok); // the range runs backwards
+    EXPECT_EQ(s.dialogs.messages().back(), "The first day comes after the last");
+    w->toEdit()->clear();
+    const auto r = w->Create();
+    ASSERT_TRUE(r.Ok) << r.Message;
+    EXPECT_EQ(test::FilesIn(folder), (std::vector<std::string>{"19NOV26.D", "20NOV26.D"}));
+    const auto day = platform::ReadWholeFile(folder / "20NOV26.D");
+    ASSERT_TRUE(day);
+    EXPECT_NE(day->find("KRM,20261120,1.43,1.435,1.395,1.41,5755360,0\n"), std::string::npos);
 }
 
 } // namespace

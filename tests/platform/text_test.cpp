@@ -44,3 +44,10 @@ TEST(Text, FloatTextReadsBackToTheSameFloat) {
         EXPECT_EQ(std::stof(FloatText(f)), f) << FloatText(f);
     }
 }
+
+TEST(Text, IsNumberTakesOnlyAWholeNumber) {
+    for (const char* yes : {"1", " 1.5 ", "-.25", "+3.", "2e3", "1.5E-2", "0"})
+        EXPECT_TRUE(kori::platform::IsNumber(yes)) << yes;
+    for (const char* no : {"", " ", ".", "-", "1.5x", "1,5", "1.2.3", "2e", "e3", "&H10", "1 2"})
+        EXPECT_FALSE(kori::platform::IsNumber(no)) << no;
+}

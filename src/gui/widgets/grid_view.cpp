@@ -55,7 +55,13 @@ void GridView::CellLeft(QTableWidgetItem* it) {
         }
         return;
     }
-    m_dialogs.MsgBox(v.Message, m_title);
+    m_dialogs.MsgBox(v.Message, v.Title.empty() ? m_title : v.Title);
+    if (v.Revert) { // a column that is not edited shows its text again
+        m_filling = true;
+        it->setText(Q(v.Text));
+        m_filling = false;
+        return;
+    }
     // The refused cell stays as typed and takes the focus back.
     QTimer::singleShot(0, this, [this, it] {
         setCurrentItem(it);
@@ -84,7 +90,7 @@ void GridView::DeleteCurrentRow() {
 }
 
 void GridView::ShowRefusal(const app::CellRefusal& r) {
-    m_dialogs.MsgBox(r.Message, m_title);
+    m_dialogs.MsgBox(r.Message, r.Title.empty() ? m_title : r.Title);
     setCurrentCell(r.Row, r.Column);
 }
 

@@ -1,6 +1,8 @@
 #include "gui/windows/register_windows.h"
 
+#include "gui/windows/adjust_windows.h"
 #include "gui/windows/chart_windows.h"
+#include "gui/windows/entry_windows.h"
 #include "gui/windows/list_windows.h"
 #include "gui/windows/main_window.h"
 #include "gui/windows/settings_windows.h"
@@ -13,7 +15,9 @@ void RegisterWindows(MainWindow& main) {
     RegisterSettingsWindows(main);
     RegisterChartWindows(main);
     RegisterListWindows(main);
+    RegisterAdjustWindows(main);
     RegisterToolWindows(main);
+    RegisterEntryWindows(main);
     main.RebuildMenus();
 }
 

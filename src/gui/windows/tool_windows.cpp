@@ -3,6 +3,7 @@
 #include "gui/windows/chart_windows.h"
 #include "gui/windows/chk_dta.h"
 #include "gui/windows/main_window.h"
+#include "gui/windows/text_data.h"
 
 namespace kori::gui {
 
@@ -15,14 +16,22 @@ ShowChartAt ChartsOf(MainWindow& main) {
     };
 }
 
-} // namespace
-
-void RegisterToolWindows(MainWindow& main) {
-    main.SetAction("ChkDta", [&main] {
-        auto* w = new ChkDta(main.session(), main.progress(), ChartsOf(main), &main);
+// A tool window over the session and the main window's progress, gone when closed.
+template <typename Window, typename... Extra>
+void Register(MainWindow& main, const char* opens, Extra... extra) {
+    main.SetAction(opens, [&main, extra...] {
+        auto* w = new Window(main.session(), main.progress(), extra..., &main);
         w->setAttribute(Qt::WA_DeleteOnClose);
         w->open();
     });
+}
+
+} // namespace
+
+void RegisterToolWindows(MainWindow& main) {
+    Register<ChkDta>(main, "ChkDta", ChartsOf(main));
+    Register<TextData>(main, "TextData");
+    Register<TextFull>(main, "TextFull");
 }
 
 } // namespace kori::gui
