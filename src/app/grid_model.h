@@ -16,8 +16,7 @@ struct CellVerdict {
     bool Accepted = true;
     std::string Text;
     std::string Message;
-    std::string Title; // of the message box; empty: the grid's own title
-    std::string Title;   // of the message; empty: the grid's own title
+    std::string Title;   // of the message box; empty: the grid's own title
     bool Revert = false; // refused, and the cell keeps the text it had (a column not edited)
 };
 
@@ -25,7 +24,6 @@ struct CellRefusal {
     int Row = 0, Column = 0;
     std::string Message;
     std::string Title; // empty: the grid's own title
-    std::string Title;
 };
 
 class GridModel {

@@ -236,6 +236,8 @@ platform::Status WriteSampleTargets(const std::string& systemFolder,
         {"YRA", price(yra.Low * 0.9f), "D"},
     };
     return store::WriteTargetsFile(store::TargetsFilePath(systemFolder), lines);
+}
+
 // Securities whose last days are placed so that every scan finds something: a rise of exactly
 // 10%, overbought and oversold oscillators, breaks of the parabolic stop up and down, a volume
 // spike, two averages together, and an advance-decline series whose totals need recomputing.
