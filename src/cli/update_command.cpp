@@ -3,10 +3,12 @@
 #include "cli/cli_context.h"
 #include "cli/json_out.h"
 
+#include "intake/check_targets.h"
 #include "intake/download_list.h"
 #include "intake/download_update.h"
 #include "platform/files.h"
 #include "platform/text.h"
+#include "store/targets_file.h"
 
 #include <CLI/CLI.hpp>
 #include <nlohmann/json.hpp>
@@ -124,7 +126,8 @@ void AddUpdateCommand(CLI::App& app, CliContext& ctx) {
         const std::string today = session.services().clock.Today();
 
         json files = json::array();
-        bool cancelled = false, failed = false;
+        bool cancelled = false, failed = false, updated = false;
+        std::string targetFolder = settings.DataFolder;
         for (std::size_t i = 0; i < chosen.size() && !failed; ++i) {
             const bool more = i + 1 < chosen.size();
             const auto r =
@@ -148,8 +151,20 @@ void AddUpdateCommand(CLI::App& app, CliContext& ctx) {
                             << (f.RenamedTo.empty() ? "" : ", renamed to " + f.RenamedTo) << "\n";
             }
             failed = r.Failed || r.Stopped;
+            updated = updated || std::any_of(r.Files.begin(), r.Files.end(),
+                                             [](const auto& f) { return f.Records > 0; });
+            targetFolder = r.CurrentDataFolder;
         }
-        if (o->json) ctx.out << json{{"files", files}}.dump() << "\n";
+        // The targets are tested once the day's prices are in.
+        json alerts = json::array();
+        if (updated && !failed) {
+            for (const auto& a : intake::CheckTargets(
+                     store::TargetsFilePath(session.folders.SystemFolder), targetFolder)) {
+                alerts.push_back(a);
+                if (!o->json) ctx.out << a << "\n";
+            }
+        }
+        if (o->json) ctx.out << json{{"files", files}, {"alerts", alerts}}.dump() << "\n";
         if (failed) throw CliError{"the update stopped; the files above are whole", 1};
         if (cancelled)
             throw CliError{"a file was not updated and stays waiting (use --yes to answer OK)", 3};

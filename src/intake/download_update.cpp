@@ -9,8 +9,11 @@
 
 #include <algorithm>
 #include <cmath>
+#include <fcntl.h>
 #include <map>
 #include <optional>
+#include <sys/stat.h>
+#include <unistd.h>
 
 namespace kori::intake {
 
@@ -60,6 +63,35 @@ const std::array<Segment, 8>& Segments() {
 }
 
 namespace {
+
+// A record's date as a number: eight digits read directly, anything else as Val reads it.
+double DateNumber(std::string_view date) {
+    if (date.size() >= 8) {
+        double v = 0;
+        bool digits = true;
+        for (std::size_t i = 0; i < 8 && digits; ++i) {
+            digits = date[i] >= '0' && date[i] <= '9';
+            v = v * 10 + (date[i] - '0');
+        }
+        if (digits && (date.size() == 8 || date[8] == ' ')) return v;
+    }
+    return Val(date);
+}
+
+// The first `count` records of a price file as bytes, in one read.
+bool ReadRecords(const fs::path& path, int count, std::string& bytes) {
+    bytes.assign(static_cast<std::size_t>(count) * 50, '\0');
+    const int fd = ::open(path.c_str(), O_RDONLY | O_CLOEXEC);
+    if (fd < 0) return false;
+    std::size_t done = 0;
+    while (done < bytes.size()) {
+        const ssize_t n = ::read(fd, bytes.data() + done, bytes.size() - done);
+        if (n <= 0) break;
+        done += static_cast<std::size_t>(n);
+    }
+    ::close(fd);
+    return done == bytes.size();
+}
 
 std::string Right(std::string_view s, std::size_t n) {
     return std::string(s.size() > n ? s.substr(s.size() - n) : s);
@@ -254,10 +286,16 @@ CheckResult CheckDownloadFile(const fs::path& path, const CheckInput& input,
 
 InsertPosition FindInsertPosition(const std::vector<double>& dates, double newDate,
                                   FileState state) {
-    const int count = static_cast<int>(dates.size());
+    return FindInsertPosition(
+        static_cast<int>(dates.size()),
+        [&](int n) { return dates[static_cast<std::size_t>(n - 1)]; }, newDate, state);
+}
+
+InsertPosition FindInsertPosition(int count, const std::function<double(int)>& dateAt,
+                                  double newDate, FileState state) {
     bool laterRecordSeen = false;
     for (int i = count; i >= 1; --i) {
-        const double d = dates[static_cast<std::size_t>(i - 1)];
+        const double d = dateAt(i);
         if (newDate < d) {
             if (i == 1) return {1, false};
             laterRecordSeen = true;
@@ -302,6 +340,8 @@ private:
     // False when a file error stopped the update.
     bool ApplyDownloadRecord(const DownloadLine& d, const std::string& code, const Target& target,
                              SegmentResult& seg);
+    bool CreateSecurity(const DownloadLine& d, const std::string& code, const Target& target,
+                        fs::path& path, SegmentResult& seg);
     bool Fail(const std::string& message);
     bool Filtered(const std::string& code) const;
     // Names.dat of the target folder: codes and record types, read once a target.
@@ -362,91 +402,54 @@ bool DownloadRun::Fail(const std::string& message) {
 
 bool DownloadRun::ApplyDownloadRecord(const DownloadLine& d, const std::string& code,
                                       const Target& target, SegmentResult& seg) {
-    const auto path = store::PriceFile::PathFor(target.Folder, code);
-    if (!platform::FileExists(path)) {
-        Status(" Created record for " + code);
-        const auto& names = NameTypes(target.Folder);
-        // A name record left by an update that stopped before its price file stays the one.
-        if (names.count(code) == 0) {
-            NameRecord n;
-            n.Code = code;
-            n.RecordType = (m_s.DataService == 3 && target.RecordType == 5) ? 5 : 4;
-            n.Id = Upper(target.Letter);
-            n.Category = 1;
-            if (target.Segment == "EQUITIES " && code.size() == 6) {
-                switch (Upper(code.substr(3, 1))[0]) {
-                case 'E':
-                    n.Category = 86;
-                    break;
-                case 'I':
-                    n.Category = 87;
-                    break;
-                case 'W':
-                    n.Category = 84;
-                    break;
-                default:
-                    n.Category = 88;
-                }
-            }
-            if (target.Options)
-                n.OtherDetails =
-                    "0" + d.OptType +
-                    ShortDate(platform::DateTextFromSerial(platform::DaySerial(d.Date).value_or(0) +
-                                                           static_cast<std::int32_t>(d.Spare))
-                                  .value_or(""));
-            const auto namesPath = store::NameFile::PathIn(target.Folder);
-            std::int16_t nameCount = 0;
-            if (auto s = store::CountRecords(namesPath, NameRecord::kSize, nameCount); !s)
-                return Fail(s.message());
-            if (nameCount >= store::kMaxRecords)
-                return Fail(namesPath.string() + " holds 32767 records; " + code +
-                            " cannot be added.");
-            const auto bytes = n.Encode();
-            if (auto s = platform::AppendToFile(namesPath, {bytes.data(), bytes.size()}); !s)
-                return Fail(s.message());
-            m_names.emplace(code, n.RecordType);
-            m_recordType = n.RecordType;
+    // The exact name first (one stat); the case-blind search only when it is not there.
+    fs::path path = target.Folder + code + ".WDT";
+    struct stat st {};
+    if (::stat(path.c_str(), &st) != 0) {
+        path = store::PriceFile::PathFor(target.Folder, code);
+        if (::stat(path.c_str(), &st) != 0) {
+            if (!CreateSecurity(d, code, target, path, seg)) return false;
+            st.st_size = 0;
         }
-        if (auto s = platform::AppendToFile(path, {}); !s) return Fail(s.message());
-        ++seg.NewSecurities;
     }
     if (m_s.DataService == 1) {
         const auto& names = NameTypes(target.Folder);
         if (const auto it = names.find(code); it != names.end()) m_recordType = it->second;
     }
-
-    store::PriceFile pf(path);
-    if (auto s = pf.Open(); !s) {
-        m_host.Dialogs.MsgBox(s.message() + "\n" + code + " was not updated.", "Downloaded Data");
-        m_result.Issues.push_back(
-            {platform::Severity::Error, s.message(), path.filename().string(), 0});
+    const long long whole = static_cast<long long>(st.st_size) / 50;
+    if (whole > store::kMaxRecords) {
+        const std::string text = path.filename().string() + " holds " + std::to_string(whole) +
+                                 " records; a file can hold at most 32767. " + code +
+                                 " was not updated.";
+        m_host.Dialogs.MsgBox(text, "Downloaded Data");
+        m_result.Issues.push_back({platform::Severity::Error, text, path.filename().string(), 0});
         return true;
     }
-    const int count = pf.Count();
+    const int count = static_cast<int>(whole);
     const bool searched = m_state == FileState::Insert || m_state == FileState::Replace;
-    std::vector<PriceRecord> records;
-    bool haveAll = false;
-    auto readAll = [&]() -> bool {
-        if (haveAll) return true;
-        if (auto s = pf.ReadAll(records); !s) return Fail(s.message());
-        haveAll = true;
+    const bool correctVolume = !target.Options && d.Spare != 0;
+    const bool rerunLevels = m_recordType == 3 && searched;
+
+    // The file's bytes, read only when the record does not simply go on the end.
+    std::string bytes;
+    bool haveBytes = false;
+    auto readBytes = [&]() -> bool {
+        if (haveBytes) return true;
+        if (!ReadRecords(path, count, bytes)) return Fail("Cannot read " + path.string());
+        haveBytes = true;
         return true;
     };
+    auto dateAt = [&](int n) { return DateNumber({bytes.data() + (n - 1) * 50, 8}); };
 
     double level = 0; // the running advance/decline total
     if (m_recordType == 3 && count > 0) {
-        PriceRecord last;
-        if (auto s = pf.Read(count, last); !s) return Fail(s.message());
-        level = last.Close;
+        if (!readBytes()) return false;
+        level = PriceRecord::Decode(bytes.data() + (count - 1) * 50).Close;
     }
     InsertPosition at{count + 1, false};
     if (searched && count > 0) {
-        if (!readAll()) return false;
-        std::vector<double> dates;
-        dates.reserve(records.size());
-        for (const auto& r : records)
-            dates.push_back(Val(r.Date));
-        at = FindInsertPosition(dates, Val(d.Date), m_state);
+        if (!readBytes()) return false;
+        at = FindInsertPosition(count, dateAt, DateNumber(d.Date), m_state);
     }
     if (!at.Overwrite && count >= store::kMaxRecords) {
         const std::string text = path.filename().string() +
@@ -473,33 +476,92 @@ bool DownloadRun::ApplyDownloadRecord(const DownloadLine& d, const std::string& 
         rec.Volume = d.Volume;
     }
     rec.Flag = m_intraDay ? "I" : " ";
+    const auto encoded = rec.Encode();
 
-    const bool correctVolume = !target.Options && d.Spare != 0 && at.Position > 1;
-    const bool rerunLevels = m_recordType == 3 && searched;
-    if (!at.Overwrite && at.Position == count + 1 && !correctVolume && !rerunLevels) {
+    const bool correctHere = correctVolume && at.Position > 1;
+    if (!at.Overwrite && at.Position == count + 1 && !correctHere && !rerunLevels) {
         // The everyday case: one record at the end, one write.
-        if (auto s = pf.Append(rec); !s) return Fail(s.message());
+        if (auto s = platform::AppendToFile(path, {encoded.data(), encoded.size()}); !s)
+            return Fail(s.message());
         ++seg.Records;
         return true;
     }
-    if (!readAll()) return false;
-    const auto pos = static_cast<std::size_t>(at.Position - 1);
+    if (!readBytes()) return false;
+    const auto pos = static_cast<std::size_t>(at.Position - 1) * 50;
     if (at.Overwrite)
-        records[pos] = rec;
+        bytes.replace(pos, 50, encoded.data(), encoded.size());
     else
-        records.insert(records.begin() + static_cast<std::ptrdiff_t>(pos), rec);
-    if (correctVolume)
-        records[pos - 1].Volume = static_cast<std::int32_t>(
+        bytes.insert(pos, encoded.data(), encoded.size());
+    if (correctHere) {
+        auto before = PriceRecord::Decode(bytes.data() + pos - 50);
+        before.Volume = static_cast<std::int32_t>(
             std::clamp(std::nearbyint(d.Spare), -2147483648.0, 2147483647.0));
-    if (rerunLevels && records.size() > 1) {
-        double running = pos > 0 ? records[pos - 1].Close : 0;
-        for (std::size_t i = pos; i < records.size(); ++i) {
-            records[i].Close = static_cast<float>(running + records[i].High - records[i].Low);
-            running = records[i].Close;
+        const auto b = before.Encode();
+        bytes.replace(pos - 50, 50, b.data(), b.size());
+    }
+    const std::size_t records = bytes.size() / 50;
+    if (rerunLevels && records > 1) {
+        double running = pos > 0 ? PriceRecord::Decode(bytes.data() + pos - 50).Close : 0;
+        for (std::size_t at50 = pos; at50 < bytes.size(); at50 += 50) {
+            auto r = PriceRecord::Decode(bytes.data() + at50);
+            r.Close = static_cast<float>(running + r.High - r.Low);
+            running = r.Close;
+            const auto b = r.Encode();
+            bytes.replace(at50, 50, b.data(), b.size());
         }
     }
-    if (auto s = pf.WriteAll(records); !s) return Fail(s.message());
+    if (auto s = platform::WriteFileAtomic(path, bytes); !s) return Fail(s.message());
     ++seg.Records;
+    return true;
+}
+
+bool DownloadRun::CreateSecurity(const DownloadLine& d, const std::string& code,
+                                 const Target& target, fs::path& path, SegmentResult& seg) {
+    Status(" Created record for " + code);
+    path = target.Folder + code + ".WDT";
+    const auto& names = NameTypes(target.Folder);
+    // A name record left by an update that stopped before its price file stays the one.
+    if (names.count(code) == 0) {
+        NameRecord n;
+        n.Code = code;
+        n.RecordType = (m_s.DataService == 3 && target.RecordType == 5) ? 5 : 4;
+        n.Id = Upper(target.Letter);
+        n.Category = 1;
+        if (target.Segment == "EQUITIES " && code.size() == 6) {
+            switch (Upper(code.substr(3, 1))[0]) {
+            case 'E':
+                n.Category = 86;
+                break;
+            case 'I':
+                n.Category = 87;
+                break;
+            case 'W':
+                n.Category = 84;
+                break;
+            default:
+                n.Category = 88;
+            }
+        }
+        if (target.Options)
+            n.OtherDetails =
+                "0" + d.OptType +
+                ShortDate(platform::DateTextFromSerial(platform::DaySerial(d.Date).value_or(0) +
+                                                       static_cast<std::int32_t>(d.Spare))
+                              .value_or(""));
+        const auto namesPath = store::NameFile::PathIn(target.Folder);
+        std::int16_t nameCount = 0;
+        if (auto s = store::CountRecords(namesPath, NameRecord::kSize, nameCount); !s)
+            return Fail(s.message());
+        if (nameCount >= store::kMaxRecords)
+            return Fail(namesPath.string() + " holds 32767 records; " + code + " cannot be added.");
+        const auto bytes = n.Encode();
+        if (auto s = platform::AppendToFile(namesPath, {bytes.data(), bytes.size()}); !s)
+            return Fail(s.message());
+        m_names.emplace(code, n.RecordType);
+        m_recordType = n.RecordType;
+    }
+    if (auto s = platform::AppendToFile(path, {}); !s) return Fail(s.message());
+    ++seg.NewSecurities;
     return true;
 }
 
@@ -610,6 +672,9 @@ DownloadRun::Next DownloadRun::UpdateFromFile(const fs::path& path, const Target
 }
 
 RunResult DownloadRun::Run(const std::string& fileName, bool moreFilesFollow) {
+    // Thousands of price files may be rewritten: each is still written beside and renamed, so a
+    // kill leaves it old or new, but the flush to disk is left to the system's write-back.
+    const platform::ScopedSyncDeferral deferral(m_s.DataFolder, false);
     if (m_s.RefreshFreq < 10 || m_s.RefreshFreq > 200) {
         m_s.RefreshFreq = 50;
         if (m_host.Ini) (void)m_host.Ini->Write("Download", "RefreshFreq", "50");
@@ -695,7 +760,7 @@ FillResult FillNoTradeDays(const std::string& folder, const std::string& dayDate
                            platform::Progress& progress) {
     FillResult result;
     progress.SetStatus("Checking no-trades");
-    const double day = Val(dayDate);
+    const double day = DateNumber(dayDate);
     const auto updateSerial = platform::DaySerial(updateDate);
     store::NameFile names(store::NameFile::PathIn(folder));
     bool namesOpen = false;
@@ -728,20 +793,32 @@ FillResult FillNoTradeDays(const std::string& folder, const std::string& dayDate
                 }
             }
             if (item.Name.RecordType != 4) return store::WalkStep::Continue;
-            store::PriceFile pf(item.PriceFile);
-            if (result.Status = pf.Open(); !result.Status) return store::WalkStep::Stop;
             // A full file was refused by the update itself; the fill passes it by.
-            if (pf.Count() < 1 || pf.Count() >= store::kMaxRecords)
-                return store::WalkStep::Continue;
-            PriceRecord last;
-            if (result.Status = pf.Read(pf.Count(), last); !result.Status)
+            const int count = item.PriceRecords;
+            if (count < 1 || count >= store::kMaxRecords) return store::WalkStep::Continue;
+            std::array<char, 50> lastBytes{};
+            struct stat st {};
+            const int fd = ::open(item.PriceFile.c_str(), O_RDONLY | O_CLOEXEC);
+            const bool read =
+                fd >= 0 && ::fstat(fd, &st) == 0 &&
+                ::pread(fd, lastBytes.data(), 50, static_cast<off_t>(count - 1) * 50) == 50;
+            if (fd >= 0) ::close(fd);
+            if (!read) {
+                result.Status = Status::Error("Cannot read " + item.PriceFile.string());
                 return store::WalkStep::Stop;
-            if (day <= Val(last.Date)) return store::WalkStep::Continue;
+            }
+            // A file ending in part of a record (reported by the walk) takes nothing on its end.
+            if (st.st_size % 50 != 0) return store::WalkStep::Continue;
+            const PriceRecord last = PriceRecord::Decode(lastBytes.data());
+            if (day <= DateNumber(last.Date)) return store::WalkStep::Continue;
             progress.SetStatus(" Checking " + item.Name.TrimmedCode());
             PriceRecord filler;
             filler.Date = dayDate;
             filler.Open = filler.High = filler.Low = filler.Close = last.Close;
-            if (result.Status = pf.Append(filler); !result.Status) return store::WalkStep::Stop;
+            const auto b = filler.Encode();
+            if (result.Status = platform::AppendToFile(item.PriceFile, {b.data(), b.size()});
+                !result.Status)
+                return store::WalkStep::Stop;
             ++result.Fillers;
             return store::WalkStep::Continue;
         });

@@ -143,6 +143,10 @@ struct InsertPosition {
 };
 InsertPosition FindInsertPosition(const std::vector<double>& dates, double newDate,
                                   FileState state);
+// The same walk over a file read by record number (1-based), so a long file is read only as far
+// back as the walk goes.
+InsertPosition FindInsertPosition(int count, const std::function<double(int)>& dateAt,
+                                  double newDate, FileState state);
 
 struct FillResult {
     platform::Status Status;

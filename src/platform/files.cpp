@@ -145,14 +145,14 @@ long long ScopedWriteBudget::Used() {
     return g_writeUsed;
 }
 
-ScopedSyncDeferral::ScopedSyncDeferral(const fs::path& anyFileOnTheFileSystem)
-    : m_folder(anyFileOnTheFileSystem), m_previous(g_deferSync) {
+ScopedSyncDeferral::ScopedSyncDeferral(const fs::path& anyFileOnTheFileSystem, bool syncAtEnd)
+    : m_folder(anyFileOnTheFileSystem), m_syncAtEnd(syncAtEnd), m_previous(g_deferSync) {
     g_deferSync = true;
 }
 
 ScopedSyncDeferral::~ScopedSyncDeferral() {
     g_deferSync = m_previous;
-    if (m_previous) return;
+    if (m_previous || !m_syncAtEnd) return;
     const int fd = ::open(m_folder.c_str(), O_RDONLY | O_CLOEXEC);
     if (fd < 0) {
         ::sync();

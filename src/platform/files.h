@@ -85,16 +85,20 @@ private:
 
 // For a bulk writer that replaces thousands of files in one run: while one is alive the gate
 // still writes beside and renames (a killed process leaves each file old or new, never half),
-// but leaves the flush to disk to the end of the scope, when the file system is synced once.
+// but does not flush each file to disk. At the end of the scope the file system holding
+// `anyFileOnTheFileSystem` is synced once, or, with `syncAtEnd` false, the flush is left to the
+// system's own write-back (whose rename ordering keeps old-or-new across a power cut on the
+// journalled file systems we run on).
 class ScopedSyncDeferral {
 public:
-    explicit ScopedSyncDeferral(const fs::path& anyFileOnTheFileSystem);
+    explicit ScopedSyncDeferral(const fs::path& anyFileOnTheFileSystem, bool syncAtEnd = true);
     ~ScopedSyncDeferral();
     ScopedSyncDeferral(const ScopedSyncDeferral&) = delete;
     ScopedSyncDeferral& operator=(const ScopedSyncDeferral&) = delete;
 
 private:
     fs::path m_folder;
+    bool m_syncAtEnd;
     bool m_previous;
 };
 

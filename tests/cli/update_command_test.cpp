@@ -15,6 +15,21 @@ namespace {
 
 using json = nlohmann::json;
 
+// Securities of type 4 below class 90 with no line in a day file: the ones the fill reaches.
+int NotTraded(const std::string& root, const std::string& dayFile) {
+    std::vector<store::NameRecord> names;
+    store::NameFile nf(store::NameFile::PathIn(root + "/data/"));
+    EXPECT_TRUE(nf.ReadAll(names).ok());
+    const auto text = platform::ReadWholeFile(dayFile).value_or("");
+    int n = 0;
+    for (const auto& r : names)
+        if (r.RecordType == 4 && r.Category <= 89 &&
+            text.find("\n" + r.TrimmedCode() + ",") == std::string::npos &&
+            !text.starts_with(r.TrimmedCode() + ","))
+            ++n;
+    return n;
+}
+
 struct SampleRoot {
     TempRoot dir;
     std::string root = (dir.path() / "k").string();
@@ -59,6 +74,8 @@ TEST(UpdateCommand, AllWithYesWalksTheSampleDays) {
     SampleRoot s;
     const auto krm = s.Prices("KRM");
     const auto ocr = s.Prices("OCR");
+    const int notTraded = NotTraded(s.root, s.Download("23NOV26.D"));
+    EXPECT_GE(notTraded, 1); // OCR at least
     const auto r = s.Update({"--all", "--yes", "--json"});
     EXPECT_EQ(r.status, 3) << r.err; // the last file is one field short
     const auto j = json::parse(r.out);
@@ -76,10 +93,14 @@ TEST(UpdateCommand, AllWithYesWalksTheSampleDays) {
     EXPECT_EQ(j["files"][1]["state"], "replace");
     EXPECT_EQ(j["files"][2]["state"], "normal");
     EXPECT_EQ(j["files"][2]["new_securities"], 1);
-    EXPECT_EQ(j["files"][2]["fillers"], 1);
+    EXPECT_EQ(j["files"][2]["fillers"], notTraded);
     EXPECT_EQ(j["files"][2]["renamed_to"], "23NOV26.DX");
     EXPECT_EQ(j["files"][3]["state"], "cancelled");
     EXPECT_TRUE(platform::FileExists(s.Download("24NOV26.D")));
+    // The targets are tested on the new last days: each alert names a security of the targets.
+    ASSERT_TRUE(j["alerts"].is_array());
+    for (const auto& a : j["alerts"])
+        EXPECT_NE(a.get<std::string>().find(" - target "), std::string::npos) << a;
 
     // KRM: one record inserted on Saturday the 14th, Friday's record replaced, Monday appended.
     const auto after = s.Prices("KRM");
@@ -104,10 +125,12 @@ TEST(UpdateCommand, AllWithYesWalksTheSampleDays) {
 
 TEST(UpdateCommand, NamedFilesAndPlainOutput) {
     SampleRoot s;
+    const int notTraded = NotTraded(s.root, s.Download("23NOV26.D"));
     const auto r = s.Update({"23nov26.d"});
     EXPECT_EQ(r.status, 0) << r.err;
-    EXPECT_EQ(r.out, "23NOV26.D: normal, 42 records, 1 new securities, 1 fillers, renamed to "
-                     "23NOV26.DX\n");
+    EXPECT_EQ(r.out.substr(0, r.out.find('\n') + 1),
+              "23NOV26.D: normal, 42 records, 1 new securities, " + std::to_string(notTraded) +
+                  " fillers, renamed to 23NOV26.DX\n");
     const auto none = s.Update({"01JAN26.D"});
     EXPECT_EQ(none.status, 1);
     EXPECT_NE(none.err.find("No waiting day file 01JAN26.D"), std::string::npos) << none.err;
