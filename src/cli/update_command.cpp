@@ -167,7 +167,10 @@ void AddUpdateCommand(CLI::App& app, CliContext& ctx) {
         if (o->json) ctx.out << json{{"files", files}, {"alerts", alerts}}.dump() << "\n";
         if (failed) throw CliError{"the update stopped; the files above are whole", 1};
         if (cancelled)
-            throw CliError{"a file was not updated and stays waiting (use --yes to answer OK)", 3};
+            throw CliError{o->yes ? "a file was not updated and stays waiting"
+                                  : "a file was not updated and stays waiting (use --yes to "
+                                    "answer OK)",
+                           3};
     });
 }
 
