@@ -413,7 +413,7 @@ platform::Status WriteDayFile(const std::string& folder, const std::string& name
 std::string AdvanceDeclineLine(const std::string& date, const store::PriceRecord& last, int adv,
                                int dec) {
     return "ADVDEC," + date + ",0," + std::to_string(adv) + "," + std::to_string(dec) + "," +
-           PriceText(last.Close + adv - dec) + ",0,0\r\n";
+           PriceText(last.Close + static_cast<double>(adv - dec)) + ",0,0\r\n";
 }
 
 } // namespace

@@ -1,6 +1,8 @@
 // kori update: the waiting day files of the download folder into the library, as the update
 // window does it, with the questions answered from the command line.
 #include "cli/cli_context.h"
+
+#include "app/download_list_form.h"
 #include "cli/json_out.h"
 
 #include "intake/check_targets.h"
@@ -57,21 +59,6 @@ private:
     bool m_yes;
 };
 
-intake::UpdateSettings SettingsOf(const app::Session& s) {
-    intake::UpdateSettings u;
-    u.DataService = s.download.DataService;
-    u.DownloadFolder = s.folders.DownloadFolder;
-    u.DataFolder = s.folders.DataFolder;
-    u.SystemFolder = s.folders.SystemFolder;
-    u.UpdateAll = s.download.UpdateAll;
-    u.NoWarrants = s.download.NoWarrants;
-    u.VolumeDivisor = s.download.VolumeDivisor;
-    u.RefreshFreq = s.download.RefreshFreq;
-    for (std::size_t i = 0; i < u.SegmentFolders.size(); ++i)
-        u.SegmentFolders[i] = s.chartDataPaths[i];
-    return u;
-}
-
 struct UpdateOptions {
     std::vector<std::string> files;
     bool all = false;
@@ -116,7 +103,7 @@ void AddUpdateCommand(CLI::App& app, CliContext& ctx) {
     cmd->callback([&ctx, o] {
         auto& session = ctx.OpenSession();
         AnsweringDialogs dialogs(ctx.err, o->yes);
-        auto settings = SettingsOf(session);
+        auto settings = app::UpdateSettingsOf(session);
         const auto waiting = intake::BuildDownloadFileList(
             settings.DownloadFolder, settings.DataService, session.download.InternetDLfmt, dialogs);
         const auto chosen = Chosen(waiting, *o, settings.DownloadFolder);

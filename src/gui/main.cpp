@@ -78,9 +78,9 @@ int main(int argc, char** argv) {
     QTimer::singleShot(300, &main, [&] {
         main.show();
         logo.close();
-        // Files waiting in the download folder are offered once the main window stands; the
-        // update itself is not part of this build, so the answer opens nothing yet.
-        (void)kori::app::OfferPendingUpdate(session);
+        // Files waiting in the download folder are offered once the main window stands; OK
+        // opens the update list.
+        if (kori::app::OfferPendingUpdate(session)) (void)main.Trigger("mnuModem");
         if (parser.isSet(chartOpt))
             if (auto* charts = main.findChild<kori::gui::ChartWindows*>())
                 charts->ShowCode(parser.value(chartOpt).toStdString());

@@ -3,12 +3,14 @@
 
 #include "gui/widgets/grid_view.h"
 #include "gui/windows/chk_dta.h"
+#include "gui/windows/dl_list.h"
 #include "gui/windows/text_data.h"
 #include "store/price_file.h"
 
 #include <QComboBox>
 #include <QLabel>
 #include <QLineEdit>
+#include <QListWidget>
 #include <QRadioButton>
 
 namespace kori::test {
@@ -116,6 +118,55 @@ TEST_F(DesktopTest, DataOfAListAsDayFilesFromTheMenu) {
     const auto day = platform::ReadWholeFile(folder / "20NOV26.D");
     ASSERT_TRUE(day);
     EXPECT_NE(day->find("KRM,20261120,1.43,1.435,1.395,1.41,5755360,0\n"), std::string::npos);
+}
+
+TEST_F(DesktopTest, DownloadedDataUpdateFromTheMenuTakesInEveryWaitingDay) {
+    s.session.download.DataService = 4;
+    s.session.download.InternetDLfmt = "DDMMMYY.D";
+    std::vector<std::string> waiting;
+    ASSERT_TRUE(platform::CreateFolderPath(s.session.folders.DownloadFolder));
+    const auto made = app::MakeSampleDayFiles(s.session.folders.DataFolder,
+                                              s.session.folders.DownloadFolder, waiting);
+    ASSERT_TRUE(made) << made.message();
+    main.RebuildMenus(); // the Download menu follows the data service
+    ASSERT_TRUE(main.Trigger("mnuModem"));
+    QApplication::processEvents();
+    auto* w = main.findChild<gui::DLList*>();
+    ASSERT_NE(w, nullptr);
+    EXPECT_EQ(w->windowTitle().toStdString(), "Update with Downloaded Data ");
+    std::vector<std::string> shown;
+    for (int i = 0; i < w->list()->count(); ++i)
+        shown.push_back(w->list()->item(i)->text().toStdString());
+    EXPECT_EQ(shown,
+              (std::vector<std::string>{"14NOV26.D", "20NOV26.D", "23NOV26.D", "24NOV26.D"}));
+
+    // Every question answered OK: the insert, the replace, the new day; the bad file stays.
+    const auto krmBefore = s.Name("KRM");
+    w->UpdateAll();
+    EXPECT_EQ(w->list()->count(), 1);
+    EXPECT_EQ(w->list()->item(0)->text().toStdString(), "24NOV26.D");
+    EXPECT_NE(w->status()->text().toStdString().find("4 files: "), std::string::npos)
+        << w->status()->text().toStdString();
+    store::PriceFile krm(store::PriceFile::PathFor(s.session.folders.DataFolder, "KRM"));
+    ASSERT_TRUE(krm.Open());
+    store::PriceRecord last;
+    ASSERT_TRUE(krm.Read(krm.Count(), last));
+    EXPECT_EQ(last.Date, "20261123");
+    bool alerts = false;
+    for (const auto& m : s.dialogs.shown())
+        alerts = alerts || m.title == "Quoren Alerts";
+    EXPECT_TRUE(alerts);
+
+    // "Remove Date" asks first; No keeps the file.
+    s.dialogs.QueueAnswer(platform::Answer::No);
+    w->list()->setCurrentRow(0);
+    w->RemoveDate();
+    EXPECT_EQ(w->list()->count(), 1);
+    EXPECT_EQ(s.dialogs.shown().back().text, "Remove 24NOV26.D");
+    EXPECT_EQ(s.dialogs.shown().back().title, "Remove Date");
+    w->RemoveDate();
+    EXPECT_EQ(w->list()->count(), 0);
+    EXPECT_FALSE(platform::FileExists(s.session.folders.DownloadFolder + "24NOV26.D"));
 }
 
 } // namespace

@@ -2,6 +2,7 @@
 
 #include "gui/windows/chart_windows.h"
 #include "gui/windows/chk_dta.h"
+#include "gui/windows/dl_list.h"
 #include "gui/windows/main_window.h"
 #include "gui/windows/text_data.h"
 
@@ -32,6 +33,7 @@ void RegisterToolWindows(MainWindow& main) {
     Register<ChkDta>(main, "ChkDta", ChartsOf(main));
     Register<TextData>(main, "TextData");
     Register<TextFull>(main, "TextFull");
+    Register<DLList>(main, "DLList");
 }
 
 } // namespace kori::gui
