@@ -88,7 +88,7 @@ struct Scan1Walk {
     int wanted = 2;
     double risePct = 0, fallPct = 0;
     std::int16_t category = 0;
-    ThreadState state[2];
+    ThreadState state[2]{};
 
     bool Filtered(const store::NameRecord& n) const {
         if (o.CategoryOn && (n.RecordType != 4 || n.Category != category)) return true;
