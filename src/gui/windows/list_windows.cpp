@@ -5,25 +5,12 @@
 #include "gui/windows/ind_class.h"
 #include "gui/windows/main_window.h"
 #include "gui/windows/settings_windows.h"
+#include "gui/windows/show_once.h"
 #include "gui/windows/sub_list.h"
 #include "gui/windows/sub_list2.h"
 #include "gui/windows/sub_list3.h"
 
 namespace kori::gui {
-
-namespace {
-// One window of a kind at a time: a second pick of the menu brings the open one forward.
-template <typename Make> void ShowOnce(MainWindow& main, const char* name, Make make) {
-    if (auto* open = main.findChild<QDialog*>(QString::fromLatin1(name))) {
-        open->raise();
-        open->activateWindow();
-        return;
-    }
-    QDialog* w = make();
-    w->setAttribute(Qt::WA_DeleteOnClose);
-    w->open();
-}
-} // namespace
 
 void RegisterListWindows(MainWindow& main) {
     main.SetAction("SubList", [&main] {

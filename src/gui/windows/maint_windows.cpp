@@ -4,22 +4,12 @@
 #include "gui/windows/main_window.h"
 #include "gui/windows/name_form.h"
 #include "gui/windows/repair_windows.h"
+#include "gui/windows/show_once.h"
 #include "maint/old_files.h"
 
 namespace kori::gui {
 
 namespace {
-// One window of a kind at a time: a second pick of the menu brings the open one forward.
-template <typename Make> void ShowOnce(MainWindow& main, const char* name, Make make) {
-    if (auto* open = main.findChild<QDialog*>(QString::fromLatin1(name))) {
-        open->raise();
-        open->activateWindow();
-        return;
-    }
-    QDialog* w = make();
-    w->setAttribute(Qt::WA_DeleteOnClose);
-    w->open();
-}
 
 template <typename Window> void Register(MainWindow& main, const char* name) {
     main.SetAction(name, [&main, name] {

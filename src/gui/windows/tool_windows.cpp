@@ -4,6 +4,7 @@
 #include "gui/windows/chk_dta.h"
 #include "gui/windows/dl_list.h"
 #include "gui/windows/main_window.h"
+#include "gui/windows/show_once.h"
 #include "gui/windows/text_data.h"
 
 namespace kori::gui {
@@ -17,13 +18,13 @@ ShowChartAt ChartsOf(MainWindow& main) {
     };
 }
 
-// A tool window over the session and the main window's progress, gone when closed.
+// A tool window over the session and the main window's progress, one at a time.
 template <typename Window, typename... Extra>
 void Register(MainWindow& main, const char* opens, Extra... extra) {
-    main.SetAction(opens, [&main, extra...] {
-        auto* w = new Window(main.session(), main.progress(), extra..., &main);
-        w->setAttribute(Qt::WA_DeleteOnClose);
-        w->open();
+    main.SetAction(opens, [&main, opens, extra...] {
+        // Each window's object name is the name of what opens it.
+        ShowOnce(main, opens,
+                 [&] { return new Window(main.session(), main.progress(), extra..., &main); });
     });
 }
 
