@@ -13,19 +13,9 @@ namespace {
 
 using namespace kori;
 
-std::filesystem::path MarketFolder() {
-    if (const char* dir = std::getenv("KORI_BENCH_MARKET")) return dir;
-    return std::filesystem::temp_directory_path() / "kori-bench-market-2000x5000";
-}
-
-const std::string& Market() {
-    static const std::string folder = bench::MakeSyntheticMarket(MarketFolder());
-    return folder;
-}
-
 // Machine floor: open and read every price file whole, nothing else.
 void BM_ReadEveryPriceFile(benchmark::State& state) {
-    const std::string folder = Market();
+    const std::string folder = bench::DefaultMarket();
     std::vector<std::string> files;
     for (int i = 0; i < bench::MarketShape{}.Securities; ++i)
         files.push_back(folder + bench::SyntheticCode(i) + ".WDT");
@@ -44,7 +34,7 @@ BENCHMARK(BM_ReadEveryPriceFile)->Unit(benchmark::kMillisecond)->UseRealTime();
 
 // The shared walk alone: name file, limits, each price file's length checked.
 void BM_ForEachSecurity(benchmark::State& state) {
-    const store::SecurityList list{Market(), 0};
+    const store::SecurityList list{bench::DefaultMarket(), 0};
     platform::NullProgress progress;
     for (auto _ : state) {
         int seen = 0;

@@ -17,16 +17,6 @@ namespace {
 
 using namespace kori;
 
-std::filesystem::path MarketFolder() {
-    if (const char* dir = std::getenv("KORI_BENCH_MARKET")) return dir;
-    return std::filesystem::temp_directory_path() / "kori-bench-market-2000x5000";
-}
-
-const std::string& Market() {
-    static const std::string folder = bench::MakeSyntheticMarket(MarketFolder());
-    return folder;
-}
-
 osc::OscDef Settings() {
     osc::OscDef d;
     d.StochK = 10;
@@ -38,7 +28,7 @@ osc::OscDef Settings() {
 }
 
 void BM_ForEachSecurity(benchmark::State& state) {
-    const store::SecurityList list{Market(), 0};
+    const store::SecurityList list{bench::DefaultMarket(), 0};
     platform::NullProgress progress;
     for (auto _ : state) {
         const auto r = store::ForEachSecurity(
@@ -58,7 +48,7 @@ void BM_Scan1Everything(benchmark::State& state) {
     platform::NullProgress progress;
     std::size_t rows = 0;
     for (auto _ : state) {
-        const auto r = scan::RunScan1(Market(), o, def, progress);
+        const auto r = scan::RunScan1(bench::DefaultMarket(), o, def, progress);
         rows = r.Rows.size();
         benchmark::DoNotOptimize(rows);
     }
@@ -75,7 +65,8 @@ void BM_Scan1TailOscillators(benchmark::State& state) {
     const auto def = Settings();
     platform::NullProgress progress;
     for (auto _ : state)
-        benchmark::DoNotOptimize(scan::RunScan1(Market(), o, def, progress).Rows.size());
+        benchmark::DoNotOptimize(
+            scan::RunScan1(bench::DefaultMarket(), o, def, progress).Rows.size());
 }
 BENCHMARK(BM_Scan1TailOscillators)->Unit(benchmark::kMillisecond)->UseRealTime();
 
@@ -88,7 +79,7 @@ void BM_Scan2(benchmark::State& state) {
     o.PricePercent = "3";
     platform::NullProgress progress;
     for (auto _ : state)
-        benchmark::DoNotOptimize(scan::RunScan2(Market(), o, progress).Rows.size());
+        benchmark::DoNotOptimize(scan::RunScan2(bench::DefaultMarket(), o, progress).Rows.size());
 }
 BENCHMARK(BM_Scan2)->Unit(benchmark::kMillisecond)->UseRealTime();
 
@@ -97,7 +88,7 @@ void BM_Scan3(benchmark::State& state) {
     o.Up = o.Down = true;
     platform::NullProgress progress;
     for (auto _ : state)
-        benchmark::DoNotOptimize(scan::RunScan3(Market(), o, progress).Rows.size());
+        benchmark::DoNotOptimize(scan::RunScan3(bench::DefaultMarket(), o, progress).Rows.size());
 }
 BENCHMARK(BM_Scan3)->Unit(benchmark::kMillisecond)->UseRealTime();
 
@@ -107,7 +98,7 @@ void BM_Scan6(benchmark::State& state) {
     o.Av2D = 30;
     platform::NullProgress progress;
     for (auto _ : state)
-        benchmark::DoNotOptimize(scan::RunScan6(Market(), o, progress).Rows.size());
+        benchmark::DoNotOptimize(scan::RunScan6(bench::DefaultMarket(), o, progress).Rows.size());
 }
 BENCHMARK(BM_Scan6)->Unit(benchmark::kMillisecond)->UseRealTime();
 
@@ -115,7 +106,8 @@ void BM_Statistics(benchmark::State& state) {
     platform::NullProgress progress;
     for (auto _ : state) {
         scan::MarketStatistics stats;
-        if (!stats.Check(Market(), "ALL", progress)) state.SkipWithError("statistics failed");
+        if (!stats.Check(bench::DefaultMarket(), "ALL", progress))
+            state.SkipWithError("statistics failed");
         benchmark::DoNotOptimize(stats.Movers().size());
     }
 }

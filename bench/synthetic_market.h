@@ -12,6 +12,7 @@
 #include <cmath>
 #include <cstdint>
 #include <cstdio>
+#include <cstdlib>
 #include <filesystem>
 #include <fstream>
 #include <random>
@@ -112,6 +113,17 @@ inline std::string MakeSyntheticMarket(const std::filesystem::path& folder,
         .write(names.data(), static_cast<std::streamsize>(names.size()));
     std::ofstream(stamp, std::ios::binary) << MarketStamp(shape);
     return dataFolder;
+}
+
+// The 2000 x 5000 market the walks over the library are measured on, made once per machine
+// in the temporary folder (or in $KORI_BENCH_MARKET).
+inline const std::string& DefaultMarket() {
+    static const std::string folder = [] {
+        if (const char* dir = std::getenv("KORI_BENCH_MARKET")) return MakeSyntheticMarket(dir);
+        return MakeSyntheticMarket(std::filesystem::temp_directory_path() /
+                                   "kori-bench-market-2000x5000");
+    }();
+    return folder;
 }
 
 } // namespace kori::bench
