@@ -17,9 +17,13 @@ std::string Price(float v) {
     return platform::FormatSingle(v, "0.00##");
 }
 
-bool IsWeekend(std::string_view date) {
-    const auto wd = platform::Weekday(date);
-    return wd && (*wd == 1 || *wd == 7);
+// Weekdays strictly between two day numbers (serial 1, 31 December 1899, was a Sunday).
+int WeekdaysBetweenSerials(std::int32_t a, std::int32_t b) {
+    if (b <= a + 1) return 0;
+    auto weekdaysUpTo = [](std::int32_t s) { // weekdays in serials 1..s, weeks from a Sunday
+        return s / 7 * 5 + std::clamp(s % 7 - 1, 0, 5);
+    };
+    return static_cast<int>(weekdaysUpTo(b - 1) - weekdaysUpTo(a));
 }
 
 class HistoryChecker {
@@ -35,6 +39,9 @@ public:
             Check(records, static_cast<int>(i));
         return std::move(m_findings);
     }
+    // After a run: the latest date in order and its record (1-based; 0 when none).
+    const std::string& lastDate() const { return m_lastDate; }
+    int lastRecord() const { return m_lastIndex + 1; }
 
 private:
     void Add(const store::PriceRecord& r, int index, std::string_view what, std::string detail) {
@@ -50,28 +57,33 @@ private:
         CheckMove(records, i);
     }
 
+    // One day number a record serves every date rule: valid, weekday, order and gap.
     void CheckDate(const store::PriceRecord& r, int i) {
-        if (!platform::IsValidDateText(r.Date)) {
+        const auto serial = platform::DaySerial(r.Date);
+        if (!serial) {
             Add(r, i, finding::NotADate, "\"" + r.Date + "\"");
             return;
         }
-        if (IsWeekend(r.Date)) Add(r, i, finding::Weekend, platform::FormatDate(r.Date, "dddd"));
-        if (!m_lastDate.empty()) {
-            if (r.Date < m_lastDate) {
+        const int weekday = *serial % 7; // 0 Saturday, 1 Sunday (serial 1 was a Sunday)
+        if (weekday == 0 || weekday == 1)
+            Add(r, i, finding::Weekend, platform::FormatDate(r.Date, "dddd"));
+        if (m_lastIndex >= 0) {
+            if (*serial < m_lastSerial) {
                 Add(r, i, finding::OutOfOrder, "after " + platform::DateTextToDisplay(m_lastDate));
                 return; // the order is broken: the last good date stays the reference
             }
-            if (r.Date == m_lastDate) {
+            if (*serial == m_lastSerial) {
                 Add(r, i, finding::Duplicated, "also record " + std::to_string(m_lastIndex + 1));
                 return;
             }
-            const int missing = WeekdaysBetween(m_lastDate, r.Date);
+            const int missing = WeekdaysBetweenSerials(m_lastSerial, *serial);
             if (missing > m_settings.GapWeekdays)
                 Add(r, i, finding::Gap,
                     std::to_string(missing) + " weekdays without a record since " +
                         platform::DateTextToDisplay(m_lastDate));
         }
         m_lastDate = r.Date;
+        m_lastSerial = *serial;
         m_lastIndex = i;
     }
 
@@ -137,6 +149,7 @@ private:
     const DataCheckSettings& m_settings;
     std::vector<Finding> m_findings;
     std::string m_lastDate;
+    std::int32_t m_lastSerial = 0;
     int m_lastIndex = -1;
     int m_lastTraded = -1;
 };
@@ -170,14 +183,7 @@ void SaveDataCheckSettings(platform::SettingsStore& store, const DataCheckSettin
 int WeekdaysBetween(std::string_view fromDate, std::string_view toDate) {
     const auto a = platform::DaySerial(fromDate);
     const auto b = platform::DaySerial(toDate);
-    if (!a || !b || *b <= *a + 1) return 0;
-    // Serial 1 (31 December 1899) was a Sunday; count Mondays to Fridays in (a, b).
-    auto weekdaysUpTo = [](std::int32_t s) { // weekdays in serials 1..s
-        const std::int32_t weeks = s / 7, rest = s % 7;
-        // rest days after whole weeks start on a Sunday: Sun, Mon, ..., Sat
-        return weeks * 5 + std::clamp(rest - 1, 0, 5);
-    };
-    return static_cast<int>(weekdaysUpTo(*b - 1) - weekdaysUpTo(*a));
+    return a && b ? WeekdaysBetweenSerials(*a, *b) : 0;
 }
 
 std::vector<Finding> CheckHistory(const store::NameRecord& name,
@@ -224,15 +230,11 @@ DataCheckResult CheckLibrary(const store::SecurityList& list, const DataCheckSet
                                        0, std::string(finding::Damaged), s.message()});
             return store::WalkStep::Continue;
         }
-        auto found = CheckHistory(item.Name, records, settings);
+        HistoryChecker checker(item.Name, settings);
+        auto found = checker.Run(records);
         result.Findings.insert(result.Findings.end(), std::make_move_iterator(found.begin()),
                                std::make_move_iterator(found.end()));
-        Last last{item.Name, LastValidDate(records), 0, result.Findings.size()};
-        for (int k = static_cast<int>(records.size()); k >= 1; --k)
-            if (records[static_cast<std::size_t>(k - 1)].Date == last.Date) {
-                last.Record = k;
-                break;
-            }
+        Last last{item.Name, checker.lastDate(), checker.lastRecord(), result.Findings.size()};
         if (last.Date > result.LatestDate) result.LatestDate = last.Date;
         lasts.push_back(std::move(last));
         ++result.Checked;
