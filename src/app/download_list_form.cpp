@@ -108,7 +108,8 @@ std::string DownloadListForm::Summary(const std::vector<intake::RunResult>& runs
         }
     std::string text = std::to_string(files) + (files == 1 ? " file: " : " files: ") +
                        std::to_string(records) + " records, " + std::to_string(fresh) +
-                       " new securities, " + std::to_string(fillers) + " fillers";
+                       (fresh == 1 ? " new security, " : " new securities, ") +
+                       std::to_string(fillers) + " fillers";
     if (cancelled > 0) text += "; " + std::to_string(cancelled) + " not updated";
     if (std::any_of(runs.begin(), runs.end(), [](const auto& r) { return r.Failed; }))
         text += "; stopped by a file error";
