@@ -64,6 +64,18 @@ TEST_F(KoriCheck, TheSampleIsSoundAndPlantedFaultsAreFound) {
     EXPECT_NE(csv.out.find(",20,High below low,"), std::string::npos) << csv.out;
 }
 
+TEST_F(KoriCheck, AnExportedHistoryImportsBackUnchanged) {
+    const auto csv = (dir.path() / "krm.csv").string();
+    ASSERT_EQ(Kori({"export", "data", "KRM", "-o", csv}).status, 0);
+    const auto imported = Kori({"import", csv, "--code", "KRMCPY", "--name", "Copy of KRM"});
+    ASSERT_EQ(imported.status, 0) << imported.err;
+    const auto original = Kori({"export", "data", "KRM"});
+    const auto copy = Kori({"export", "data", "KRMCPY"});
+    ASSERT_EQ(copy.status, 0) << copy.err;
+    EXPECT_GT(original.out.size(), 1000u);
+    EXPECT_EQ(copy.out, original.out);
+}
+
 TEST_F(KoriCheck, RefusesAFolderWithoutANameFile) {
     const auto r = Kori({"check", "--folder", dir.path().string()});
     EXPECT_NE(r.status, 0);
