@@ -241,23 +241,7 @@ store::NameRecord NewNameRecord(std::string_view code, std::string_view name,
     n.Code = Trim(store::PadCode(code));
     n.Name = Trim(name);
     n.RecordType = recordType;
-    n.Category = 1;
-    if (dayFile && n.Code.size() == 6) {
-        switch (std::toupper(static_cast<unsigned char>(n.Code[3]))) {
-        case 'E':
-            n.Category = 86;
-            break;
-        case 'I':
-            n.Category = 87;
-            break;
-        case 'W':
-            n.Category = 84;
-            break;
-        default:
-            n.Category = 88;
-            break;
-        }
-    }
+    n.Category = dayFile ? NewEquityCategory(n.Code) : std::int16_t{1};
     n.Base = n.Top = n.PFIncrement = 0;
     n.ScaleStep = 0.05f;
     return n;

@@ -4,6 +4,7 @@
 #include "store/name_record.h"
 
 #include <algorithm>
+#include <cctype>
 #include <cmath>
 #include <limits>
 
@@ -89,6 +90,20 @@ std::string ArrivalCode(std::string_view delivered) {
 bool IsEightDigitDate(std::string_view date) {
     return date.size() == 8 &&
            std::all_of(date.begin(), date.end(), [](char c) { return c >= '0' && c <= '9'; });
+}
+
+std::int16_t NewEquityCategory(std::string_view code) {
+    if (code.size() != 6) return 1;
+    switch (std::toupper(static_cast<unsigned char>(code[3]))) {
+    case 'E':
+        return 86;
+    case 'I':
+        return 87;
+    case 'W':
+        return 84;
+    default:
+        return 88;
+    }
 }
 
 } // namespace kori::intake

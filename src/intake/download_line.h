@@ -33,4 +33,8 @@ std::string ArrivalCode(std::string_view delivered);
 // A date field the files can hold: exactly eight digits.
 bool IsEightDigitDate(std::string_view date);
 
+// The category of a new equity from its code: a six-character code is sorted by its fourth
+// letter (E 86, I 87, W 84, any other 88); shorter codes are ordinary shares, 1.
+std::int16_t NewEquityCategory(std::string_view code);
+
 } // namespace kori::intake

@@ -526,22 +526,7 @@ bool DownloadRun::CreateSecurity(const DownloadLine& d, const std::string& code,
         n.Code = code;
         n.RecordType = (m_s.DataService == 3 && target.RecordType == 5) ? 5 : 4;
         n.Id = Upper(target.Letter);
-        n.Category = 1;
-        if (target.Segment == "EQUITIES " && code.size() == 6) {
-            switch (Upper(code.substr(3, 1))[0]) {
-            case 'E':
-                n.Category = 86;
-                break;
-            case 'I':
-                n.Category = 87;
-                break;
-            case 'W':
-                n.Category = 84;
-                break;
-            default:
-                n.Category = 88;
-            }
-        }
+        n.Category = target.Segment == "EQUITIES " ? NewEquityCategory(code) : std::int16_t{1};
         if (target.Options)
             n.OtherDetails =
                 "0" + d.OptType +

@@ -13,25 +13,10 @@ namespace {
 
 using json = nlohmann::ordered_json;
 
-class KoriAdjust : public testing::Test {
+class KoriAdjust : public SampleRootSuite {
 protected:
-    static void SetUpTestSuite() {
-        s_dir = new TempRoot;
-        const auto r = RunKoriWith({"init", "--sample", "--root", Root()});
-        ASSERT_EQ(r.status, 0) << r.err;
-    }
-    static void TearDownTestSuite() {
-        delete s_dir;
-        s_dir = nullptr;
-    }
-    static std::string Root() { return (s_dir->path() / "k").string(); }
     static std::filesystem::path File() {
         return store::PriceFile::PathFor(Root() + "/data/", "KRM");
-    }
-    static KoriResult Kori(std::vector<std::string> args) {
-        args.push_back("--root");
-        args.push_back(Root());
-        return RunKoriWith(std::move(args));
     }
     // Four days of KRM at 2.50 with 1000 shares a day, 2, 3, 4 and 8 January 2024.
     void SetUp() override {
@@ -49,9 +34,7 @@ protected:
         EXPECT_TRUE(f.ReadAll(r).ok());
         return r;
     }
-    static TempRoot* s_dir;
 };
-TempRoot* KoriAdjust::s_dir = nullptr;
 
 TEST_F(KoriAdjust, BonusIssueThenRemoval) {
     auto r = Kori({"adjust", "krm", "--bonus", "1:4", "--date", "4/1/24", "--json"});

@@ -1,6 +1,9 @@
 #pragma once
 // Runs the kori tool in-process and keeps what it wrote and its exit status.
 #include "cli/run_kori.h"
+#include "support/temp_root.h"
+
+#include <gtest/gtest.h>
 
 #include <sstream>
 #include <string>
@@ -25,5 +28,27 @@ inline KoriResult RunKoriWith(std::vector<std::string> args) {
     r.err = err.str();
     return r;
 }
+
+// One sample library made by kori init --sample for a whole test suite, and the commands run
+// over it with its --root.
+class SampleRootSuite : public testing::Test {
+protected:
+    static void SetUpTestSuite() {
+        s_dir = new TempRoot;
+        const auto r = RunKoriWith({"init", "--sample", "--root", Root()});
+        ASSERT_EQ(r.status, 0) << r.err;
+    }
+    static void TearDownTestSuite() {
+        delete s_dir;
+        s_dir = nullptr;
+    }
+    static std::string Root() { return (s_dir->path() / "k").string(); }
+    static KoriResult Kori(std::vector<std::string> args) {
+        args.push_back("--root");
+        args.push_back(Root());
+        return RunKoriWith(std::move(args));
+    }
+    static inline TempRoot* s_dir = nullptr;
+};
 
 } // namespace kori::test

@@ -15,24 +15,9 @@ namespace {
 
 using json = nlohmann::ordered_json;
 
-class ScanCommands : public testing::Test {
+class ScanCommands : public SampleRootSuite {
 protected:
-    static void SetUpTestSuite() {
-        s_dir = new TempRoot;
-        const auto r = RunKoriWith({"init", "--sample", "--root", Root()});
-        ASSERT_EQ(r.status, 0) << r.err;
-    }
-    static void TearDownTestSuite() {
-        delete s_dir;
-        s_dir = nullptr;
-    }
-    static std::string Root() { return (s_dir->path() / "k").string(); }
     static std::string Data() { return Root() + "/data/"; }
-    static KoriResult Kori(std::vector<std::string> args) {
-        args.push_back("--root");
-        args.push_back(Root());
-        return RunKoriWith(std::move(args));
-    }
     static json Json(std::vector<std::string> args) {
         args.push_back("--json");
         const auto r = Kori(std::move(args));
@@ -53,9 +38,7 @@ protected:
             codes.push_back(platform::Trim(e.Code));
         return codes;
     }
-    static TempRoot* s_dir;
 };
-TempRoot* ScanCommands::s_dir = nullptr;
 
 TEST_F(ScanCommands, Scan1FindsTheExactRiseAndTheOscillatorsAndStoresTheList) {
     const json out = Json({"scan1", "--rise", "10", "--osc", "STO,RSI", "--ob", "--os", "--set",

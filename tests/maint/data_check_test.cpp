@@ -1,6 +1,7 @@
 #include "maint/data_check.h"
 
 #include "store/name_file.h"
+#include "store/store_builders.h"
 #include "support/temp_root.h"
 
 #include <gtest/gtest.h>
@@ -13,18 +14,7 @@ namespace {
 
 using store::NameRecord;
 using store::PriceRecord;
-
-PriceRecord Day(const char* date, float o, float h, float l, float c, int v = 1000, float adj = 0) {
-    PriceRecord r;
-    r.Date = date;
-    r.Open = o;
-    r.High = h;
-    r.Low = l;
-    r.Close = c;
-    r.Volume = v;
-    r.AdjFactor = adj;
-    return r;
-}
+using test::Day;
 
 NameRecord Security(const char* code, int type = 4) {
     NameRecord n;
@@ -51,19 +41,19 @@ TEST(WeekdaysBetween, CountsMondayToFridayStrictlyBetween) {
 }
 
 TEST(CheckHistory, ASoundHistoryHasNoFindings) {
-    const std::vector<PriceRecord> recs = {Day("20261119", 10, 11, 9, 10.5f),
-                                           Day("20261120", 10.5f, 10.5f, 10.5f, 10.5f),
+    const std::vector<PriceRecord> recs = {Day("20261119", 10, 11, 9, 10.5f, 1000),
+                                           Day("20261120", 10.5f, 10.5f, 10.5f, 10.5f, 1000),
                                            Day("20261123", 0, 0, 0, 0, 0)}; // no trade
     EXPECT_TRUE(CheckHistory(Security("ABC"), recs, {}).empty());
 }
 
 TEST(CheckHistory, DatesOutOfOrderDuplicatedWeekendAndNotADate) {
     const std::vector<PriceRecord> recs = {
-        Day("20261118", 10, 11, 9, 10), Day("20261120", 10, 11, 9, 10),
-        Day("20261119", 10, 11, 9, 10), // out of order: Thursday after Friday
-        Day("20261120", 10, 11, 9, 10), // the Friday again
-        Day("20261121", 10, 11, 9, 10), // Saturday
-        Day("2026-11-", 10, 11, 9, 10)};
+        Day("20261118", 10, 11, 9, 10, 1000), Day("20261120", 10, 11, 9, 10, 1000),
+        Day("20261119", 10, 11, 9, 10, 1000), // out of order: Thursday after Friday
+        Day("20261120", 10, 11, 9, 10, 1000), // the Friday again
+        Day("20261121", 10, 11, 9, 10, 1000), // Saturday
+        Day("2026-11-", 10, 11, 9, 10, 1000)};
     const auto found = CheckHistory(Security("ABC"), recs, {});
     EXPECT_EQ(Whats(found), (std::vector<std::string>{"3 " + std::string(finding::OutOfOrder),
                                                       "4 " + std::string(finding::Duplicated),
@@ -78,13 +68,14 @@ TEST(CheckHistory, DatesOutOfOrderDuplicatedWeekendAndNotADate) {
 
 TEST(CheckHistory, PricesOfATradedDay) {
     const float nan = std::numeric_limits<float>::quiet_NaN();
-    const std::vector<PriceRecord> recs = {Day("20261116", 10, 9, 11, 10),   // high below low
-                                           Day("20261117", 12, 12, 9, 9.5f), // fine
-                                           Day("20261118", 13, 12, 9, 9.5f), // open above the high
-                                           Day("20261119", 10, 12, 9, 8.5f), // close below the low
-                                           Day("20261120", 0, 12, 9, 10), // open 0 on a traded day
-                                           Day("20261123", 10, nan, 9, 10),     // not a number
-                                           Day("20261124", 10, 11, 9, 10, -5)}; // negative volume
+    const std::vector<PriceRecord> recs = {
+        Day("20261116", 10, 9, 11, 10, 1000),   // high below low
+        Day("20261117", 12, 12, 9, 9.5f, 1000), // fine
+        Day("20261118", 13, 12, 9, 9.5f, 1000), // open above the high
+        Day("20261119", 10, 12, 9, 8.5f, 1000), // close below the low
+        Day("20261120", 0, 12, 9, 10, 1000),    // open 0 on a traded day
+        Day("20261123", 10, nan, 9, 10, 1000),  // not a number
+        Day("20261124", 10, 11, 9, 10, -5)};    // negative volume
     const auto found = CheckHistory(Security("ABC"), recs, {});
     EXPECT_EQ(
         Whats(found),
@@ -98,20 +89,20 @@ TEST(CheckHistory, PricesOfATradedDay) {
 
 TEST(CheckHistory, CloseOnlyAndSignedSeriesAreNotHeldToBars) {
     // An index of closes only carries no open, high or low; an advance-decline line goes negative.
-    const std::vector<PriceRecord> index = {Day("20261119", 0, 0, 0, 5000),
-                                            Day("20261120", 0, 0, 0, 5010)};
+    const std::vector<PriceRecord> index = {Day("20261119", 0, 0, 0, 5000, 1000),
+                                            Day("20261120", 0, 0, 0, 5010, 1000)};
     EXPECT_TRUE(CheckHistory(Security("XAO", 1), index, {}).empty());
-    const std::vector<PriceRecord> ad = {Day("20261119", 0, 0, 0, -40),
-                                         Day("20261120", 0, 0, 0, -900)};
+    const std::vector<PriceRecord> ad = {Day("20261119", 0, 0, 0, -40, 1000),
+                                         Day("20261120", 0, 0, 0, -900, 1000)};
     EXPECT_TRUE(CheckHistory(Security("ADV", 3), ad, {}).empty());
 }
 
 TEST(CheckHistory, GapBeyondTheSetting) {
     DataCheckSettings s;
     s.GapWeekdays = 3;
-    const std::vector<PriceRecord> recs = {Day("20261102", 10, 11, 9, 10),  // Monday
-                                           Day("20261106", 10, 11, 9, 10),  // 3 between: fine
-                                           Day("20261113", 10, 11, 9, 10)}; // 4 between
+    const std::vector<PriceRecord> recs = {Day("20261102", 10, 11, 9, 10, 1000),  // Monday
+                                           Day("20261106", 10, 11, 9, 10, 1000),  // 3 between: fine
+                                           Day("20261113", 10, 11, 9, 10, 1000)}; // 4 between
     const auto found = CheckHistory(Security("ABC"), recs, s);
     ASSERT_EQ(Whats(found), (std::vector<std::string>{"3 " + std::string(finding::Gap)}));
     EXPECT_EQ(found[0].Detail, "4 weekdays without a record since 06/11/2026");
@@ -172,9 +163,9 @@ protected:
 };
 
 TEST_F(CheckLibraryTest, ReportsEverySecurityWithTheLatestDateOfAll) {
-    Add("AAA", {Day("20261119", 10, 11, 9, 10), Day("20261120", 10, 9, 11, 10)});
-    Add("BBB", {Day("20261030", 10, 11, 9, 10)}); // stopped three weeks before
-    Add("CCC", {Day("20261120", 10, 11, 9, 10)});
+    Add("AAA", {Day("20261119", 10, 11, 9, 10, 1000), Day("20261120", 10, 9, 11, 10, 1000)});
+    Add("BBB", {Day("20261030", 10, 11, 9, 10, 1000)}); // stopped three weeks before
+    Add("CCC", {Day("20261120", 10, 11, 9, 10, 1000)});
     root.Write("DDD.WDT", std::string(75, 'x')); // one record of letters and half another
     {
         store::NameFile names(store::NameFile::PathIn(root.folder()));
@@ -198,8 +189,8 @@ TEST_F(CheckLibraryTest, ReportsEverySecurityWithTheLatestDateOfAll) {
 }
 
 TEST_F(CheckLibraryTest, CancelKeepsWhatWasFound) {
-    Add("AAA", {Day("20261120", 10, 9, 11, 10)});
-    Add("BBB", {Day("20261120", 10, 9, 11, 10)});
+    Add("AAA", {Day("20261120", 10, 9, 11, 10, 1000)});
+    Add("BBB", {Day("20261120", 10, 9, 11, 10, 1000)});
     struct CancelAfterFirst : platform::NullProgress {
         void SetValue(long long v) override {
             if (v == 2) RequestCancel();
