@@ -1,5 +1,6 @@
 #include "gui/paint/qt_surface.h"
 
+#include "gui/paint/large_buffer.h"
 #include "platform/files.h"
 
 #include <QBuffer>
@@ -122,8 +123,28 @@ double QtSurface::TextHeight(std::string_view) {
     return QFontMetricsF(m_font, m_painter->device()).height();
 }
 
+namespace {
+
+void DeleteLargeBuffer(void* buffer) {
+    delete static_cast<LargeBuffer*>(buffer);
+}
+
+// The picture's pixels in large pages; the picture frees them when its last copy goes.
+QImage MakePicture(int width, int height) {
+    const qsizetype bytesPerLine = static_cast<qsizetype>(width) * 4;
+    auto* buffer = new LargeBuffer(static_cast<std::size_t>(bytesPerLine) * height);
+    if (!*buffer) {
+        delete buffer;
+        return QImage(width, height, QImage::Format_RGB32);
+    }
+    return QImage(buffer->data(), width, height, bytesPerLine, QImage::Format_RGB32,
+                  DeleteLargeBuffer, buffer);
+}
+
+} // namespace
+
 ImageSurface::Canvas::Canvas(int width, int height)
-    : image(std::max(width, 1), std::max(height, 1), QImage::Format_RGB32) {
+    : image(MakePicture(std::max(width, 1), std::max(height, 1))) {
     image.setDotsPerMeterX(kDotsPerMeter96);
     image.setDotsPerMeterY(kDotsPerMeter96);
     image.fill(Qt::white);
@@ -178,9 +199,10 @@ bool EncodeOpaquePng(const QImage& image, QByteArray& bytes) {
     const int height = image.height();
     if (width <= 0 || height <= 0) return false;
     const std::size_t stride = static_cast<std::size_t>(width) * 3 + 1;
-    thread_local std::vector<unsigned char> rows;
-    thread_local std::vector<unsigned char> packed;
-    rows.resize(stride * static_cast<std::size_t>(height));
+    const std::size_t rowBytes = stride * static_cast<std::size_t>(height);
+    thread_local LargeBuffer rows;
+    thread_local LargeBuffer packed;
+    if (!rows.Reserve(rowBytes)) return false;
     unsigned char* out = rows.data();
     const QRgb* above = nullptr;
     for (int y = 0; y < height; ++y) {
@@ -206,9 +228,9 @@ bool EncodeOpaquePng(const QImage& image, QByteArray& bytes) {
     thread_local std::unique_ptr<libdeflate_compressor, void (*)(libdeflate_compressor*)>
         compressor(libdeflate_alloc_compressor(2), libdeflate_free_compressor);
     if (!compressor) return false;
-    packed.resize(libdeflate_zlib_compress_bound(compressor.get(), rows.size()));
-    const std::size_t packedSize = libdeflate_zlib_compress(
-        compressor.get(), rows.data(), rows.size(), packed.data(), packed.size());
+    if (!packed.Reserve(libdeflate_zlib_compress_bound(compressor.get(), rowBytes))) return false;
+    const std::size_t packedSize = libdeflate_zlib_compress(compressor.get(), rows.data(), rowBytes,
+                                                            packed.data(), packed.size());
     if (packedSize == 0) return false;
 
     static constexpr unsigned char kSignature[8] = {0x89, 'P', 'N', 'G', '\r', '\n', 0x1A, '\n'};
