@@ -9,15 +9,15 @@
 
 #include <algorithm>
 #include <cstdio>
-#include <functional>
-#include <optional>
-#include <unistd.h>
 #include <filesystem>
+#include <functional>
 #include <map>
 #include <memory>
+#include <optional>
 #include <set>
 #include <sstream>
 #include <system_error>
+#include <unistd.h>
 
 namespace kori::maint {
 
@@ -219,11 +219,8 @@ std::vector<BackupPlace> LibraryPlaces(std::string_view installRoot,
     return places;
 }
 
-std::string BackupFileName(int year, int month, int day, int hour, int minute, int second) {
-    char text[64];
-    std::snprintf(text, sizeof text, "%s%04d%02d%02d-%02d%02d%02d%s", kPrefix.data(), year, month,
-                  day, hour, minute, second, kSuffix.data());
-    return text;
+std::string BackupFileName(std::string_view stamp) {
+    return std::string(kPrefix) + std::string(stamp) + std::string(kSuffix);
 }
 
 std::vector<std::string> ListBackups(std::string_view backupFolder) {
@@ -482,6 +479,32 @@ RestoreResult RestoreBackup(const std::string& archivePath, platform::Progress& 
         result.Replaced.push_back(Kept(p, stamp));
     }
     return result;
+}
+
+std::vector<std::string> ReplacedCopies(const std::vector<BackupPlace>& places) {
+    std::set<std::string> copies;
+    std::error_code ec;
+    for (const auto& p : places) {
+        const bool root = p.Name == "root";
+        const fs::path parent =
+            root ? fs::path(p.Folder) : fs::path(WithoutSlash(p.Folder)).parent_path();
+        const std::string prefix =
+            root ? std::string("replaced-")
+                 : fs::path(WithoutSlash(p.Folder)).filename().string() + ".replaced-";
+        for (fs::directory_iterator it(parent, ec), end; !ec && it != end; it.increment(ec))
+            if (it->is_directory(ec) && it->path().filename().string().rfind(prefix, 0) == 0)
+                copies.insert(Slash(it->path().string()));
+    }
+    return {copies.begin(), copies.end()};
+}
+
+Status DiscardReplaced(const std::vector<std::string>& copies) {
+    for (const auto& c : copies) {
+        std::error_code ec;
+        fs::remove_all(c, ec);
+        if (ec) return Status::Error("Cannot remove " + c + ": " + ec.message());
+    }
+    return Status::Ok();
 }
 
 } // namespace kori::maint

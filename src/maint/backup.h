@@ -36,8 +36,8 @@ struct BackupResult {
     bool Cancelled = false;
 };
 
-// "KoriBackup-yyyymmdd-hhmmss.tar.zst" for the given local time.
-std::string BackupFileName(int year, int month, int day, int hour, int minute, int second);
+// "KoriBackup-<stamp>.tar.zst"; the stamp "yyyymmdd-hhmmss" makes names sort by time.
+std::string BackupFileName(std::string_view stamp);
 
 // Writes the archive (beside, then renamed) to `archivePath`; when `backupFolder` is given,
 // keeps only the newest `keep` back-ups there afterwards. A cancel or a failure leaves no
@@ -72,5 +72,9 @@ struct RestoreResult {
 // leaves the library as it was.
 RestoreResult RestoreBackup(const std::string& archivePath, platform::Progress& progress,
                             const std::string& stamp, const std::vector<std::string>& remap = {});
+
+// The copies a restore kept beside the places it replaced, and their removal.
+std::vector<std::string> ReplacedCopies(const std::vector<BackupPlace>& places);
+platform::Status DiscardReplaced(const std::vector<std::string>& copies);
 
 } // namespace kori::maint

@@ -76,7 +76,7 @@ TEST(Backup, PlacesAreTheRootThenEachExistingFolderOnce) {
     EXPECT_EQ(places[0].Name, "root");
     EXPECT_EQ(places[1].Folder, lib.data);
     EXPECT_EQ(places[2].Name, "place2");
-    EXPECT_EQ(BackupFileName(2026, 11, 23, 9, 5, 7), "KoriBackup-20261123-090507.tar.zst");
+    EXPECT_EQ(BackupFileName("20261123-090507"), "KoriBackup-20261123-090507.tar.zst");
 }
 
 TEST(Backup, RestoresAnIdenticalLibraryAndKeepsWhatItReplaced) {
@@ -107,6 +107,13 @@ TEST(Backup, RestoresAnIdenticalLibraryAndKeepsWhatItReplaced) {
     std::erase_if(now,
                   [](const auto& kv) { return kv.first.find("replaced-T1") != std::string::npos; });
     EXPECT_EQ(now, original);
+
+    const auto copies = ReplacedCopies(lib.Places());
+    EXPECT_EQ(copies, (std::vector<std::string>{lib.root + "chtmisc.replaced-T1/",
+                                                lib.root + "data.replaced-T1/",
+                                                lib.root + "replaced-T1/"}));
+    ASSERT_TRUE(DiscardReplaced(copies).ok());
+    EXPECT_EQ(Snapshot(lib.dir.path()), original);
 }
 
 TEST(Backup, AFlippedByteOrACutArchiveIsRefusedAndTheLibraryStaysAsItWas) {
@@ -166,9 +173,9 @@ TEST(Backup, KeepsTheNewestBackupsAndACancelLeavesNoArchive) {
     Library lib;
     TempRoot out;
     for (int second : {1, 2, 3}) {
-        const auto r =
-            WriteBackup(lib.Places(), out.folder() + BackupFileName(2026, 11, 23, 9, 0, second),
-                        g_progress, out.folder(), 2);
+        const auto r = WriteBackup(
+            lib.Places(), out.folder() + BackupFileName("20261123-09000" + std::to_string(second)),
+            g_progress, out.folder(), 2);
         ASSERT_TRUE(r.Status.ok());
         if (second == 3) {
             ASSERT_EQ(r.Discarded.size(), 1u);
