@@ -118,6 +118,8 @@ void ApplyMenuConditions(std::vector<MenuItem>& tops, const MenuConditions& c) {
     if (auto* m = FindItem(tops, "mnuMveData")) m->enabled = c.DataService == 3;
     if (auto* m = FindItem(tops, "mnuFundamtl")) m->enabled = c.SecurityDetailsPresent;
     Show(tops, "mnuMaxScan", c.MaxScanPresent, c.MaxScanPresent);
+    // A companion program that is not installed has no item to fail from.
+    Show(tops, "mnuMMAScan", c.MMAScanPresent, c.MMAScanPresent);
 }
 
 void SetModalToolRunning(std::vector<MenuItem>& tops, bool running, const MenuConditions& c,

@@ -8,6 +8,9 @@
 #include "gui/windows/show_once.h"
 #include "gui/windows/stats_windows.h"
 #include "gui/windows/text_data.h"
+#include "platform/files.h"
+
+#include <QProcess>
 
 namespace kori::gui {
 
@@ -56,6 +59,17 @@ template <typename Window> void RegisterScan(MainWindow& main, const char* opens
     });
 }
 
+// A companion scan program of the system folder, started on its own; the menu offers it only
+// when the program is there.
+void RegisterCompanion(MainWindow& main, const char* opens, const char* program) {
+    main.SetAction(opens, [&main, program] {
+        const auto path = platform::ResolveIn(main.session().folders.SystemFolder, program);
+        if (!QProcess::startDetached(QString::fromStdString(path.string()), {},
+                                     QString::fromStdString(main.session().folders.SystemFolder)))
+            main.session().dialogs().MsgBox("Cannot start " + path.string(), "Chart Scans");
+    });
+}
+
 } // namespace
 
 void RegisterToolWindows(MainWindow& main) {
@@ -69,6 +83,8 @@ void RegisterToolWindows(MainWindow& main) {
     RegisterScan<ChtScan6>(main, "ChtScan6");
     RegisterScan<Statistics>(main, "Statistics");
     RegisterScan<ADTotals>(main, "ADTotals");
+    RegisterCompanion(main, "KoriMaxScan", "KoriMaxScan.exe");
+    RegisterCompanion(main, "KoriMMA", "KoriMMA.EXE");
 }
 
 } // namespace kori::gui
