@@ -20,6 +20,7 @@
 #include <QPrintDialog>
 #include <QPrinter>
 #include <QPushButton>
+#include <QScreen>
 #include <QStatusBar>
 #include <QVBoxLayout>
 
@@ -62,27 +63,28 @@ ScanFrameBoxes AddFrame(QWidget* parent, QGridLayout* grid, int row, const scan:
     b.Range = Check(parent, "chkRange", "By closing price range", f.Range.On);
     grid->addWidget(b.Range, row, 0);
     auto* minMax = new QHBoxLayout;
+    minMax->addSpacing(24);
     minMax->addWidget(new QLabel(QStringLiteral("Min"), parent));
-    b.Min = Edit(parent, "txtMin", f.Range.Min);
+    b.Min = Edit(parent, "txtMin", f.Range.Min, 70);
     minMax->addWidget(b.Min);
     minMax->addWidget(new QLabel(QStringLiteral("Max"), parent));
-    b.Max = Edit(parent, "txtMax", f.Range.Max);
+    b.Max = Edit(parent, "txtMax", f.Range.Max, 70);
     minMax->addWidget(b.Max);
     minMax->addStretch();
-    grid->addLayout(minMax, row, 1);
+    grid->addLayout(minMax, row + 1, 0, 1, 2);
     b.ClassOn = Check(parent, "chkClass", "Check only Industry Class ", f.ClassOn);
-    grid->addWidget(b.ClassOn, row + 1, 0);
+    grid->addWidget(b.ClassOn, row + 2, 0);
     b.Class = Edit(parent, "txtClass", f.Class, 50);
-    grid->addWidget(b.Class, row + 1, 1);
+    grid->addWidget(b.Class, row + 2, 1);
     if (lists) {
         b.NoWarrants = Check(parent, "chkWarrants", "Do not check warrants", noWarrants);
-        grid->addWidget(b.NoWarrants, row + 2, 0);
+        grid->addWidget(b.NoWarrants, row + 3, 0);
         b.List = new QComboBox(parent);
         b.List->setObjectName(QStringLiteral("cboList"));
         for (const auto& c : *lists)
             b.List->addItem(Q(c));
         b.List->setCurrentIndex(listIndex);
-        grid->addWidget(b.List, row + 3, 0, 1, 2);
+        grid->addWidget(b.List, row + 4, 0, 1, 2);
     }
     return b;
 }
@@ -93,6 +95,16 @@ void TakeFrame(const ScanFrameBoxes& b, scan::ScanFrame& f) {
     f.Range.Max = S(b.Max);
     f.ClassOn = b.ClassOn->isChecked();
     f.Class = S(b.Class);
+}
+
+// A first size that the screen can hold, however small it is.
+void SizeWithin(QWidget* w, int width, int height) {
+    if (const QScreen* screen = w->screen()) {
+        const QSize free = screen->availableGeometry().size() - QSize(16, 40);
+        width = std::min(width, free.width());
+        height = std::min(height, free.height());
+    }
+    w->resize(width, height);
 }
 
 QFont ListingFont() {
@@ -111,6 +123,7 @@ ScanWindow::~ScanWindow() = default;
 void ScanWindow::AddFoot(QBoxLayout* layout) {
     auto* buttons = new QHBoxLayout;
     m_proceed = Button(this, "cmdProceed", "Proceed");
+    m_proceed->setDefault(true);
     auto* print = Button(this, "cmdPrint", "&Print");
     auto* close = Button(this, "cmdClose", "Close");
     buttons->addWidget(m_proceed);
@@ -176,6 +189,14 @@ void ScanWindow::closeEvent(QCloseEvent* e) {
     QDialog::closeEvent(e);
 }
 
+void ScanWindow::reject() {
+    if (m_running) {
+        m_progress->RequestCancel();
+        return;
+    }
+    QDialog::reject();
+}
+
 // ---- chtScan1 ----
 
 ChtScan1::ChtScan1(app::Session& session, ShowChartOf showChart, QWidget* parent)
@@ -209,20 +230,21 @@ ChtScan1::ChtScan1(app::Session& session, ShowChartOf showChart, QWidget* parent
     top->addWidget(choices);
 
     auto* oscs = new QGroupBox(QStringLiteral("Oscillators"), m_controls);
-    auto* ol = new QVBoxLayout(oscs);
+    // Two columns each, stacked: the window still fits a small screen.
+    auto* ol = new QGridLayout(oscs);
     static constexpr std::array<const char*, 5> kOscCaptions = {
         "Stochastic ", "Williams %R", "Rate of Change", "Momentum", "RSI"};
     static constexpr std::array<const char*, 5> kOscNames = {"chkSTO", "chkWMS", "chkROC", "chkMM",
                                                              "chkRSI"};
     for (std::size_t k = 0; k < m_osc.size(); ++k) {
         m_osc[k] = Check(oscs, kOscNames[k], kOscCaptions[k], o.Osc[k]);
-        ol->addWidget(m_osc[k]);
+        ol->addWidget(m_osc[k], static_cast<int>(k / 2), static_cast<int>(k % 2));
     }
-    ol->addStretch();
-    top->addWidget(oscs);
+    auto* right = new QVBoxLayout;
+    right->addWidget(oscs);
 
     auto* inds = new QGroupBox(QStringLiteral("Indications"), m_controls);
-    auto* il = new QVBoxLayout(inds);
+    auto* il = new QGridLayout(inds);
     const std::array<std::pair<const char*, bool>, 4> indications = {
         std::pair{"OB (over bought)", o.Indications.OB},
         {"OS (over sold)", o.Indications.OS},
@@ -232,10 +254,11 @@ ChtScan1::ChtScan1(app::Session& session, ShowChartOf showChart, QWidget* parent
                                                              "chkCutOS"};
     for (std::size_t k = 0; k < m_ind.size(); ++k) {
         m_ind[k] = Check(inds, kIndNames[k], indications[k].first, indications[k].second);
-        il->addWidget(m_ind[k]);
+        il->addWidget(m_ind[k], static_cast<int>(k / 2), static_cast<int>(k % 2));
     }
-    il->addStretch();
-    top->addWidget(inds);
+    right->addWidget(inds);
+    right->addStretch();
+    top->addLayout(right);
     top->addStretch();
     layout->addWidget(m_controls);
 
@@ -247,6 +270,8 @@ ChtScan1::ChtScan1(app::Session& session, ShowChartOf showChart, QWidget* parent
     m_grid->setSelectionBehavior(QAbstractItemView::SelectRows);
     m_grid->setSelectionMode(QAbstractItemView::ContiguousSelection);
     m_grid->Refresh();
+    for (std::size_t k = 0; k < m_osc.size(); ++k)
+        m_grid->setColumnHidden(6 + static_cast<int>(k), !o.Osc[k]);
     m_grid->horizontalHeader()->setStretchLastSection(true);
     layout->addWidget(m_grid, 1);
     connect(m_grid, &QTableWidget::cellDoubleClicked, this, [this] { ShowChart(); });
@@ -263,7 +288,7 @@ ChtScan1::ChtScan1(app::Session& session, ShowChartOf showChart, QWidget* parent
     connect(del, &QPushButton::clicked, this, [this] { DeleteSelected(); });
     layout->addLayout(rowButtons);
     AddFoot(layout);
-    resize(900, 600);
+    SizeWithin(this, 920, 700);
 }
 
 void ChtScan1::Take() {
@@ -293,6 +318,9 @@ bool ChtScan1::Proceed() {
     RunWalk([this] { m_form.Run(progress()); });
     const auto& r = m_form.result();
     m_grid->Refresh();
+    // Only the oscillators the scan tested have a column worth showing.
+    for (std::size_t k = 0; k < m_osc.size(); ++k)
+        m_grid->setColumnHidden(6 + static_cast<int>(k), !m_form.Options.Osc[k]);
     m_grid->resizeColumnsToContents();
     m_heading->setText(Q(m_form.GridHeading()));
     if (!r.Status) {
@@ -420,7 +448,7 @@ ChtScan2::ChtScan2(app::Session& session, ShowChartOf showChart, QWidget* parent
     m_frame =
         AddFrame(m_controls, g, 0, o.Frame, o.NoWarrants, &m_form.listCaptions(), m_form.ListIndex);
     m_volume = Check(m_controls, "chkVolume", "By increases in volume", o.Volume);
-    g->addWidget(m_volume, 4, 0);
+    g->addWidget(m_volume, 5, 0);
     auto* vol = new QHBoxLayout;
     m_volumePercent = Edit(m_controls, "txtVolPercent", o.VolumePercent, 60);
     vol->addWidget(m_volumePercent);
@@ -429,16 +457,16 @@ ChtScan2::ChtScan2(app::Session& session, ShowChartOf showChart, QWidget* parent
     vol->addWidget(m_volumeDays);
     vol->addWidget(new QLabel(QStringLiteral("days"), m_controls));
     vol->addStretch();
-    g->addLayout(vol, 4, 1);
+    g->addLayout(vol, 5, 1);
     m_price = Check(m_controls, "chkPrice", "By +/- in price %", o.Price);
-    g->addWidget(m_price, 5, 0);
+    g->addWidget(m_price, 6, 0);
     m_pricePercent = Edit(m_controls, "txtPricePercent", o.PricePercent, 60);
-    g->addWidget(m_pricePercent, 5, 1);
+    g->addWidget(m_pricePercent, 6, 1);
     layout->addWidget(m_controls);
     AddListing(layout);
     AddFoot(layout);
     ShowListing(m_form.listing());
-    resize(620, 560);
+    SizeWithin(this, 640, 600);
 }
 
 bool ChtScan2::Proceed() {
@@ -490,7 +518,7 @@ ChtScan3::ChtScan3(app::Session& session, ShowChartOf showChart, QWidget* parent
     AddListing(layout);
     AddFoot(layout);
     ShowListing(m_form.listing());
-    resize(560, 540);
+    SizeWithin(this, 600, 580);
 }
 
 bool ChtScan3::Proceed() {
@@ -540,12 +568,12 @@ ChtScan6::ChtScan6(app::Session& session, ShowChartOf showChart, QWidget* parent
                        "lie within half of one per cent of each other."),
         m_controls);
     note->setWordWrap(true);
-    g->addWidget(note, 3, 0, 1, 2);
+    g->addWidget(note, 4, 0, 1, 2);
     layout->addWidget(m_controls);
     AddListing(layout);
     AddFoot(layout);
     ShowListing(m_form.listing());
-    resize(620, 560);
+    SizeWithin(this, 640, 600);
 }
 
 bool ChtScan6::Proceed() {

@@ -53,6 +53,7 @@ protected:
     bool Refused(const std::optional<scan::ScanMessage>& m);
     void Print();
     void closeEvent(QCloseEvent* e) override;
+    void reject() override; // Escape: during a walk it cancels the walk instead
 
     app::Session& m_session;
     ShowChartOf m_showChart;

@@ -16,6 +16,7 @@
 #include <QPrinter>
 #include <QPushButton>
 #include <QRadioButton>
+#include <QScreen>
 #include <QVBoxLayout>
 
 namespace kori::gui {
@@ -80,7 +81,8 @@ Statistics::Statistics(app::Session& session, ShowChartOf showChart, QWidget* pa
     connect(m_grid, &QTableWidget::cellDoubleClicked, this, [this] { ShowChart(); });
     AddFoot(layout);
     m_proceed->setText(QStringLiteral("Check &Statistics"));
-    resize(1000, 600);
+    resize(std::min(1000, screen() ? screen()->availableGeometry().width() - 16 : 1000),
+           std::min(640, screen() ? screen()->availableGeometry().height() - 40 : 640));
 }
 
 void Statistics::Take() {
