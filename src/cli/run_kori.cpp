@@ -37,6 +37,7 @@ int RunKori(int argc, const char* const* argv, std::ostream& out, std::ostream& 
     AddDataCommand(app, ctx);
     AddRepairCommand(app, ctx);
     AddCheckCommand(app, ctx);
+    AddCheckNamesCommand(app, ctx);
     AddExportCommand(app, ctx);
 
     try {

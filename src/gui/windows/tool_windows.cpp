@@ -4,6 +4,7 @@
 #include "gui/windows/chk_dta.h"
 #include "gui/windows/dl_list.h"
 #include "gui/windows/main_window.h"
+#include "gui/windows/name_data.h"
 #include "gui/windows/scan_windows.h"
 #include "gui/windows/show_once.h"
 #include "gui/windows/stats_windows.h"
@@ -85,6 +86,13 @@ void RegisterToolWindows(MainWindow& main) {
     RegisterScan<ADTotals>(main, "ADTotals");
     RegisterCompanion(main, "KoriMaxScan", "KoriMaxScan.exe");
     RegisterCompanion(main, "KoriMMA", "KoriMMA.EXE");
+    // The name-file check asks first, as its menu item says.
+    main.SetAction("NameData", [&main] {
+        app::NameDataForm question(main.session());
+        if (!question.Ask()) return;
+        ShowOnce(main, "NameData",
+                 [&] { return new NameData(main.session(), main.progress(), &main); });
+    });
 }
 
 } // namespace kori::gui
