@@ -16,6 +16,7 @@
 #include <QLabel>
 #include <QLineEdit>
 #include <QListWidget>
+#include <QMenu>
 #include <QPushButton>
 #include <QRadioButton>
 #include <QStatusBar>
@@ -160,8 +161,14 @@ TEST_F(ScanWindows, CancelStopsTheWalkAndLeavesTheScanListAlone) {
     for (auto* b : w->findChildren<QPushButton*>())
         if (b->text() == QLatin1String("Cancel")) cancel = b;
     ASSERT_NE(cancel, nullptr);
-    QTimer::singleShot(0, cancel, [cancel] { cancel->click(); });
+    bool menusWhileWalking = true;
+    QTimer::singleShot(0, cancel, [&] {
+        menusWhileWalking = main.findChild<QMenu*>(QStringLiteral("mnuAnalysis")) != nullptr;
+        cancel->click();
+    });
     ASSERT_TRUE(w->Proceed());
+    EXPECT_FALSE(menusWhileWalking); // no second walk can start inside this one
+    EXPECT_NE(main.findChild<QMenu*>(QStringLiteral("mnuAnalysis")), nullptr);
     EXPECT_TRUE(w->form().result().Cancelled);
     EXPECT_TRUE(s.dialogs.messages().empty()); // no closing message after a cancel
     EXPECT_TRUE(w->status()->text().startsWith(QStringLiteral("Cancelled")));

@@ -4,6 +4,7 @@
 #include "gui/widgets/grid_view.h"
 #include "gui/widgets/text_print.h"
 #include "gui/widgets/window_place.h"
+#include "gui/windows/main_window.h"
 #include "platform/text.h"
 
 #include <QCheckBox>
@@ -21,6 +22,7 @@
 #include <QPrinter>
 #include <QPushButton>
 #include <QScreen>
+#include <QShortcut>
 #include <QStatusBar>
 #include <QVBoxLayout>
 
@@ -146,6 +148,9 @@ void ScanWindow::AddFoot(QBoxLayout* layout) {
 }
 
 void ScanWindow::RunWalk(const std::function<void()>& walk) {
+    // The menus go while the walk lets events run: no second walk starts inside this one.
+    auto* main = qobject_cast<MainWindow*>(parentWidget());
+    if (main) main->SetModalToolRunning(true);
     m_running = true;
     if (m_controls) m_controls->setEnabled(false);
     m_proceed->setEnabled(false);
@@ -156,6 +161,7 @@ void ScanWindow::RunWalk(const std::function<void()>& walk) {
     m_proceed->setEnabled(true);
     if (m_controls) m_controls->setEnabled(true);
     m_running = false;
+    if (main) main->SetModalToolRunning(false);
 }
 
 bool ScanWindow::Refused(const std::optional<scan::ScanMessage>& m) {
@@ -286,6 +292,9 @@ ChtScan1::ChtScan1(app::Session& session, ShowChartOf showChart, QWidget* parent
     rowButtons->addStretch();
     connect(chart, &QPushButton::clicked, this, [this] { ShowChart(); });
     connect(del, &QPushButton::clicked, this, [this] { DeleteSelected(); });
+    auto* delKey = new QShortcut(QKeySequence::Delete, m_grid);
+    delKey->setContext(Qt::WidgetShortcut);
+    connect(delKey, &QShortcut::activated, this, [this] { DeleteSelected(); });
     layout->addLayout(rowButtons);
     AddFoot(layout);
     SizeWithin(this, 920, 700);
