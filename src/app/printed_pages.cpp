@@ -24,4 +24,23 @@ std::vector<PrintedPage> PaginateLines(const std::vector<std::string>& body, int
     return pages;
 }
 
+std::string PrintedColumns::Line(const std::vector<std::string>& cells) const {
+    std::string line;
+    for (std::size_t c = 0; c < cells.size() && c < Widths.size(); ++c) {
+        if (c > 0) line += '\t';
+        line += cells[c].substr(0, static_cast<std::size_t>(std::max(1, Widths[c] - 1)));
+    }
+    return line;
+}
+
+std::vector<int> PrintedColumns::Stops() const {
+    std::vector<int> stops;
+    int at = 0;
+    for (int w : Widths) {
+        stops.push_back(at);
+        at += w;
+    }
+    return stops;
+}
+
 } // namespace kori::app

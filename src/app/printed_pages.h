@@ -16,6 +16,16 @@ struct PrintedLine {
 struct PrintedPage {
     std::vector<PrintedLine> Lines;
     std::string Foot; // empty: none
+    // Where the tab-separated cells of a line start, in widths of a digit; empty: no tabs.
+    std::vector<int> TabStops;
+};
+
+// Columns of a printed table: each cell cut to its column's width less one, the cells of a line
+// joined by tabs, so that a proportional font still lines them up under their headings.
+struct PrintedColumns {
+    std::vector<int> Widths; // in widths of a digit
+    std::string Line(const std::vector<std::string>& cells) const;
+    std::vector<int> Stops() const;
 };
 
 // `head(page)` gives the head of page `page` (from 1); each page then takes body lines until it

@@ -202,33 +202,36 @@ bool Scan1Form::DeleteRows(int first, int last, platform::Dialogs& dialogs) {
 }
 
 std::vector<PrintedPage> Scan1Form::Pages(int linesPerPage) const {
-    // Widths of the printed columns, by grid column.
-    static constexpr std::array<std::size_t, 11> kWidths = {4, 7, 31, 9, 5, 8, 10, 10, 10, 10, 10};
-    auto line = [](const std::vector<std::string>& cells) {
-        std::string text;
-        for (std::size_t c = 0; c < cells.size() && c < kWidths.size(); ++c) {
-            // Numbers stand to the right of their column, words to the left.
-            const bool number = c == 3 || c == 5;
-            const std::size_t w = kWidths[c];
-            std::string cell = cells[c].substr(0, w - 1);
-            text += number ? std::string(w - 1 - cell.size(), ' ') + cell + " "
-                           : platform::PadRight(cell, w);
-        }
-        return platform::TrimRight(text);
+    // The printed columns: the grid's, with only the oscillators the scan tested.
+    static constexpr std::array<int, 11> kWidths = {4, 10, 32, 10, 6, 9, 11, 11, 11, 11, 11};
+    std::vector<std::size_t> shown;
+    for (std::size_t c = 0; c < kWidths.size(); ++c)
+        if (c < 6 || Options.Osc[c - 6]) shown.push_back(c);
+    PrintedColumns columns;
+    for (auto c : shown)
+        columns.Widths.push_back(kWidths[c]);
+    auto line = [&](const std::vector<std::string>& cells) {
+        std::vector<std::string> picked;
+        for (auto c : shown)
+            picked.push_back(c < cells.size() ? cells[c] : std::string());
+        return columns.Line(picked);
     };
     std::vector<std::string> body;
     body.reserve(static_cast<std::size_t>(m_grid.rowCount()));
     for (const auto& row : m_grid.rows())
         body.push_back(line(row));
-    const std::string columns = line(m_grid.headers());
+    const std::string heads = line(m_grid.headers());
     const std::string date = GridHeading();
-    return PaginateLines(body, linesPerPage, [&](int page) {
+    auto pages = PaginateLines(body, linesPerPage, [&](int page) {
         return std::vector<PrintedLine>{
             {"ANALYSIS RESULTS  " + std::string("Page ") + std::to_string(page), false, true},
             {date},
-            {columns},
+            {heads},
             {""}};
     });
+    for (auto& p : pages)
+        p.TabStops = columns.Stops();
+    return pages;
 }
 
 // ---- the listings of Scans 2, 3 and 6 ----
@@ -386,7 +389,12 @@ std::vector<PrintedPage> Scan6Form::Pages(int linesPerPage) const {
     // The window is Scan 2's sibling, and its paper says so.
     ScanListingLines printed = m_listing;
     printed.Heading = std::string(scan::kScan2Heading);
-    return ListingPages(scan::kScan2Title, printed, linesPerPage);
+    auto pages = ListingPages(scan::kScan2Title, printed, linesPerPage);
+    // Its lines are tab-separated: code, close and gap under the sibling's first three headings,
+    // then name and class.
+    for (auto& p : pages)
+        p.TabStops = {0, 7, 17, 25, 58};
+    return pages;
 }
 
 } // namespace kori::app

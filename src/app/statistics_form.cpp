@@ -108,25 +108,22 @@ std::string StatisticsForm::CodeAt(int row, int column) const {
 }
 
 std::vector<PrintedPage> StatisticsForm::Pages(int linesPerPage, std::string_view todayText) const {
-    static constexpr std::array<std::size_t, 11> kWidths = {7, 25, 9, 9, 10, 6, 7, 25, 9, 9, 10};
-    auto line = [](const std::vector<std::string>& cells) {
-        std::string text;
-        for (std::size_t c = 0; c < cells.size() && c < kWidths.size(); ++c)
-            text += platform::PadRight(cells[c].substr(0, kWidths[c] - 1), kWidths[c]);
-        return platform::TrimRight(text);
-    };
+    const PrintedColumns columns{{7, 26, 9, 9, 10, 6, 7, 26, 9, 9, 10}};
     std::vector<std::string> body;
     for (const auto& row : m_grid.rows())
-        body.push_back(line(row));
-    const std::string columns = line(m_grid.headers());
+        body.push_back(columns.Line(row));
+    const std::string heads = columns.Line(m_grid.headers());
     const std::string date = platform::FormatDate(todayText, "Medium Date");
-    return PaginateLines(
+    auto pages = PaginateLines(
         body, linesPerPage,
         [&](int) {
             return std::vector<PrintedLine>{
-                {"STATISTICS"}, {date}, {kStatisticsCaption, true, true, true}, {""}, {columns}};
+                {"STATISTICS"}, {date}, {kStatisticsCaption, true, true, true}, {""}, {heads}};
         },
         [](int page) { return "Page  " + std::to_string(page); });
+    for (auto& p : pages)
+        p.TabStops = columns.Stops();
+    return pages;
 }
 
 // ---- ADTotals ----

@@ -49,6 +49,12 @@ TEST(PrintedPages, PagesRepeatTheirHeadAndTakeWhatFitsBelowIt) {
     EXPECT_TRUE(PaginateLines({}, 40, head).empty());
 }
 
+TEST(PrintedPages, TableColumnsAreCutToTheirWidthsAndStartWhereTheOnesBeforeEnd) {
+    const app::PrintedColumns columns{{4, 8, 6}};
+    EXPECT_EQ(columns.Line({"*", "ABCDEFGHIJ", "1.50", "dropped"}), "*\tABCDEFG\t1.50");
+    EXPECT_EQ(columns.Stops(), (std::vector<int>{0, 4, 12}));
+}
+
 TEST(PrintedPages, ListingsSayContinuedAfterTheirFirstPage) {
     app::ScanListingLines listing{"HEAD", {"1", "2", "3", "4"}, {}};
     const auto pages = app::ListingPages("CHART SCAN 3 DATA", listing, 5);
@@ -145,6 +151,9 @@ TEST_F(ScanForms, Scan1FindsTheExactRiseFillsTheGridAndStoresListZ) {
     EXPECT_EQ(pages[0].Lines[0].Text, "ANALYSIS RESULTS  Page 1");
     EXPECT_TRUE(pages[0].Lines[0].Bold);
     EXPECT_EQ(pages[0].Lines[1].Text, "SCAN RESULTS        Date: 20/11/26");
+    // No oscillator was tested, so none has a printed column.
+    EXPECT_EQ(pages[0].Lines[2].Text, "All\tCode\tName\tClose\tMove\tChange");
+    EXPECT_EQ(pages[0].TabStops.size(), 6u);
 }
 
 TEST_F(ScanForms, Scan1DeletesRowsOnlyWhenTheQuestionIsAnsweredYes) {

@@ -32,6 +32,21 @@ struct ScanWindows : DesktopTest {
         return main.findChild<W*>();
     }
     std::string Code() { return chts() ? chts()->current().TrimmedCode() : std::string(); }
+    // Prints a window's finds to a PDF file in the root; its bytes, with a copy to KORI_SHOTS
+    // when that names a folder. Nothing when the window printed nothing.
+    std::optional<std::string> PrintPdf(gui::ScanWindow* w, const char* fileName) {
+        const auto pdf = s.root.path() / fileName;
+        {
+            QPrinter printer(QPrinter::HighResolution);
+            printer.setOutputFormat(QPrinter::PdfFormat);
+            printer.setOutputFileName(QString::fromStdString(pdf.string()));
+            if (!w->PrintTo(printer)) return std::nullopt;
+        }
+        auto bytes = platform::ReadWholeFile(pdf);
+        if (const char* dir = std::getenv("KORI_SHOTS"); dir && bytes)
+            (void)platform::WriteFileAtomic(std::filesystem::path(dir) / fileName, *bytes);
+        return bytes;
+    }
     static int RowOf(gui::GridView* grid, int column, const char* code) {
         for (int r = 0; r < grid->rowCount(); ++r)
             if (grid->item(r, column) && grid->item(r, column)->text() == QLatin1String(code))
@@ -104,13 +119,9 @@ TEST_F(ScanWindows, Scan1FillsItsGridAndADoubleClickShowsTheChart) {
     ASSERT_NE(chts(), nullptr);
     EXPECT_EQ(Code(), "OBHI");
 
-    // Printing goes to paper only with rows to print.
-    QPrinter printer(QPrinter::HighResolution);
-    printer.setOutputFormat(QPrinter::PdfFormat);
-    const auto pdf = s.root.path() / "scan1.pdf";
-    printer.setOutputFileName(QString::fromStdString(pdf.string()));
-    EXPECT_TRUE(w->PrintTo(printer));
-    EXPECT_TRUE(platform::FileHasData(pdf));
+    const auto pdf = PrintPdf(w, "scan1.pdf");
+    ASSERT_TRUE(pdf);
+    EXPECT_EQ(pdf->rfind("%PDF", 0), 0u);
 }
 
 TEST_F(ScanWindows, Scan1RefusesBadChoicesAndKeepsGoodOnesForItsNextOpening) {
@@ -123,6 +134,8 @@ TEST_F(ScanWindows, Scan1RefusesBadChoicesAndKeepsGoodOnesForItsNextOpening) {
     EXPECT_EQ(s.dialogs.shown()[0].text, "Percentage Not valid - Valid Range 1 to 200 ");
     EXPECT_EQ(s.dialogs.shown()[0].title, "Analysis");
     EXPECT_EQ(w->grid()->rowCount(), 0);
+    EXPECT_FALSE(PrintPdf(w, "none.pdf")); // nothing found yet: nothing to print
+    EXPECT_EQ(s.dialogs.messages().back(), "No records to print");
 
     w->fallPercent()->setText(QStringLiteral("12"));
     w->frame().Range->setChecked(true);
@@ -200,6 +213,7 @@ TEST_F(ScanWindows, ListingScansShowTheirFindsAndOpenTheirCharts) {
               "viewing\n from the\n Chart Selection Window.");
     EXPECT_GE(LineOf(scan3->list(), "PARDN"), 0);
     EXPECT_LT(LineOf(scan3->list(), "PARUP"), 0);
+    EXPECT_TRUE(PrintPdf(scan3, "scan3.pdf"));
 
     auto* scan6 = Open<gui::ChtScan6>("mnuAvCO");
     ASSERT_NE(scan6, nullptr);
@@ -230,6 +244,7 @@ TEST_F(ScanWindows, StatisticsAndAdvanceDeclineFromTheirMenus) {
     stats->top()->setText(QStringLiteral("1"));
     ASSERT_TRUE(stats->Update());
     EXPECT_EQ(grid->rowCount(), 1 + 6);
+    EXPECT_TRUE(PrintPdf(stats, "statistics.pdf"));
 
     auto* ad = Open<gui::ADTotals>("mnuADCheck");
     ASSERT_NE(ad, nullptr);

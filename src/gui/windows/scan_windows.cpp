@@ -366,10 +366,6 @@ bool ChtScan1::PrintTo(QPrinter& printer) {
     QFont font(Q(fs.CFont));
     const int size = static_cast<int>(platform::Val(fs.CFontSize));
     font.setPointSize(size > 0 ? size : 8);
-    // The columns are laid out in characters: a font of even widths keeps them under their
-    // headings.
-    font.setStyleHint(QFont::TypeWriter);
-    font.setFixedPitch(true);
     const bool ok =
         PrintTextPages(printer, font, [this](int lines) { return m_form.Pages(lines); });
     m_status->clear();
