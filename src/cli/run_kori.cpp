@@ -38,6 +38,7 @@ int RunKori(int argc, const char* const* argv, std::ostream& out, std::ostream& 
     AddRepairCommand(app, ctx);
     AddCheckCommand(app, ctx);
     AddCheckNamesCommand(app, ctx);
+    AddBackupCommands(app, ctx);
     AddExportCommand(app, ctx);
 
     try {
