@@ -50,9 +50,10 @@ std::vector<MenuItem> BuildMenuTree() {
                          Item("nmIndCl", "&Industry Classifications", "IndClass"),
                          Item("mnuChartDefaults", "Chart De&faults List", "ChtDef"),
                          Item("mnuFundamtl", "&ASX Company Details", "Fundmnt")});
-    MenuItem backup = Top("mnuBackup", "Bac&kup / Restore",
-                          {Item("mnuBackupData", "&Backup Chart Data", "ChartBak"),
-                           Item("mnuRestoreData", "&Restore Data from Backup", "ChartBak Restore")});
+    MenuItem backup =
+        Top("mnuBackup", "Bac&kup / Restore",
+            {Item("mnuBackupData", "&Backup Chart Data", "ChartBak"),
+             Item("mnuRestoreData", "&Restore Data from Backup", "ChartBak Restore")});
     std::vector<MenuItem> tops;
     tops.push_back(
         Top("mnuFile", "&File",
