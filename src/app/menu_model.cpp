@@ -50,9 +50,10 @@ std::vector<MenuItem> BuildMenuTree() {
                          Item("nmIndCl", "&Industry Classifications", "IndClass"),
                          Item("mnuChartDefaults", "Chart De&faults List", "ChtDef"),
                          Item("mnuFundamtl", "&ASX Company Details", "Fundmnt")});
-    MenuItem backup = Top("mnuBackup", "Bac&kup / Restore",
-                          {Item("mnuBackupData", "&Backup Chart Data", "ChartBak"),
-                           Item("mnuRestoreData", "&Restore Data from Backup", "ChartBak Restore")});
+    MenuItem backup =
+        Top("mnuBackup", "Bac&kup / Restore",
+            {Item("mnuBackupData", "&Backup Chart Data", "ChartBak"),
+             Item("mnuRestoreData", "&Restore Data from Backup", "ChartBak Restore")});
     std::vector<MenuItem> tops;
     tops.push_back(
         Top("mnuFile", "&File",
@@ -118,6 +119,8 @@ void ApplyMenuConditions(std::vector<MenuItem>& tops, const MenuConditions& c) {
     if (auto* m = FindItem(tops, "mnuMveData")) m->enabled = c.DataService == 3;
     if (auto* m = FindItem(tops, "mnuFundamtl")) m->enabled = c.SecurityDetailsPresent;
     Show(tops, "mnuMaxScan", c.MaxScanPresent, c.MaxScanPresent);
+    // A companion program that is not installed has no item to fail from.
+    Show(tops, "mnuMMAScan", c.MMAScanPresent, c.MMAScanPresent);
 }
 
 void SetModalToolRunning(std::vector<MenuItem>& tops, bool running, const MenuConditions& c,

@@ -26,12 +26,13 @@ struct MenuConditions {
     bool HideDownloadProgram = false; // command-line word "A"
     bool SecurityDetailsPresent = false;
     bool MaxScanPresent = false;
+    bool MMAScanPresent = false; // the companion averages scan program is installed
 };
 
 // The whole tree as the program defines it, before any rule is applied.
 std::vector<MenuItem> BuildMenuTree();
 
-// Menus by data service, the security-details and Max-Scan items.
+// Menus by data service, the security-details item and the companion scan programs.
 void ApplyMenuConditions(std::vector<MenuItem>& tops, const MenuConditions& c);
 
 // While a tool that must not be interrupted runs, the tops are hidden.

@@ -20,6 +20,9 @@ ChtOptions::ChtOptions(const std::array<std::string, 10>& names, QWidget* parent
         auto* item = new QListWidgetItem(QString::fromStdString(names[i]), m_list);
         item->setData(Qt::UserRole, static_cast<int>(i) + 2);
     }
+    // The scans leave their finds in list Z, to be walked like any other list.
+    auto* scans = new QListWidgetItem(QStringLiteral("Chart List Z"), m_list);
+    scans->setData(Qt::UserRole, 12);
     m_list->setCurrentRow(0);
     layout->addWidget(m_list);
     auto* buttons = new QDialogButtonBox(QDialogButtonBox::Ok | QDialogButtonBox::Cancel, this);

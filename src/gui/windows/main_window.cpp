@@ -99,7 +99,8 @@ app::MenuConditions MainWindow::Conditions() const {
     c.DataService = m_session.download.DataService;
     c.HideDownloadProgram = m_hideDownloadProgram;
     const std::string sys = m_session.folders.SystemFolder;
-    c.MaxScanPresent = platform::FileExists(sys + "KoriMaxScan.exe");
+    c.MaxScanPresent = platform::FileExists(platform::ResolveIn(sys, "KoriMaxScan.exe"));
+    c.MMAScanPresent = platform::FileExists(platform::ResolveIn(sys, "KoriMMA.EXE"));
     c.SecurityDetailsPresent = false; // the company details window is not in this build
     return c;
 }

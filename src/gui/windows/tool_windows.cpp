@@ -6,8 +6,13 @@
 #include "gui/windows/dl_list.h"
 #include "gui/windows/main_window.h"
 #include "gui/windows/name_data.h"
+#include "gui/windows/scan_windows.h"
 #include "gui/windows/show_once.h"
+#include "gui/windows/stats_windows.h"
 #include "gui/windows/text_data.h"
+#include "platform/files.h"
+
+#include <QProcess>
 
 namespace kori::gui {
 
@@ -30,6 +35,43 @@ void Register(MainWindow& main, const char* opens, Extra... extra) {
     });
 }
 
+// The chart of a code, through the chart road of the main window.
+ShowChartOf ChartOf(MainWindow& main) {
+    return [&main](const std::string& code) {
+        if (auto* charts = main.findChild<ChartWindows*>()) charts->ShowCode(code);
+    };
+}
+
+// A scan window: one at a time, and not modal, so that its finds and their charts can be
+// looked at side by side.
+template <typename Window> void RegisterScan(MainWindow& main, const char* opens) {
+    main.SetAction(opens, [&main, opens] {
+        if (auto* open = main.findChild<QDialog*>(QString::fromLatin1(opens))) {
+            open->raise();
+            open->activateWindow();
+            return;
+        }
+        QDialog* w;
+        if constexpr (std::is_constructible_v<Window, app::Session&, QWidget*>)
+            w = new Window(main.session(), &main);
+        else
+            w = new Window(main.session(), ChartOf(main), &main);
+        w->setAttribute(Qt::WA_DeleteOnClose);
+        w->show();
+    });
+}
+
+// A companion scan program of the system folder, started on its own; the menu offers it only
+// when the program is there.
+void RegisterCompanion(MainWindow& main, const char* opens, const char* program) {
+    main.SetAction(opens, [&main, program] {
+        const auto path = platform::ResolveIn(main.session().folders.SystemFolder, program);
+        if (!QProcess::startDetached(QString::fromStdString(path.string()), {},
+                                     QString::fromStdString(main.session().folders.SystemFolder)))
+            main.session().dialogs().MsgBox("Cannot start " + path.string(), "Chart Scans");
+    });
+}
+
 } // namespace
 
 void RegisterToolWindows(MainWindow& main) {
@@ -37,6 +79,14 @@ void RegisterToolWindows(MainWindow& main) {
     Register<TextData>(main, "TextData");
     Register<TextFull>(main, "TextFull");
     Register<DLList>(main, "DLList");
+    RegisterScan<ChtScan1>(main, "chtScan1");
+    RegisterScan<ChtScan2>(main, "ChtScan2");
+    RegisterScan<ChtScan3>(main, "ChtScan3");
+    RegisterScan<ChtScan6>(main, "ChtScan6");
+    RegisterScan<Statistics>(main, "Statistics");
+    RegisterScan<ADTotals>(main, "ADTotals");
+    RegisterCompanion(main, "KoriMaxScan", "KoriMaxScan.exe");
+    RegisterCompanion(main, "KoriMMA", "KoriMMA.EXE");
     Register<ChartBak>(main, "ChartBak", false);
     Register<ChartBak>(main, "ChartBak Restore", true);
     // The name-file check asks first, as its menu item says.
