@@ -4,6 +4,7 @@
 #include "gui/windows/chk_dta.h"
 #include "gui/windows/dl_list.h"
 #include "gui/windows/main_window.h"
+#include "gui/windows/name_data.h"
 #include "gui/windows/show_once.h"
 #include "gui/windows/text_data.h"
 
@@ -35,6 +36,13 @@ void RegisterToolWindows(MainWindow& main) {
     Register<TextData>(main, "TextData");
     Register<TextFull>(main, "TextFull");
     Register<DLList>(main, "DLList");
+    // The name-file check asks first, as its menu item says.
+    main.SetAction("NameData", [&main] {
+        app::NameDataForm question(main.session());
+        if (!question.Ask()) return;
+        ShowOnce(main, "NameData",
+                 [&] { return new NameData(main.session(), main.progress(), &main); });
+    });
 }
 
 } // namespace kori::gui
