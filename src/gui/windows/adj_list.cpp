@@ -1,5 +1,6 @@
 #include "gui/windows/adj_list.h"
 
+#include "gui/services/qt_progress.h"
 #include "gui/windows/main_window.h"
 #include "gui/windows/show_once.h"
 
@@ -26,8 +27,8 @@ QString Q(std::string_view s) {
 
 } // namespace
 
-AdjList::AdjList(app::Session& session, MainWindow& main, QWidget* parent)
-    : QDialog(parent), m_session(session), m_main(main), m_form(session) {
+AdjList::AdjList(app::Session& session, QtProgress& progress, QWidget* parent)
+    : QDialog(parent), m_session(session), m_progress(progress), m_form(session) {
     setObjectName(QStringLiteral("AdjList"));
     setWindowTitle(Q(app::kAdjListCaption));
     auto* layout = new QVBoxLayout(this);
@@ -50,6 +51,7 @@ AdjList::AdjList(app::Session& session, MainWindow& main, QWidget* parent)
         QApplication::setOverrideCursor(Qt::WaitCursor);
         m_status->setText(Q(app::kSorting));
         m_form.Sort();
+        m_progress.Finish();
         Refill();
         QApplication::restoreOverrideCursor();
     });
@@ -147,6 +149,7 @@ void AdjList::MakeAdjustments() {
         m_status->setText(QStringLiteral("Row %1").arg(row + 1));
         QApplication::processEvents();
     });
+    m_progress.Finish();
     setEnabled(true);
     QApplication::restoreOverrideCursor();
     Refill();
@@ -224,7 +227,8 @@ void AdjOpts::Save() {
 
 void RegisterAdjListWindows(MainWindow& main) {
     main.SetAction("AdjList", [&main] {
-        ShowOnce(main, "AdjList", [&] { return new AdjList(main.session(), main, &main); });
+        ShowOnce(main, "AdjList",
+                 [&] { return new AdjList(main.session(), main.progress(), &main); });
     });
     main.SetAction("AdjOpts", [&main] {
         ShowOnce(main, "AdjOpts", [&] { return new AdjOpts(main.session(), &main); });

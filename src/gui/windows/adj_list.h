@@ -15,11 +15,12 @@ class QTableWidget;
 namespace kori::gui {
 
 class MainWindow;
+class QtProgress;
 
 class AdjList : public QDialog {
     Q_OBJECT
 public:
-    AdjList(app::Session& session, MainWindow& main, QWidget* parent = nullptr);
+    AdjList(app::Session& session, QtProgress& progress, QWidget* parent = nullptr);
 
     app::AdjustmentListForm& form() { return m_form; }
     QTableWidget* grid() const { return m_grid; }
@@ -42,7 +43,7 @@ private:
     void CellEdited(int row, int column);
 
     app::Session& m_session;
-    MainWindow& m_main;
+    QtProgress& m_progress;
     app::AdjustmentListForm m_form;
     QMenuBar* m_menus;
     QLabel* m_label;
