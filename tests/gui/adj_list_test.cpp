@@ -13,6 +13,7 @@
 #include <QCheckBox>
 #include <QLabel>
 #include <QMenuBar>
+#include <QPrinter>
 #include <QTableWidget>
 #include <gtest/gtest.h>
 
@@ -59,8 +60,9 @@ TEST_F(AdjListWindow, TheMenuOpensItWithItsCaptionHeadingsAndLabel) {
     EXPECT_EQ(w->grid()->horizontalHeaderItem(0)->text(), "Act");
     EXPECT_EQ(w->grid()->horizontalHeaderItem(4)->text(), "ADJ");
     EXPECT_EQ(w->grid()->horizontalHeaderItem(5)->text(), "Name");
-    for (const char* item : {"alSave", "alExit", "alSort", "alSetY", "alSetN", "alSetD", "rmOPTS",
-                             "rmWNT", "alDelRow", "alopt", "alDisplay", "muAdj", "muRemAdj"})
+    for (const char* item :
+         {"alSave", "alPage", "alPrint", "alExit", "alSort", "alSetY", "alSetN", "alSetD", "rmOPTS",
+          "rmWNT", "alDelRow", "alopt", "alDisplay", "muAdj", "muRemAdj"})
         EXPECT_NE(w->findChild<QAction*>(QString::fromLatin1(item)), nullptr) << item;
     // A second pick brings the same window forward.
     EXPECT_EQ(Open(), w);
@@ -141,6 +143,28 @@ TEST_F(AdjListWindow, OptionsAreSavedInTheirSection) {
     EXPECT_EQ(s.session.ini().Read("Adjustments", "Divs"), "3");
     EXPECT_EQ(s.session.adjustments.Divs, 3);
     EXPECT_TRUE(s.session.adjustments.NoShortNames);
+}
+
+TEST_F(AdjListWindow, TheListPrintsAPageForEachScreenfulOfLines) {
+    std::string list;
+    for (int i = 0; i < 200; ++i)
+        list += "EN,C" + std::to_string(i) + ",20NOV26,0,N\r\n";
+    WriteList(list);
+    auto* w = Open();
+    ASSERT_NE(w, nullptr);
+    const auto pdf = s.root.path() / "list.pdf";
+    QPrinter printer(QPrinter::HighResolution);
+    printer.setOutputFormat(QPrinter::PdfFormat);
+    printer.setOutputFileName(QString::fromStdString(pdf.string()));
+    ASSERT_TRUE(w->PrintTo(printer));
+    const auto bytes = platform::ReadWholeFile(pdf).value_or("");
+    EXPECT_TRUE(bytes.starts_with("%PDF"));
+    // 202 lines do not fit one page.
+    std::size_t pages = 0;
+    for (auto at = bytes.find("/Type /Page\n"); at != std::string::npos;
+         at = bytes.find("/Type /Page\n", at + 1))
+        ++pages;
+    EXPECT_GE(pages, 2u);
 }
 
 } // namespace

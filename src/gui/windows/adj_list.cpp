@@ -13,6 +13,9 @@
 #include <QLabel>
 #include <QMenu>
 #include <QMenuBar>
+#include <QPageSetupDialog>
+#include <QPainter>
+#include <QPrintDialog>
 #include <QRadioButton>
 #include <QTableWidget>
 #include <QVBoxLayout>
@@ -44,6 +47,12 @@ AdjList::AdjList(app::Session& session, QtProgress& progress, QWidget* parent)
     auto* file = m_menus->addMenu(QStringLiteral("&File"));
     add(file, "alSave", "&Save", [this] {
         if (auto st = m_form.Save(); !st) m_session.dialogs().MsgBox(st.message(), "Save");
+    });
+    add(file, "alPage", "Pa&ge Setup", [this] { QPageSetupDialog(&m_printer, this).exec(); });
+    add(file, "alPrint", "&Print", [this] {
+        QPrintDialog dialog(&m_printer, this);
+        if (dialog.exec() == QDialog::Accepted && !PrintTo(m_printer))
+            m_session.dialogs().MsgBox("The printer could not be started", "Print");
     });
     add(file, "alExit", "E&xit", [this] { close(); });
     auto* edit = m_menus->addMenu(QStringLiteral("&Edit"));
@@ -158,6 +167,28 @@ void AdjList::MakeAdjustments() {
         shown += m + "\n";
     m_status->setText(Q(shown.empty() ? std::string("No adjustments were made") : shown));
     if (!st) m_session.dialogs().MsgBox(st.message(), app::kAdjListCaption);
+}
+
+bool AdjList::PrintTo(QPrinter& printer) {
+    QPainter painter;
+    if (!painter.begin(&printer)) return false;
+    painter.setFont(QFont(QStringLiteral("Courier New"), 9));
+    const int line = painter.fontMetrics().lineSpacing();
+    const QRect page = painter.viewport();
+    int y = line;
+    auto put = [&](const QString& text) {
+        if (y + line > page.height()) {
+            printer.newPage();
+            y = line;
+        }
+        painter.drawText(0, y, text);
+        y += line;
+    };
+    put(Q(app::kAdjListCaption));
+    put(QString());
+    for (const auto& item : m_form.items())
+        put(Q(item.Line()));
+    return painter.end();
 }
 
 void AdjList::RemoveMarkedD() {

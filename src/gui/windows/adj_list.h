@@ -5,6 +5,7 @@
 #include "app/adjustment_list_form.h"
 
 #include <QDialog>
+#include <QPrinter>
 
 class QButtonGroup;
 class QCheckBox;
@@ -32,6 +33,9 @@ public:
     void MakeAdjustments();
     void RemoveMarkedD();
     void DeleteRows();
+    // The list as text lines, a page at a time, headed by the caption. False when the printer
+    // could not start.
+    bool PrintTo(QPrinter& printer);
     // The list again from the form.
     void Refill();
 
@@ -44,6 +48,7 @@ private:
 
     app::Session& m_session;
     QtProgress& m_progress;
+    QPrinter m_printer{QPrinter::HighResolution};
     app::AdjustmentListForm m_form;
     QMenuBar* m_menus;
     QLabel* m_label;
