@@ -2,6 +2,7 @@
 #include "desktop_fixture.h"
 
 #include "gui/widgets/grid_view.h"
+#include "gui/windows/chart_bak.h"
 #include "gui/windows/chk_dta.h"
 #include "gui/windows/dl_list.h"
 #include "gui/windows/name_data.h"
@@ -207,6 +208,36 @@ TEST_F(DesktopTest, NameFileCheckAsksFirstThenMendsTheNameFile) {
     platform::Status status;
     EXPECT_TRUE(store::FindCode(folder, "ORPHAN", status).has_value());
     EXPECT_FALSE(store::FindCode(folder, "QRY", status).has_value());
+}
+
+TEST_F(DesktopTest, BackupThenRestoreFromTheirMenuItems) {
+    ASSERT_TRUE(main.Trigger("mnuBackupData"));
+    QApplication::processEvents();
+    auto* backup = main.findChild<gui::ChartBak*>(QStringLiteral("ChartBak"));
+    ASSERT_NE(backup, nullptr);
+    EXPECT_EQ(backup->windowTitle().toStdString(), "Backup Chart Data");
+    backup->Backup();
+    EXPECT_NE(backup->status()->text().toStdString().find("backed up to"), std::string::npos)
+        << backup->status()->text().toStdString();
+
+    const std::string krm = s.session.folders.DataFolder + "KRM.WDT";
+    const auto original = platform::ReadWholeFile(krm);
+    ASSERT_TRUE(platform::WriteFileAtomic(krm, "damaged").ok());
+
+    ASSERT_TRUE(main.Trigger("mnuRestoreData"));
+    QApplication::processEvents();
+    auto* restore = main.findChild<gui::ChartBak*>(QStringLiteral("ChartBak Restore"));
+    ASSERT_NE(restore, nullptr);
+    ASSERT_EQ(restore->list()->count(), 1);
+    restore->Verify();
+    EXPECT_NE(restore->status()->text().toStdString().find("is whole"), std::string::npos);
+    s.dialogs.QueueAnswer(platform::Answer::Yes);
+    restore->Restore();
+    EXPECT_EQ(platform::ReadWholeFile(krm), original);
+    ASSERT_FALSE(restore->form().Replaced().empty());
+    s.dialogs.QueueAnswer(platform::Answer::Yes);
+    restore->Discard();
+    EXPECT_TRUE(restore->form().Replaced().empty());
 }
 
 } // namespace

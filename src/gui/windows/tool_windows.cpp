@@ -1,5 +1,6 @@
 #include "gui/windows/tool_windows.h"
 
+#include "gui/windows/chart_bak.h"
 #include "gui/windows/chart_windows.h"
 #include "gui/windows/chk_dta.h"
 #include "gui/windows/dl_list.h"
@@ -36,6 +37,8 @@ void RegisterToolWindows(MainWindow& main) {
     Register<TextData>(main, "TextData");
     Register<TextFull>(main, "TextFull");
     Register<DLList>(main, "DLList");
+    Register<ChartBak>(main, "ChartBak", false);
+    Register<ChartBak>(main, "ChartBak Restore", true);
     // The name-file check asks first, as its menu item says.
     main.SetAction("NameData", [&main] {
         app::NameDataForm question(main.session());
