@@ -1,9 +1,11 @@
 // A manual adjustment and its removal on a 30,000-record history in the page cache, rewrite
 // included, beside the floor: reading and rewriting the same file with nothing else.
 #include "adjust/adjustment.h"
+#include "adjust/adjustment_list.h"
 #include "adjust/bulletin_filter.h"
 #include "bench_history.h"
 #include "platform/files.h"
+#include "synthetic_market.h"
 
 #include <benchmark/benchmark.h>
 
@@ -128,6 +130,60 @@ void BM_FilterBulletin(benchmark::State& state) {
     state.SetBytesProcessed(state.iterations() * static_cast<long long>(bulletin.size()));
 }
 BENCHMARK(BM_FilterBulletin)->Unit(benchmark::kMillisecond);
+
+// 500 bonus issues, splits and dividends over a 3000-security library of 1000 days each, every
+// history rewritten through the write gate; the histories are put back outside the timing.
+void BM_MakeAdjustments(benchmark::State& state) {
+    const bench::MarketShape shape{3000, 1000};
+    const std::string folder = bench::MakeSyntheticMarket(
+        std::filesystem::temp_directory_path() / "kori-bench-market-3000x1000", shape);
+    const auto dates = bench::SyntheticWeekdays(shape.LastDate, shape.Records);
+    const std::string stem = dates[800];
+    std::vector<adjust::ListItem> list;
+    std::vector<std::pair<std::filesystem::path, std::string>> saved;
+    for (int i = 0; i < 500; ++i) {
+        const std::string code = bench::SyntheticCode(i * 6);
+        const std::string line = i % 3 == 0   ? "BI," + code + ",X,0,Y," + stem + ",1,4"
+                                 : i % 3 == 1 ? "SP," + code + ",X,0,Y," + stem + ",-1,2"
+                                              : "DI," + code + ",X,0,Y," + stem + ",,,0.1";
+        list.push_back(adjust::ParseListLine(line));
+        const auto path = std::filesystem::path(folder) / (code + ".WDT");
+        saved.emplace_back(path, platform::ReadWholeFile(path).value_or(""));
+    }
+    adjust::MakeSettings settings;
+    settings.DataFolder = folder;
+    settings.Today = shape.LastDate;
+    platform::NullProgress progress;
+    for (auto _ : state) {
+        auto items = list;
+        adjust::MakeReport report;
+        if (auto s = adjust::MakeAdjustments(settings, items, progress, report);
+            !s || report.Messages.size() < 490)
+            state.SkipWithError("not every item was carried out");
+        state.PauseTiming();
+        for (const auto& [path, bytes] : saved)
+            std::ofstream(path, std::ios::binary | std::ios::trunc)
+                .write(bytes.data(), static_cast<std::streamsize>(bytes.size()));
+        state.ResumeTiming();
+    }
+}
+BENCHMARK(BM_MakeAdjustments)->Unit(benchmark::kMillisecond)->Iterations(3);
+
+// Its floor: the same 500 histories read whole and written back through the same gate.
+void BM_MakeAdjustmentsFloor(benchmark::State& state) {
+    const bench::MarketShape shape{3000, 1000};
+    const std::string folder = bench::MakeSyntheticMarket(
+        std::filesystem::temp_directory_path() / "kori-bench-market-3000x1000", shape);
+    for (auto _ : state)
+        for (int i = 0; i < 500; ++i) {
+            const auto path =
+                std::filesystem::path(folder) / (bench::SyntheticCode(i * 6) + ".WDT");
+            auto bytes = platform::ReadWholeFile(path);
+            if (!bytes || !platform::WriteFileAtomic(path, *bytes, {"Temp.Wk1", ""}).ok())
+                state.SkipWithError("failed");
+        }
+}
+BENCHMARK(BM_MakeAdjustmentsFloor)->Unit(benchmark::kMillisecond)->Iterations(3);
 
 } // namespace
 

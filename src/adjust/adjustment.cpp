@@ -62,21 +62,17 @@ Status WouldNotFit(const History& h, int record) {
                          " would not fit its fields after the adjustment: nothing was changed");
 }
 
-// A price times a factor, in the width of the file's floats, to four decimals, halves to even.
-std::optional<float> ScaledPrice(float price, float factor) {
-    const float product = price * factor;
-    const auto money = Money::FromDouble(product);
-    if (!money) return std::nullopt;
-    return money->ToFloat();
-}
-
-// Multiplies the four prices of a record; false when one does not fit.
+// Multiplies the four prices of a record, each in the width of the file's floats to four
+// decimals, halves to even; false when one does not fit.
 bool ScalePrices(char* rec, float factor) {
+    // The optional-free conversion: this runs for every price of a history of 30,000 records.
     float scaled[4];
     for (std::size_t i = 0; i < 4; ++i) {
-        const auto p = ScaledPrice(codec::Get<float>(rec + kPrices[i]), factor);
-        if (!p || !std::isfinite(*p)) return false;
-        scaled[i] = *p;
+        const float product = codec::Get<float>(rec + kPrices[i]) * factor;
+        Money money;
+        if (!Money::TryFromDouble(product, money)) return false;
+        scaled[i] = money.ToFloat();
+        if (!std::isfinite(scaled[i])) return false;
     }
     for (std::size_t i = 0; i < 4; ++i)
         codec::Put(rec + kPrices[i], scaled[i]);

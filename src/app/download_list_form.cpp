@@ -1,5 +1,7 @@
 #include "app/download_list_form.h"
 
+#include "app/adjustment_list_form.h"
+
 #include "app/target_alerts.h"
 #include "intake/download_list.h"
 #include "platform/files.h"
@@ -36,7 +38,7 @@ intake::RunResult DownloadListForm::Run(const std::string& item, bool more) {
     auto settings = UpdateSettingsOf(m_session);
     const intake::UpdateHost host{m_session.dialogs(), m_session.services().progress,
                                   &m_session.services().settings, &m_session.ini()};
-    const intake::UpdateHooks hooks; // the adjustment list and security details plug in here
+    const auto hooks = AdjustmentHooks(m_session, m_listHasNewItems);
     const std::string today = m_session.services().clock.Today();
     return intake::RunDownloadUpdate(settings, host, hooks, item,
                                      intake::UpdateDateFromItem(item, today), more);

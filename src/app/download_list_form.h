@@ -20,6 +20,8 @@ public:
     void Build();
     const std::vector<std::string>& items() const { return m_items; }
     bool running() const { return m_running; }
+    // An update of this window added items to the maintenance list.
+    bool listHasNewItems() const { return m_listHasNewItems; }
 
     // "Update 1 Day": the item at `index`, no more files following.
     intake::RunResult UpdateOne(int index);
@@ -40,6 +42,7 @@ private:
     Session& m_session;
     std::vector<std::string> m_items;
     bool m_running = false;
+    bool m_listHasNewItems = false;
 };
 
 } // namespace kori::app

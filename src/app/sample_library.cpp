@@ -403,6 +403,16 @@ platform::Status LastRecord(const std::string& folder, const std::string& code,
     return pf.Read(pf.Count(), last);
 }
 
+// The waiting day's bulletin has capital issues in it: the day's prices already trade on the
+// new basis (a bonus of 1 for 4, a consolidation of 1 for 2, an 85-cent dividend), so that the
+// adjusted histories run on without a step.
+store::PriceRecord OnNewBasis(const std::string& code, store::PriceRecord last) {
+    if (code == "KRM") last.Close *= 0.8f;
+    if (code == "PNS") last.Close *= 2.0f;
+    if (code == "HBK" && last.Close > 0.85f) last.Close -= 0.85f;
+    return last;
+}
+
 platform::Status WriteDayFile(const std::string& folder, const std::string& name,
                               const std::string& text, std::vector<std::string>& made) {
     made.push_back(name);
@@ -438,7 +448,14 @@ platform::Status MakeSampleDayFiles(const std::string& dataFolder,
         if (code == "OCR") continue; // did not trade: the update gives it a filler
         // The service corrects Friday's volume of KRM on Monday's line.
         const double spare = code == "KRM" ? static_cast<double>(last.Volume) + 125000 : 0;
-        next += DayLine(code, kNextDate, last, move, volume, spare);
+        if (code == "CSW") {
+            // CPR's holders now trade as CSW: the new code's first day follows CPR's last.
+            store::PriceRecord cpr;
+            if (auto st = LastRecord(dataFolder, "CPR", cpr); !st) return st;
+            next += DayLine(code, kNextDate, cpr, 1.0, volume, spare);
+        } else {
+            next += DayLine(code, kNextDate, OnNewBasis(code, last), move, volume, spare);
+        }
         if (code == "KRM" || code == "ALX" || code == "BWG")
             replace += DayLine(code, kLastDate, last, 1.0, last.Volume + 1000);
         if (code == "KRM" || code == "ALX" || code == "CPR")
@@ -547,10 +564,16 @@ platform::Status MakeSampleBundle(const std::string& rootFolder, const std::stri
         if (code == "ADVDEC" || code == "XAO" || code == "XJO" || code == "OCR") continue;
         store::PriceRecord last;
         if (auto st = LastRecord(dataFolder, code, last); !st) return st;
-        dsu += DayLine(code, kNextDate, last, 1 + 0.02 * move.Normal() * s.volatility,
+        store::PriceRecord base = OnNewBasis(code, last);
+        if (code == "CSW")
+            if (auto st = LastRecord(dataFolder, "CPR", base); !st) return st;
+        const double drawn = 1 + 0.02 * move.Normal() * s.volatility;
+        const double step = code == "CSW" ? 1.0 : drawn;
+        dsu += DayLine(code, kNextDate, base, step,
                        static_cast<std::int32_t>(s.volume * (0.6 + move.Uniform())));
     }
     dsu += "KRMWOE," + std::string(kNextDate) + ",0.1,0.11,0.09,0.1,50000,0\r\n";
+    dsu += "NEWCO," + std::string(kNextDate) + ",0.5,0.52,0.48,0.51,250000,0\r\n";
     const std::string stem = "23NOV26";
     for (const auto& [ext, text] :
          std::vector<std::pair<std::string, std::string>>{{".d", "23NOV26 bundle\r\n"},
@@ -562,6 +585,30 @@ platform::Status MakeSampleBundle(const std::string& rootFolder, const std::stri
         if (auto st = WriteDayFile(downloadFolder, stem + ext, text, made); !st) return st;
     }
     return platform::Status::Ok();
+}
+
+platform::Status MakeSampleBulletins(const std::string& dataFolder, const std::string& inFolder) {
+    if (!platform::CreateFolderPath(inFolder))
+        return platform::Status::Error("Cannot create " + inFolder);
+    store::PriceRecord bwg;
+    if (auto st = LastRecord(dataFolder, "BWG", bwg); !st) return st;
+    // The service corrects the high and the volume of BWG's last day, in cents.
+    const std::string high = std::to_string(static_cast<int>(std::ceil(bwg.High * 100)) + 1);
+    const std::string asx = "NI,NEWCO,ASX.STK,0,Y,NEWCO MINING,ORD\r\n"
+                            "NL,NEWCO,ASX.STK,0,N,NEWCASTLE EXPLORATION LIMITED ORD,ORD\r\n"
+                            "NC,CPR,ASX.STK,0,Y,23NOV26,CSW\r\n"
+                            "DC,HLT,ASX.STK,0,N,23NOV26\r\n"
+                            "BI,KRM,ASX.STK,0,Y,23NOV26,1,4\r\n"
+                            "SP,PNS,ASX.STK,0,Y,23NOV26,-1,2\r\n"
+                            "DI,HBK,ASX.STK,0,N,23NOV26,,,85\r\n"
+                            "PC,BWG,ASX.STK,0,Y,20261120,H:" +
+                            high + " V:" + std::to_string(bwg.Volume + 50000) +
+                            "\r\n"
+                            // Lines the filter drops: a warrant without a price file and an option
+                            // series with no options library.
+                            "BI,DLTWOZ,ASX.STK,0,Y,23NOV26,1,1\r\n"
+                            "NI,KRMLZ6,ASX.OPT,0,Y,KAROO DEC PUT\r\n";
+    return platform::WriteFileAtomic(platform::ResolveIn(inFolder, "23NOV26.Asx.Btn"), asx);
 }
 
 } // namespace kori::app

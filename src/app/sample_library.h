@@ -39,4 +39,10 @@ platform::Status MakeSampleBundle(const std::string& rootFolder, const std::stri
                                   std::array<std::string, 8>& segmentFolders,
                                   std::vector<std::string>& made);
 
+// The maintenance bulletin of the waiting day (23NOV26.Asx.Btn) in `inFolder`: a listing, a
+// code change onto a code with data, a delisting, a bonus issue, a consolidation, a dividend, a
+// price correction, and a warrant and an option line the filter drops. The day files' prices
+// for those securities already follow the issues.
+platform::Status MakeSampleBulletins(const std::string& dataFolder, const std::string& inFolder);
+
 } // namespace kori::app

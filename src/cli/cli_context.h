@@ -66,6 +66,7 @@ void AddImportCommand(CLI::App& app, CliContext& ctx);
 // scan1, scan2, scan3, scan6, stats, adtotals.
 void AddScanCommands(CLI::App& app, CliContext& ctx);
 void AddAdjustCommand(CLI::App& app, CliContext& ctx);
+void AddAdjListCommand(CLI::App& app, CliContext& ctx);
 void AddDataCommand(CLI::App& app, CliContext& ctx);
 void AddRepairCommand(CLI::App& app, CliContext& ctx);
 void AddCheckCommand(CLI::App& app, CliContext& ctx);

@@ -84,6 +84,20 @@ std::string BuildRoot(app::Session& session, bool sample, int service) {
         if (!st) throw CliError{st.message()};
         (void)session.ini().Write("Download", "InternetDLfmt", "DDMMMYY.D");
     }
+    // The download program's folders with the day's maintenance bulletin, and dividends taken
+    // into the list marked to run.
+    const std::string in = f.SystemFolder + "dlin/", out = f.SystemFolder + "dlout/";
+    if (!platform::CreateFolderPath(out)) throw CliError{"Cannot create " + out};
+    if (st = app::MakeSampleBulletins(f.DataFolder, in); !st) throw CliError{st.message()};
+    {
+        platform::IniFile::Batch once(session.ini());
+        (void)session.ini().Write("Download", "In", in);
+        (void)session.ini().Write("Download", "Out", out);
+        (void)session.ini().Write("Adjustments", "Divs", "2");
+    }
+    session.download.In = in;
+    session.download.Out = out;
+    session.adjustments.Divs = 2;
     // The sample's charts keep their volume bars inside the volume panel.
     auto defaults = chart::LoadChartDefaults(session.ini());
     defaults.LimitVolumeHeight = true;

@@ -34,6 +34,7 @@ int RunKori(int argc, const char* const* argv, std::ostream& out, std::ostream& 
     AddImportCommand(app, ctx);
     AddScanCommands(app, ctx);
     AddAdjustCommand(app, ctx);
+    AddAdjListCommand(app, ctx);
     AddDataCommand(app, ctx);
     AddRepairCommand(app, ctx);
     AddCheckCommand(app, ctx);

@@ -2,6 +2,8 @@
 // window does it, with the questions answered from the command line.
 #include "cli/cli_context.h"
 
+#include "adjust/adjustment_list.h"
+#include "app/adjustment_list_form.h"
 #include "app/download_list_form.h"
 #include "cli/json_out.h"
 
@@ -109,7 +111,8 @@ void AddUpdateCommand(CLI::App& app, CliContext& ctx) {
         const auto chosen = Chosen(waiting, *o, settings.DownloadFolder);
         intake::UpdateHost host{dialogs, session.services().progress, &session.services().settings,
                                 &session.ini()};
-        const intake::UpdateHooks hooks; // nothing else is refreshed from the command line
+        bool listHasNewItems = false;
+        const auto hooks = app::AdjustmentHooks(session, listHasNewItems);
         const std::string today = session.services().clock.Today();
 
         json files = json::array();
@@ -151,7 +154,13 @@ void AddUpdateCommand(CLI::App& app, CliContext& ctx) {
                 if (!o->json) ctx.out << a << "\n";
             }
         }
-        if (o->json) ctx.out << json{{"files", files}, {"alerts", alerts}}.dump() << "\n";
+        if (listHasNewItems && !o->json) ctx.out << adjust::kItemsAdded << "\n";
+        if (o->json)
+            ctx.out << json{{"files", files},
+                            {"alerts", alerts},
+                            {"adjustment_list_grew", listHasNewItems}}
+                           .dump()
+                    << "\n";
         if (failed) throw CliError{"the update stopped; the files above are whole", 1};
         if (cancelled)
             throw CliError{o->yes ? "a file was not updated and stays waiting"

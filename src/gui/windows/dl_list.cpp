@@ -1,6 +1,8 @@
 #include "gui/windows/dl_list.h"
 
+#include "app/adjustment_list_form.h"
 #include "gui/services/qt_progress.h"
+#include "gui/windows/main_window.h"
 
 #include <QHBoxLayout>
 #include <QLabel>
@@ -11,7 +13,7 @@
 namespace kori::gui {
 
 DLList::DLList(app::Session& session, QtProgress& progress, QWidget* parent)
-    : QDialog(parent), m_progress(progress), m_form(session) {
+    : QDialog(parent), m_session(session), m_progress(progress), m_form(session) {
     setObjectName(QStringLiteral("DLList"));
     setWindowTitle(QStringLiteral("Update with Downloaded Data "));
     auto* layout = new QVBoxLayout(this);
@@ -81,6 +83,13 @@ void DLList::UpdateAll() {
 
 void DLList::RemoveDate() {
     if (m_form.RemoveDate(m_list->currentRow())) Refill();
+}
+
+void DLList::done(int result) {
+    const bool openList = app::TellItemsAdded(m_session, m_form.listHasNewItems());
+    auto* main = qobject_cast<MainWindow*>(parentWidget());
+    QDialog::done(result);
+    if (openList && main) main->Open("AdjList");
 }
 
 } // namespace kori::gui

@@ -24,11 +24,14 @@ public:
     void UpdateOneDay();
     void UpdateAll();
     void RemoveDate();
+    // Closing after an update that added maintenance items tells so and opens the list.
+    void done(int result) override;
 
 private:
     void Running(bool on);
     void Refill();
 
+    app::Session& m_session;
     QtProgress& m_progress;
     app::DownloadListForm m_form;
     QListWidget* m_list;

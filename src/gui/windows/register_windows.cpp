@@ -1,5 +1,6 @@
 #include "gui/windows/register_windows.h"
 
+#include "gui/windows/adj_list.h"
 #include "gui/windows/adjust_windows.h"
 #include "gui/windows/chart_windows.h"
 #include "gui/windows/entry_windows.h"
@@ -18,6 +19,7 @@ void RegisterWindows(MainWindow& main) {
     RegisterListWindows(main);
     RegisterMaintWindows(main);
     RegisterAdjustWindows(main);
+    RegisterAdjListWindows(main);
     RegisterToolWindows(main);
     RegisterEntryWindows(main);
     main.RebuildMenus();
