@@ -3,6 +3,7 @@
 #include "gui/windows/chart_windows.h"
 #include "gui/windows/chk_dta.h"
 #include "gui/windows/dl_list.h"
+#include "gui/windows/download_settings.h"
 #include "gui/windows/main_window.h"
 #include "gui/windows/show_once.h"
 #include "gui/windows/text_data.h"
@@ -34,7 +35,22 @@ void RegisterToolWindows(MainWindow& main) {
     Register<ChkDta>(main, "ChkDta", ChartsOf(main));
     Register<TextData>(main, "TextData");
     Register<TextFull>(main, "TextFull");
-    Register<DLList>(main, "DLList");
+    main.SetAction("ModDetails", [&main] {
+        ShowOnce(main, "ModDetails", [&main] { return new ModDetails(main.session(), &main); });
+    });
+    main.SetAction("DLList", [&main] {
+        switch (app::WhatDownloadUpdateOpens(main.session())) {
+        case app::DownloadUpdateOpens::List:
+            ShowOnce(main, "DLList",
+                     [&main] { return new DLList(main.session(), main.progress(), &main); });
+            break;
+        case app::DownloadUpdateOpens::Settings:
+            main.Trigger("mnuDDetails");
+            break;
+        case app::DownloadUpdateOpens::Nothing:
+            break;
+        }
+    });
 }
 
 } // namespace kori::gui
