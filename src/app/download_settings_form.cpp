@@ -120,25 +120,30 @@ const std::array<std::string_view, kDataTypeCount>& DownloadWizardForm::Labels()
     return labels;
 }
 
-namespace {
-// Labels are in the order of the segment folders; the list's own order puts futures third and
-// overseas fourth, as Labels() does.
-} // namespace
+std::size_t DownloadWizardForm::FolderOf(int row) {
+    // The window lists overseas before futures; the data-folder list has them the other way.
+    static constexpr std::array<std::size_t, kDataTypeCount> folders = {0, 1, 3, 2, 4, 5, 6, 7};
+    return folders.at(static_cast<std::size_t>(row));
+}
 
 DownloadWizardForm::DownloadWizardForm(Session& session) : m_session(session) {
-    if (const auto paths = ReadChartPathsFile(session.folders.SystemFolder + "ChtPaths.lst"))
-        m_folders = *paths;
-    for (std::size_t i = 0; i < m_folders.size(); ++i)
-        m_received[i] = !Trim(m_folders[i]).empty();
+    const auto paths = ReadChartPathsFile(session.folders.SystemFolder + "ChtPaths.lst");
+    for (int row = 0; row < kDataTypeCount; ++row) {
+        const auto at = static_cast<std::size_t>(row);
+        if (paths) m_folders[at] = (*paths)[FolderOf(row)];
+        m_received[at] = !Trim(m_folders[at]).empty();
+    }
 }
 
 bool DownloadWizardForm::Save() {
     ChartDataPaths paths;
-    for (std::size_t i = 0; i < paths.size(); ++i) {
-        if (!m_received[i]) continue;
-        paths[i] = Trim(m_folders[i]);
-        if (paths[i].empty()) {
-            m_session.dialogs().MsgBox("Enter the folder for " + std::string(Labels()[i]), kTitle,
+    for (int row = 0; row < kDataTypeCount; ++row) {
+        const auto at = static_cast<std::size_t>(row);
+        if (!m_received[at]) continue;
+        std::string& path = paths[FolderOf(row)];
+        path = Trim(m_folders[at]);
+        if (path.empty()) {
+            m_session.dialogs().MsgBox("Enter the folder for " + std::string(Labels()[at]), kTitle,
                                        Buttons::Ok, Icon::Exclamation);
             return false;
         }

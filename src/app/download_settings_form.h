@@ -60,8 +60,10 @@ public:
 
     explicit DownloadWizardForm(Session& session);
 
-    // The segment labels, in the order of the data-folder list.
+    // The segment labels, one a row of the window.
     static const std::array<std::string_view, kDataTypeCount>& Labels();
+    // The place in the data-folder list of the folder of a row.
+    static std::size_t FolderOf(int row);
 
     bool received(int i) const { return m_received.at(static_cast<std::size_t>(i)); }
     const std::string& folder(int i) const { return m_folders.at(static_cast<std::size_t>(i)); }
@@ -77,8 +79,8 @@ public:
 
 private:
     Session& m_session;
-    std::array<bool, kDataTypeCount> m_received{};
-    ChartDataPaths m_folders;
+    std::array<bool, kDataTypeCount> m_received{}; // by row
+    ChartDataPaths m_folders;                      // by row
 };
 
 class UpdateListForm {

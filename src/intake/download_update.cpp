@@ -1,5 +1,7 @@
 #include "intake/download_update.h"
 
+#include "intake/download_list.h"
+
 #include "platform/date_text.h"
 #include "platform/files.h"
 #include "platform/text.h"
@@ -115,7 +117,7 @@ std::optional<std::int32_t> ShortDateSerial(std::string_view text) {
     const int day = static_cast<int>(Val(t.substr(0, first)));
     const int month = static_cast<int>(Val(t.substr(first + 1, second - first - 1)));
     int year = static_cast<int>(Val(t.substr(second + 1)));
-    if (year < 100) year += year < 30 ? 2000 : 1900;
+    if (year < 100) year = ShortDateYear(year);
     return platform::DaySerial(platform::DateText({year, month, day}));
 }
 

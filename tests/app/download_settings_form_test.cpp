@@ -101,30 +101,40 @@ TEST_F(DownloadSettingsTest, ModDetailsSaveChecksTheFolderAndDivisorAndWritesThe
 }
 
 TEST_F(DownloadSettingsTest, WizardTicksTheSegmentsWithAFolderAndSavesTheTickedOnes) {
+    // Folders that exist, so saving asks to create only the new one.
+    const std::string stk = root.folder() + "stk/", sfe = root.folder() + "sfe/",
+                      opt = root.folder() + "opt/";
+    for (const auto& f : {stk, sfe, opt})
+        ASSERT_TRUE(platform::CreateFolder(f));
     ChartDataPaths paths;
-    paths[0] = "/m/stk/";
-    paths[4] = "/m/opt/";
+    paths[0] = stk;
+    paths[2] = sfe; // futures: the window's fourth row
+    paths[4] = opt;
     ASSERT_TRUE(WriteChartPathsFile(session.folders.SystemFolder + "ChtPaths.lst", paths));
     DownloadWizardForm f(session);
     EXPECT_TRUE(f.received(0));
     EXPECT_FALSE(f.received(1));
+    EXPECT_FALSE(f.received(2));
+    EXPECT_TRUE(f.received(3));
+    EXPECT_EQ(f.folder(3), sfe);
     EXPECT_TRUE(f.received(4));
-    EXPECT_EQ(f.folder(4), "/m/opt/");
+    EXPECT_EQ(f.folder(4), opt);
 
     f.SetReceived(4, false); // its folder goes from the list
     f.SetReceived(2, true);
     EXPECT_FALSE(f.Save());
     EXPECT_EQ(dialogs.messages().back(), "Enter the folder for Overseas Indices etc.");
     f.SetFolder(2, (root.path() / "fut").string());
-    dialogs.QueueAnswer(Answer::Yes); // create the missing folders
-    dialogs.QueueAnswer(Answer::Yes);
+    dialogs.QueueAnswer(Answer::Yes); // create the missing folder
     ASSERT_TRUE(f.Save());
     const auto saved = ReadChartPathsFile(session.folders.SystemFolder + "ChtPaths.lst");
     ASSERT_TRUE(saved);
-    EXPECT_EQ((*saved)[0], "/m/stk/");
-    EXPECT_EQ((*saved)[2], root.folder() + "fut/");
+    EXPECT_EQ((*saved)[0], stk);
+    EXPECT_EQ((*saved)[2], sfe);
+    EXPECT_EQ((*saved)[3], root.folder() + "fut/") << "overseas, the fourth line of the list";
     EXPECT_EQ((*saved)[4], "");
     EXPECT_TRUE(platform::FileExists(root.path() / "fut"));
+    EXPECT_EQ(dialogs.shown().back().title, "Create Directory");
 }
 
 TEST_F(DownloadSettingsTest, UpdateListLoadsTheListAndTheOptionAndChecksCells) {
