@@ -8,8 +8,10 @@
 #include <cstring>
 #include <fcntl.h>
 #include <fstream>
+#include <linux/fs.h>
 #include <optional>
 #include <sstream>
+#include <sys/ioctl.h>
 #include <sys/stat.h>
 #include <system_error>
 #include <unistd.h>
@@ -275,6 +277,83 @@ Status WriteFileAtomic(const fs::path& path, std::string_view content, const Scr
         }
     }
     if (auto s = RenameOver(scratch, target, target); !s) return s;
+    if (!g_deferSync && !SyncFolder(folder))
+        return Status::Error(Cannot(target, "the folder could not be synced"));
+    return Status::Ok();
+}
+
+namespace {
+
+// The first `keep` bytes of `in` into the empty `out`: a clone of the whole file cut back where
+// the file system shares blocks, else an in-kernel copy, else plain reads and writes.
+bool CopyPrefix(int in, int out, std::uint64_t keep) {
+    if (keep == 0) return true;
+    if (::ioctl(out, FICLONE, in) == 0) return ::ftruncate(out, static_cast<off_t>(keep)) == 0;
+    loff_t from = 0, to = 0;
+    std::uint64_t left = keep;
+    while (left > 0) {
+        const ssize_t n = ::copy_file_range(in, &from, out, &to, left, 0);
+        if (n <= 0) break;
+        left -= static_cast<std::uint64_t>(n);
+    }
+    if (left == 0) return true;
+    std::string buffer(1 << 16, '\0');
+    while (left > 0) {
+        const auto chunk = static_cast<std::size_t>(std::min<std::uint64_t>(left, buffer.size()));
+        const ssize_t n = ::pread(in, buffer.data(), chunk, from);
+        if (n <= 0 || ::pwrite(out, buffer.data(), static_cast<std::size_t>(n), to) != n)
+            return false;
+        from += n, to += n;
+        left -= static_cast<std::uint64_t>(n);
+    }
+    return true;
+}
+
+} // namespace
+
+Status ReplaceFileFrom(const fs::path& path, std::uint64_t keep, std::string_view tail) {
+    const fs::path target = FollowLinks(ResolvePath(path));
+    bool exists = false;
+    mode_t mode = 0;
+    if (auto refusal = RefusalFor(target, exists, mode)) return Status::Error(*refusal);
+    if (!exists) return WriteFileAtomic(path, tail); // nothing to keep
+    const int in = ::open(target.c_str(), O_RDONLY | O_CLOEXEC);
+    if (in < 0) return Status::Error(Cannot(target, std::strerror(errno)));
+    struct stat st {};
+    if (::fstat(in, &st) != 0 || static_cast<std::uint64_t>(st.st_size) < keep) {
+        ::close(in);
+        return Status::Error(Cannot(target, "the file is shorter than the part to keep"));
+    }
+    const fs::path folder = target.has_parent_path() ? target.parent_path() : fs::path(".");
+    fs::path scratch;
+    const int out = CreateUnique(folder, target.filename().string() + ".kori-new", scratch);
+    if (out < 0) {
+        ::close(in);
+        return Status::Error(Cannot(target, std::strerror(errno)));
+    }
+    (void)::fchmod(out, mode);
+    // A failure injected by the tests counts the kept bytes as written content too.
+    const std::size_t total = static_cast<std::size_t>(keep) + tail.size();
+    const std::size_t limit = AllowedBytes(total);
+    Status s;
+    if (!CopyPrefix(in, out, std::min<std::uint64_t>(keep, limit)))
+        s = Status::Error(Cannot(target, std::strerror(errno)));
+    const std::size_t tailLimit = limit > keep ? limit - static_cast<std::size_t>(keep) : 0;
+    if (s && (::lseek(out, static_cast<off_t>(keep), SEEK_SET) < 0 ||
+              !WriteAll(out, tail.data(), std::min(tail.size(), tailLimit))))
+        s = Status::Error(Cannot(target, std::strerror(errno)));
+    if (s) g_writeUsed += static_cast<long long>(std::min(total, limit));
+    if (s && limit < total) s = Status::Error(Cannot(target, "write failed"));
+    if (s && !g_deferSync && ::fsync(out) != 0)
+        s = Status::Error(Cannot(target, std::strerror(errno)));
+    ::close(in);
+    if (::close(out) != 0 && s) s = Status::Error(Cannot(target, std::strerror(errno)));
+    if (!s) {
+        std::error_code ec;
+        fs::remove(scratch, ec);
+        return s;
+    }
+    if (auto r = RenameOver(scratch, target, target); !r) return r;
     if (!g_deferSync && !SyncFolder(folder))
         return Status::Error(Cannot(target, "the folder could not be synced"));
     return Status::Ok();
