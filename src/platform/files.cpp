@@ -284,27 +284,26 @@ Status WriteFileAtomic(const fs::path& path, std::string_view content, const Scr
 
 namespace {
 
-// The first `keep` bytes of `in` into the empty `out`: a clone of the whole file cut back where
-// the file system shares blocks, else an in-kernel copy, else plain reads and writes.
-bool CopyPrefix(int in, int out, std::uint64_t keep) {
-    if (keep == 0) return true;
-    if (::ioctl(out, FICLONE, in) == 0) return ::ftruncate(out, static_cast<off_t>(keep)) == 0;
-    loff_t from = 0, to = 0;
-    std::uint64_t left = keep;
-    while (left > 0) {
-        const ssize_t n = ::copy_file_range(in, &from, out, &to, left, 0);
-        if (n <= 0) break;
-        left -= static_cast<std::uint64_t>(n);
+// The first `keep` bytes of `in` into the empty `out`. Whole blocks are shared with the old
+// file where the file system can clone a range (no data written); the rest, or all of it where
+// it cannot, is copied with plain reads and writes (an in-kernel copy is no faster there).
+bool CopyPrefix(int in, int out, std::uint64_t keep, std::uint64_t blockSize) {
+    std::uint64_t done = 0;
+    if (const std::uint64_t whole = keep / blockSize * blockSize; whole > 0) {
+        file_clone_range range{};
+        range.src_fd = in;
+        range.src_length = whole;
+        if (::ioctl(out, FICLONERANGE, &range) == 0) done = whole;
     }
-    if (left == 0) return true;
-    std::string buffer(1 << 16, '\0');
-    while (left > 0) {
-        const auto chunk = static_cast<std::size_t>(std::min<std::uint64_t>(left, buffer.size()));
-        const ssize_t n = ::pread(in, buffer.data(), chunk, from);
-        if (n <= 0 || ::pwrite(out, buffer.data(), static_cast<std::size_t>(n), to) != n)
+    std::string buffer(std::size_t{1} << 16, '\0');
+    while (done < keep) {
+        const auto chunk =
+            static_cast<std::size_t>(std::min<std::uint64_t>(keep - done, buffer.size()));
+        const auto at = static_cast<off_t>(done);
+        const ssize_t n = ::pread(in, buffer.data(), chunk, at);
+        if (n <= 0 || ::pwrite(out, buffer.data(), static_cast<std::size_t>(n), at) != n)
             return false;
-        from += n, to += n;
-        left -= static_cast<std::uint64_t>(n);
+        done += static_cast<std::uint64_t>(n);
     }
     return true;
 }
@@ -336,7 +335,8 @@ Status ReplaceFileFrom(const fs::path& path, std::uint64_t keep, std::string_vie
     const std::size_t total = static_cast<std::size_t>(keep) + tail.size();
     const std::size_t limit = AllowedBytes(total);
     Status s;
-    if (!CopyPrefix(in, out, std::min<std::uint64_t>(keep, limit)))
+    const auto blockSize = static_cast<std::uint64_t>(st.st_blksize > 0 ? st.st_blksize : 4096);
+    if (!CopyPrefix(in, out, std::min<std::uint64_t>(keep, limit), blockSize))
         s = Status::Error(Cannot(target, std::strerror(errno)));
     const std::size_t tailLimit = limit > keep ? limit - static_cast<std::size_t>(keep) : 0;
     if (s && (::lseek(out, static_cast<off_t>(keep), SEEK_SET) < 0 ||

@@ -220,8 +220,8 @@ TEST(Files, ReplaceFromKeepsTheHeadAndStaysWholeOnFailure) {
     CheckReplaceFrom(root.path());
 }
 
-// The same where the file system clones the kept part (a folder on XFS or Btrfs, named by
-// KORI_CLONE_FOLDER).
+// The same where the file system shares the kept part's blocks (a folder on XFS or Btrfs, named
+// by KORI_CLONE_FOLDER).
 TEST(Files, ReplaceFromByCloneKeepsTheHeadAndStaysWholeOnFailure) {
     const char* dir = std::getenv("KORI_CLONE_FOLDER");
     if (!dir) GTEST_SKIP() << "KORI_CLONE_FOLDER names no folder on a cloning file system";
