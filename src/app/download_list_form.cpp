@@ -2,6 +2,7 @@
 
 #include "app/target_alerts.h"
 #include "intake/download_list.h"
+#include "maint/security_details.h"
 #include "platform/files.h"
 #include "platform/text.h"
 
@@ -24,6 +25,22 @@ intake::UpdateSettings UpdateSettingsOf(const Session& s) {
     return u;
 }
 
+std::string DownloadInFolder(const Session& session) {
+    const std::string in = platform::Trim(session.ini().Read("Download", "In"));
+    return in.empty() || in == platform::kUnknown ? std::string() : platform::FolderWithSlash(in);
+}
+
+intake::UpdateHooks UpdateHooksOf(Session& session) {
+    intake::UpdateHooks hooks;
+    const auto refresh = [&session](auto load) {
+        const auto r = load(session.folders.SystemFolder, DownloadInFolder(session));
+        if (!r.Status) session.dialogs().MsgBox(r.Status.message(), "Downloaded Data");
+    };
+    hooks.RefreshSecurityDetails = [refresh] { refresh(maint::RefreshSecurityDetails); };
+    hooks.RefreshSecurityProperties = [refresh] { refresh(maint::RefreshUKSecurityDetails); };
+    return hooks;
+}
+
 DownloadListForm::DownloadListForm(Session& session) : m_session(session) {}
 
 void DownloadListForm::Build() {
@@ -36,7 +53,7 @@ intake::RunResult DownloadListForm::Run(const std::string& item, bool more) {
     auto settings = UpdateSettingsOf(m_session);
     const intake::UpdateHost host{m_session.dialogs(), m_session.services().progress,
                                   &m_session.services().settings, &m_session.ini()};
-    const intake::UpdateHooks hooks; // the adjustment list and security details plug in here
+    const intake::UpdateHooks hooks = UpdateHooksOf(m_session);
     const std::string today = m_session.services().clock.Today();
     return intake::RunDownloadUpdate(settings, host, hooks, item,
                                      intake::UpdateDateFromItem(item, today), more);

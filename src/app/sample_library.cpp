@@ -3,6 +3,7 @@
 #include "platform/date_text.h"
 #include "platform/files.h"
 #include "platform/number_format.h"
+#include "platform/text.h"
 #include "store/chart_list.h"
 #include "store/name_file.h"
 #include "store/price_file.h"
@@ -562,6 +563,37 @@ platform::Status MakeSampleBundle(const std::string& rootFolder, const std::stri
         if (auto st = WriteDayFile(downloadFolder, stem + ext, text, made); !st) return st;
     }
     return platform::Status::Ok();
+}
+
+platform::Status MakeSampleSecurityDetails(const std::string& dataFolder,
+                                           const std::string& inFolder) {
+    std::vector<store::NameRecord> names;
+    store::NameFile nf(store::NameFile::PathIn(dataFolder));
+    if (auto st = nf.ReadAll(names); !st) return st;
+    std::string text =
+        "CODE,SHORTDESCRIPTION,SECURITYTYPE,TOTALCLASSISSUE,PARVALUE,ANNUALDIVIDENDRATE,"
+        "EARNINGSPERSHARE,FRANKINGPERCENT,EXDATE,SHORTSELLINDICATOR\r\n";
+    int i = 0;
+    for (const auto& n : names) {
+        if (n.RecordType != 4) continue;
+        ++i;
+        // Every fifth pays nothing and every seventh earns nothing: their figures show "n/a".
+        const std::string dividend =
+            i % 5 == 0 ? "0" : platform::Format((i % 9 + 1) * 0.025, "0.00#");
+        const std::string earnings =
+            i % 7 == 0 ? "0" : platform::Format((i % 11 + 1) * 0.04, "0.00#");
+        text += n.TrimmedCode() + "," + platform::Upper(platform::Trim(n.Name)) + ",ORD," +
+                std::to_string(1000000 * (i * 37 % 900 + 10)) + ",0," + dividend + "," + earnings +
+                "," + (i % 2 ? "100" : "0") + ",2026101" + std::to_string(i % 10) + "," +
+                (i % 3 ? "Y" : "N") + "\r\n";
+    }
+    text += "PRN,PERENNIAL RESOURCES,ORD,52000000,0,0.01,0.05,100,20260901,Y\r\n";
+    // A row whose description runs past what a record keeps.
+    text += "ZLONG,A SECURITY WHOSE DESCRIPTION RUNS ON " + std::string(320, 'X') +
+            ",ORD,1000,0,0,0,0,20260101,N\r\n";
+    platform::CreateFolder(inFolder);
+    return platform::WriteFileAtomic(platform::ResolveIn(inFolder, "SecurityDetails.Asx.Stk"),
+                                     text);
 }
 
 } // namespace kori::app

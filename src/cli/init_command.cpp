@@ -84,6 +84,11 @@ std::string BuildRoot(app::Session& session, bool sample, int service) {
         if (!st) throw CliError{st.message()};
         (void)session.ini().Write("Download", "InternetDLfmt", "DDMMMYY.D");
     }
+    // The download program's In folder beside its Out folder, with a details table waiting.
+    const std::string in = platform::FolderWithSlash(
+        (std::filesystem::path(f.DownloadFolder).parent_path().parent_path() / "In").string());
+    if (st = app::MakeSampleSecurityDetails(f.DataFolder, in); !st) throw CliError{st.message()};
+    (void)session.ini().Write("Download", "In", in);
     // The sample's charts keep their volume bars inside the volume panel.
     auto defaults = chart::LoadChartDefaults(session.ini());
     defaults.LimitVolumeHeight = true;

@@ -109,7 +109,7 @@ void AddUpdateCommand(CLI::App& app, CliContext& ctx) {
         const auto chosen = Chosen(waiting, *o, settings.DownloadFolder);
         intake::UpdateHost host{dialogs, session.services().progress, &session.services().settings,
                                 &session.ini()};
-        const intake::UpdateHooks hooks; // nothing else is refreshed from the command line
+        const intake::UpdateHooks hooks = app::UpdateHooksOf(session);
         const std::string today = session.services().clock.Today();
 
         json files = json::array();

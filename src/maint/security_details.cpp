@@ -283,7 +283,8 @@ std::vector<std::string> DetailsTextBox(const DetailsHeader& header, const Secur
     const auto issued = field("TOTALCLASSISSUE");
     lines.push_back("Issued  " + (issued ? platform::Format(*issued, "#,###") : "n/a"));
     const auto earnings = field("EARNINGSPERSHARE");
-    lines.push_back("PE Ratio  " + (earnings && *earnings != 0
+    // Without a price there is no ratio either, as in the details window.
+    lines.push_back("PE Ratio  " + (earnings && *earnings != 0 && lastClose != 0
                                         ? platform::Format(lastClose / *earnings, "0.0")
                                         : std::string("n/a")));
     const auto dividend = field("ANNUALDIVIDENDRATE");

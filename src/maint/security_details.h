@@ -61,7 +61,7 @@ DetailsHeader ReadDetailsHeader(const std::string& systemFolder, bool london = f
 
 // The text box of the chart window, from a security's details and its last close: issue size
 // "Issued  " ("#,###"), "PE Ratio  " ("0.0") and "Yield  " ("#.0%"); a figure whose divisor is 0
-// shows "n/a". The keys of the header name the fields used.
+// (or, for the ratio, without a price) shows "n/a". The keys of the header name the fields used.
 std::vector<std::string> DetailsTextBox(const DetailsHeader& header, const SecurityDetails& details,
                                         double lastClose);
 

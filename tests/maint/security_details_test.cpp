@@ -93,6 +93,9 @@ TEST_F(DetailsTest, TextBoxShowsIssuePeAndYieldOrNa) {
     // 10 / 2.0 = 5.0; 0.5 / 10 = 5.0%.
     EXPECT_EQ(DetailsTextBox(header, *LookUpSecurityDetails(Sys(), "WES"), 10),
               (std::vector<std::string>{"Issued  1,000,000", "PE Ratio  5.0", "Yield  5.0%"}));
+    // No price: no ratio, and a yield over 0 that cannot be had.
+    EXPECT_EQ(DetailsTextBox(header, *LookUpSecurityDetails(Sys(), "WES"), 0),
+              (std::vector<std::string>{"Issued  1,000,000", "PE Ratio  n/a", "Yield  n/a"}));
     // Earnings of 0 and a close of 0 are divisors of 0.
     EXPECT_EQ(DetailsTextBox(header, *LookUpSecurityDetails(Sys(), "BHP"), 0),
               (std::vector<std::string>{"Issued  2,500,000", "PE Ratio  n/a", "Yield  n/a"}));
