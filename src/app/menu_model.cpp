@@ -52,7 +52,7 @@ std::vector<MenuItem> BuildMenuTree() {
                          Item("mnuFundamtl", "&ASX Company Details", "Fundmnt")});
     MenuItem backup = Top("mnuBackup", "Bac&kup / Restore",
                           {Item("mnuBackupData", "&Backup Chart Data", "ChartBak"),
-                           Item("mnuRestoreData", "&Restore Data from Backup", "ChartBak")});
+                           Item("mnuRestoreData", "&Restore Data from Backup", "ChartBak Restore")});
     std::vector<MenuItem> tops;
     tops.push_back(
         Top("mnuFile", "&File",

@@ -3,6 +3,7 @@
 #include "cli/json_out.h"
 
 #include "maint/data_check.h"
+#include "maint/name_check.h"
 #include "platform/date_text.h"
 #include "platform/files.h"
 #include "platform/text.h"
@@ -94,6 +95,55 @@ void AddCheckCommand(CLI::App& app, CliContext& ctx) {
                               result.Findings.size());
         }
         if (result.Cancelled) throw CliError{"Check cancelled", 3};
+    });
+}
+
+// kori check-names: the name file against the price files of the data folder, and the two
+// remedies of the window after it.
+void AddCheckNamesCommand(CLI::App& app, CliContext& ctx) {
+    auto* cmd = app.add_subcommand("check-names",
+                                   "Check the name file against the price files of the folder");
+    struct Options {
+        bool fix = false;
+        bool json = false;
+    };
+    auto o = std::make_shared<Options>();
+    cmd->add_flag("--fix", o->fix,
+                  "Add name records for price files without one (type 4, name blank) and remove "
+                  "entries without a price file");
+    cmd->add_flag("--json", o->json, "JSON output");
+    cmd->callback([&ctx, o] {
+        auto& session = ctx.OpenSession();
+        const std::string folder = session.folders.DataFolder;
+        auto result = maint::CheckNameFile(folder);
+        if (!result.Status) throw CliError{result.Status.message()};
+        maint::NameFixResult fixed;
+        if (o->fix) {
+            fixed = maint::FixNameFile(folder, true, true, session.services().progress);
+            if (!fixed.Status) throw CliError{fixed.Status.message()};
+        }
+        if (o->json) {
+            json rows = json::array();
+            for (const auto& f : result.Findings)
+                rows.push_back({{"code", TextJson(f.Code)},
+                                {"record", f.Record},
+                                {"finding", f.What},
+                                {"detail", TextJson(f.Detail)}});
+            json out = {{"records", result.Records},
+                        {"price_files", result.PriceFiles},
+                        {"findings", rows}};
+            if (o->fix) out["fixed"] = {{"added", fixed.Added}, {"removed", fixed.Removed}};
+            ctx.out << out.dump(2) << "\n";
+            return;
+        }
+        for (const auto& f : result.Findings)
+            ctx.out << Printf("%-8s %6d  %-24s %s\n", f.Code.c_str(), f.Record, f.What.c_str(),
+                              f.Detail.c_str());
+        ctx.out << Printf("%d name records, %d price files, %zu findings\n", result.Records,
+                          result.PriceFiles, result.Findings.size());
+        if (o->fix)
+            ctx.out << Printf("%d name records added, %d entries without data removed\n",
+                              fixed.Added, fixed.Removed);
     });
 }
 

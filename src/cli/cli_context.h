@@ -70,6 +70,8 @@ void AddAdjustCommand(CLI::App& app, CliContext& ctx);
 void AddDataCommand(CLI::App& app, CliContext& ctx);
 void AddRepairCommand(CLI::App& app, CliContext& ctx);
 void AddCheckCommand(CLI::App& app, CliContext& ctx);
+void AddCheckNamesCommand(CLI::App& app, CliContext& ctx);
+void AddBackupCommands(CLI::App& app, CliContext& ctx);
 void AddExportCommand(CLI::App& app, CliContext& ctx);
 
 } // namespace kori::cli

@@ -38,6 +38,8 @@ int RunKori(int argc, const char* const* argv, std::ostream& out, std::ostream& 
     AddDataCommand(app, ctx);
     AddRepairCommand(app, ctx);
     AddCheckCommand(app, ctx);
+    AddCheckNamesCommand(app, ctx);
+    AddBackupCommands(app, ctx);
     AddExportCommand(app, ctx);
 
     try {

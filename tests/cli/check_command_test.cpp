@@ -82,5 +82,27 @@ TEST_F(KoriCheck, RefusesAFolderWithoutANameFile) {
     EXPECT_NE(r.err.find("No name file in"), std::string::npos) << r.err;
 }
 
+TEST_F(KoriCheck, CheckNamesReportsThenFixesTheNameFile) {
+    const auto data = dir.path() / "k" / "data";
+    std::filesystem::copy_file(data / "KRM.WDT", data / "NEWONE.WDT");
+    const auto r = Kori({"check-names", "--json"});
+    ASSERT_EQ(r.status, 0) << r.err;
+    const auto report = json::parse(r.out);
+    ASSERT_EQ(report["findings"].size(), 1u) << r.out;
+    EXPECT_EQ(report["findings"][0]["code"], "NEWONE");
+    EXPECT_EQ(report["findings"][0]["finding"], "No name record");
+    EXPECT_EQ(report["findings"][0]["record"], 0);
+    EXPECT_FALSE(report.contains("fixed"));
+
+    const auto fixed = Kori({"check-names", "--fix"});
+    ASSERT_EQ(fixed.status, 0) << fixed.err;
+    EXPECT_NE(fixed.out.find("1 name records added, 0 entries without data removed"),
+              std::string::npos)
+        << fixed.out;
+    const auto again = json::parse(Kori({"check-names", "--json"}).out);
+    EXPECT_TRUE(again["findings"].empty());
+    EXPECT_EQ(again["records"], report["records"].get<int>() + 1);
+}
+
 } // namespace
 } // namespace kori::test

@@ -2,15 +2,19 @@
 #include "desktop_fixture.h"
 
 #include "gui/widgets/grid_view.h"
+#include "gui/windows/chart_bak.h"
 #include "gui/windows/chk_dta.h"
 #include "gui/windows/dl_list.h"
+#include "gui/windows/name_data.h"
 #include "gui/windows/text_data.h"
+#include "store/name_file.h"
 #include "store/price_file.h"
 
 #include <QComboBox>
 #include <QLabel>
 #include <QLineEdit>
 #include <QListWidget>
+#include <QPushButton>
 #include <QRadioButton>
 
 namespace kori::test {
@@ -167,6 +171,73 @@ TEST_F(DesktopTest, DownloadedDataUpdateFromTheMenuTakesInEveryWaitingDay) {
     w->RemoveDate();
     EXPECT_EQ(w->list()->count(), 0);
     EXPECT_FALSE(platform::FileExists(s.session.folders.DownloadFolder + "24NOV26.D"));
+}
+
+TEST_F(DesktopTest, NameFileCheckAsksFirstThenMendsTheNameFile) {
+    const std::string folder = s.session.folders.DataFolder;
+    // A price file nobody named, and the price file of a named security gone.
+    std::filesystem::copy_file(folder + "KRM.WDT", folder + "ORPHAN.WDT");
+    std::filesystem::remove(store::PriceFile::PathFor(folder, "QRY"));
+
+    s.dialogs.QueueAnswer(platform::Answer::No);
+    ASSERT_TRUE(main.Trigger("mnuChkNameData"));
+    QApplication::processEvents();
+    EXPECT_EQ(s.dialogs.shown().back().title, "Check Name File - Data Files");
+    EXPECT_EQ(main.findChild<gui::NameData*>(), nullptr); // "No" opens nothing
+
+    s.dialogs.QueueAnswer(platform::Answer::Yes);
+    ASSERT_TRUE(main.Trigger("mnuChkNameData"));
+    QApplication::processEvents();
+    auto* window = main.findChild<gui::NameData*>();
+    ASSERT_NE(window, nullptr);
+    const auto& rows = window->grid()->model().rows();
+    ASSERT_EQ(rows.size(), 2u);
+    EXPECT_EQ(rows[0][0], "QRY");
+    EXPECT_EQ(rows[0][2], "No price file");
+    EXPECT_EQ(rows[1][0], "ORPHAN");
+    EXPECT_EQ(rows[1][2], "No name record");
+
+    s.dialogs.QueueAnswer(platform::Answer::Yes);
+    window->AddMissing();
+    EXPECT_EQ(s.dialogs.shown()[s.dialogs.shown().size() - 2].text,
+              "Add 1 name record (record type 4, name blank) for the price files without one ?");
+    s.dialogs.QueueAnswer(platform::Answer::Yes);
+    window->RemoveWithoutData();
+    EXPECT_TRUE(window->grid()->model().rows().empty());
+    EXPECT_FALSE(window->findChild<QPushButton*>(QStringLiteral("cmdAdd"))->isEnabled());
+    platform::Status status;
+    EXPECT_TRUE(store::FindCode(folder, "ORPHAN", status).has_value());
+    EXPECT_FALSE(store::FindCode(folder, "QRY", status).has_value());
+}
+
+TEST_F(DesktopTest, BackupThenRestoreFromTheirMenuItems) {
+    ASSERT_TRUE(main.Trigger("mnuBackupData"));
+    QApplication::processEvents();
+    auto* backup = main.findChild<gui::ChartBak*>(QStringLiteral("ChartBak"));
+    ASSERT_NE(backup, nullptr);
+    EXPECT_EQ(backup->windowTitle().toStdString(), "Backup Chart Data");
+    backup->Backup();
+    EXPECT_NE(backup->status()->text().toStdString().find("backed up to"), std::string::npos)
+        << backup->status()->text().toStdString();
+
+    const std::string krm = s.session.folders.DataFolder + "KRM.WDT";
+    const auto original = platform::ReadWholeFile(krm);
+    ASSERT_TRUE(platform::WriteFileAtomic(krm, "damaged").ok());
+
+    ASSERT_TRUE(main.Trigger("mnuRestoreData"));
+    QApplication::processEvents();
+    auto* restore = main.findChild<gui::ChartBak*>(QStringLiteral("ChartBak Restore"));
+    ASSERT_NE(restore, nullptr);
+    ASSERT_EQ(restore->list()->count(), 1);
+    restore->Verify();
+    EXPECT_NE(restore->status()->text().toStdString().find("is whole"), std::string::npos);
+    s.dialogs.QueueAnswer(platform::Answer::Yes);
+    restore->Restore();
+    EXPECT_EQ(platform::ReadWholeFile(krm), original);
+    ASSERT_FALSE(restore->form().Replaced().empty());
+    s.dialogs.QueueAnswer(platform::Answer::Yes);
+    restore->Discard();
+    EXPECT_TRUE(restore->form().Replaced().empty());
 }
 
 } // namespace

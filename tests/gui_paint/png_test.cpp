@@ -50,6 +50,23 @@ TEST(PngPicture, KeepsEveryPixelAndTheResolution) {
     EXPECT_TRUE(Decoded(general) == back);
 }
 
+// Pictures that do not compress (noise) and pictures of one row or one column still come back
+// whole: the compressed data may be larger than the rows it holds.
+TEST(PngPicture, IncompressibleAndThinPicturesComeBack) {
+    for (const QSize size : {QSize(1, 1), QSize(333, 1), QSize(1, 257), QSize(301, 207)}) {
+        QImage picture(size, QImage::Format_RGB32);
+        std::uint32_t seed = 12345;
+        for (int y = 0; y < size.height(); ++y)
+            for (int x = 0; x < size.width(); ++x) {
+                seed = seed * 1664525u + 1013904223u;
+                picture.setPixel(x, y, qRgb(seed >> 24, (seed >> 16) & 0xFF, (seed >> 8) & 0xFF));
+            }
+        QByteArray png;
+        ASSERT_TRUE(EncodePng(picture, png));
+        EXPECT_TRUE(Decoded(png) == picture) << size.width() << "x" << size.height();
+    }
+}
+
 TEST(PngPicture, PicturesWithTransparencyKeepIt) {
     QImage picture(50, 40, QImage::Format_ARGB32);
     picture.fill(qRgba(10, 20, 30, 0));

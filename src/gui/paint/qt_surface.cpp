@@ -1,17 +1,18 @@
 #include "gui/paint/qt_surface.h"
 
+#include "gui/paint/large_buffer.h"
 #include "platform/files.h"
 
 #include <QBuffer>
 #include <QFontMetricsF>
 
 #include <algorithm>
-#include <csetjmp>
 #include <vector>
 
 #include <cmath>
-#include <png.h>
-#include <zlib.h>
+#include <cstdint>
+#include <libdeflate.h>
+#include <memory>
 
 namespace kori::gui {
 
@@ -122,8 +123,28 @@ double QtSurface::TextHeight(std::string_view) {
     return QFontMetricsF(m_font, m_painter->device()).height();
 }
 
+namespace {
+
+void DeleteLargeBuffer(void* buffer) {
+    delete static_cast<LargeBuffer*>(buffer);
+}
+
+// The picture's pixels in large pages; the picture frees them when its last copy goes.
+QImage MakePicture(int width, int height) {
+    const qsizetype bytesPerLine = static_cast<qsizetype>(width) * 4;
+    auto* buffer = new LargeBuffer(static_cast<std::size_t>(bytesPerLine) * height);
+    if (!*buffer) {
+        delete buffer;
+        return QImage(width, height, QImage::Format_RGB32);
+    }
+    return QImage(buffer->data(), width, height, bytesPerLine, QImage::Format_RGB32,
+                  DeleteLargeBuffer, buffer);
+}
+
+} // namespace
+
 ImageSurface::Canvas::Canvas(int width, int height)
-    : image(std::max(width, 1), std::max(height, 1), QImage::Format_RGB32) {
+    : image(MakePicture(std::max(width, 1), std::max(height, 1))) {
     image.setDotsPerMeterX(kDotsPerMeter96);
     image.setDotsPerMeterY(kDotsPerMeter96);
     image.fill(Qt::white);
@@ -147,54 +168,90 @@ const QImage& ImageSurface::Finish() {
 
 namespace {
 
-void AppendToBytes(png_structp png, png_bytep data, png_size_t length) {
-    auto* bytes = static_cast<QByteArray*>(png_get_io_ptr(png));
-    bytes->append(reinterpret_cast<const char*>(data), static_cast<qsizetype>(length));
+void PutBigEndian(unsigned char* out, std::uint32_t value) {
+    out[0] = static_cast<unsigned char>(value >> 24);
+    out[1] = static_cast<unsigned char>(value >> 16);
+    out[2] = static_cast<unsigned char>(value >> 8);
+    out[3] = static_cast<unsigned char>(value);
 }
 
-void FlushNothing(png_structp) {}
+// One chunk: length, type, data, then the CRC of type and data.
+void AppendChunk(QByteArray& bytes, const char (&type)[5], const unsigned char* data,
+                 std::size_t length) {
+    unsigned char word[4];
+    PutBigEndian(word, static_cast<std::uint32_t>(length));
+    bytes.append(reinterpret_cast<const char*>(word), 4);
+    bytes.append(type, 4);
+    if (length > 0)
+        bytes.append(reinterpret_cast<const char*>(data), static_cast<qsizetype>(length));
+    std::uint32_t crc = libdeflate_crc32(0, type, 4);
+    if (length > 0) crc = libdeflate_crc32(crc, data, length);
+    PutBigEndian(word, crc);
+    bytes.append(reinterpret_cast<const char*>(word), 4);
+}
 
-// Opaque pictures, the charts, straight through libpng: one cheap filter (each row less the
-// row above, which flat areas and grids turn into runs of zeros) and run-length compression.
-// The general writer tries every filter on every row at a higher level, for a file a third
-// smaller at three times the cost. The pixels are the same.
+// Opaque pictures, the charts, written here rather than through a general writer: each row
+// less the row above (flat areas and grids become runs of zeros), all rows compressed in one
+// call with run-length matching at the fastest level. A general writer feeding the compressor
+// row by row, or trying every filter, costs two to three times as much for the same pixels.
 bool EncodeOpaquePng(const QImage& image, QByteArray& bytes) {
-    png_structp png = png_create_write_struct(PNG_LIBPNG_VER_STRING, nullptr, nullptr, nullptr);
-    if (!png) return false;
-    png_infop info = png_create_info_struct(png);
-    if (!info) {
-        png_destroy_write_struct(&png, nullptr);
-        return false;
-    }
     const int width = image.width();
     const int height = image.height();
-    std::vector<png_byte> row(static_cast<std::size_t>(width) * 3);
-    if (setjmp(png_jmpbuf(png))) {
-        png_destroy_write_struct(&png, &info);
-        return false;
-    }
-    png_set_write_fn(png, &bytes, AppendToBytes, FlushNothing);
-    png_set_IHDR(png, info, static_cast<png_uint_32>(width), static_cast<png_uint_32>(height), 8,
-                 PNG_COLOR_TYPE_RGB, PNG_INTERLACE_NONE, PNG_COMPRESSION_TYPE_DEFAULT,
-                 PNG_FILTER_TYPE_DEFAULT);
-    png_set_pHYs(png, info, static_cast<png_uint_32>(image.dotsPerMeterX()),
-                 static_cast<png_uint_32>(image.dotsPerMeterY()), PNG_RESOLUTION_METER);
-    png_set_filter(png, PNG_FILTER_TYPE_BASE, PNG_FILTER_UP);
-    png_set_compression_level(png, 1);
-    png_set_compression_strategy(png, Z_RLE);
-    png_write_info(png, info);
+    if (width <= 0 || height <= 0) return false;
+    const std::size_t stride = static_cast<std::size_t>(width) * 3 + 1;
+    const std::size_t rowBytes = stride * static_cast<std::size_t>(height);
+    thread_local LargeBuffer rows;
+    thread_local LargeBuffer packed;
+    if (!rows.Reserve(rowBytes)) return false;
+    unsigned char* out = rows.data();
+    const QRgb* above = nullptr;
     for (int y = 0; y < height; ++y) {
         const auto* pixels = reinterpret_cast<const QRgb*>(image.constScanLine(y));
-        png_byte* out = row.data();
-        for (int x = 0; x < width; ++x) {
-            *out++ = static_cast<png_byte>(qRed(pixels[x]));
-            *out++ = static_cast<png_byte>(qGreen(pixels[x]));
-            *out++ = static_cast<png_byte>(qBlue(pixels[x]));
+        *out++ = 2; // filter "up"
+        if (above == nullptr) {
+            for (int x = 0; x < width; ++x) {
+                *out++ = static_cast<unsigned char>(qRed(pixels[x]));
+                *out++ = static_cast<unsigned char>(qGreen(pixels[x]));
+                *out++ = static_cast<unsigned char>(qBlue(pixels[x]));
+            }
+        } else {
+            for (int x = 0; x < width; ++x) {
+                *out++ = static_cast<unsigned char>(qRed(pixels[x]) - qRed(above[x]));
+                *out++ = static_cast<unsigned char>(qGreen(pixels[x]) - qGreen(above[x]));
+                *out++ = static_cast<unsigned char>(qBlue(pixels[x]) - qBlue(above[x]));
+            }
         }
-        png_write_row(png, row.data());
+        above = pixels;
     }
-    png_write_end(png, info);
-    png_destroy_write_struct(&png, &info);
+
+    // Level 2 of this compressor: faster than the usual library's fastest, and smaller.
+    thread_local std::unique_ptr<libdeflate_compressor, void (*)(libdeflate_compressor*)>
+        compressor(libdeflate_alloc_compressor(2), libdeflate_free_compressor);
+    if (!compressor) return false;
+    if (!packed.Reserve(libdeflate_zlib_compress_bound(compressor.get(), rowBytes))) return false;
+    const std::size_t packedSize = libdeflate_zlib_compress(compressor.get(), rows.data(), rowBytes,
+                                                            packed.data(), packed.size());
+    if (packedSize == 0) return false;
+
+    static constexpr unsigned char kSignature[8] = {0x89, 'P', 'N', 'G', '\r', '\n', 0x1A, '\n'};
+    bytes.reserve(static_cast<qsizetype>(packedSize + 128));
+    bytes.append(reinterpret_cast<const char*>(kSignature), 8);
+    unsigned char header[13];
+    PutBigEndian(header, static_cast<std::uint32_t>(width));
+    PutBigEndian(header + 4, static_cast<std::uint32_t>(height));
+    header[8] = 8;  // bits a sample
+    header[9] = 2;  // RGB
+    header[10] = 0; // deflate
+    header[11] = 0; // adaptive filtering
+    header[12] = 0; // not interlaced
+    AppendChunk(bytes, "IHDR", header, sizeof header);
+    unsigned char physical[9];
+    PutBigEndian(physical, static_cast<std::uint32_t>(image.dotsPerMeterX()));
+    PutBigEndian(physical + 4, static_cast<std::uint32_t>(image.dotsPerMeterY()));
+    physical[8] = 1; // metres
+    AppendChunk(bytes, "pHYs", physical, sizeof physical);
+    AppendChunk(bytes, "IDAT", packed.data(), packedSize);
+    AppendChunk(bytes, "IEND", nullptr, 0);
     return true;
 }
 

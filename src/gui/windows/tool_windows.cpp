@@ -1,10 +1,12 @@
 #include "gui/windows/tool_windows.h"
 
+#include "gui/windows/chart_bak.h"
 #include "gui/windows/chart_windows.h"
 #include "gui/windows/chk_dta.h"
 #include "gui/windows/dl_list.h"
 #include "gui/windows/download_settings.h"
 #include "gui/windows/main_window.h"
+#include "gui/windows/name_data.h"
 #include "gui/windows/show_once.h"
 #include "gui/windows/text_data.h"
 
@@ -50,6 +52,15 @@ void RegisterToolWindows(MainWindow& main) {
         case app::DownloadUpdateOpens::Nothing:
             break;
         }
+    });
+    Register<ChartBak>(main, "ChartBak", false);
+    Register<ChartBak>(main, "ChartBak Restore", true);
+    // The name-file check asks first, as its menu item says.
+    main.SetAction("NameData", [&main] {
+        app::NameDataForm question(main.session());
+        if (!question.Ask()) return;
+        ShowOnce(main, "NameData",
+                 [&] { return new NameData(main.session(), main.progress(), &main); });
     });
 }
 
