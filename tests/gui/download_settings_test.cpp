@@ -2,9 +2,12 @@
 // folders and the update list, each opened and driven as a user would.
 #include "desktop_fixture.h"
 
+#include "app/sample_library.h"
 #include "gui/widgets/grid_view.h"
+#include "gui/windows/cht_sel.h"
 #include "gui/windows/dl_list.h"
 #include "gui/windows/download_settings.h"
+#include "maint/security_details.h"
 
 #include <QButtonGroup>
 #include <QCheckBox>
@@ -12,6 +15,7 @@
 #include <QLineEdit>
 #include <QListWidget>
 #include <QPushButton>
+#include <QTest>
 
 namespace kori::test {
 namespace {
@@ -102,6 +106,34 @@ TEST_F(DownloadSettingsWindows, UpdateMenuWithNoDownloadFolderOffersTheSettings)
     EXPECT_EQ(s.dialogs.shown().back().title, "Downloaded Data");
     EXPECT_EQ(main.findChild<gui::DLList*>(), nullptr);
     EXPECT_NE(main.findChild<gui::ModDetails*>(), nullptr);
+}
+
+// The chart window shows the security's figures from the details files of the download
+// program's services, and nothing without them.
+TEST_F(DesktopTest, ChartShowsTheSecurityDetailsTextBox) {
+    const std::string in = s.root.folder() + "In/";
+    ASSERT_TRUE(app::MakeSampleSecurityDetails(s.session.folders.DataFolder, in));
+    ASSERT_TRUE(maint::RefreshSecurityDetails(s.session.folders.SystemFolder, in).Status);
+    const auto open = [this](const char* code) {
+        ASSERT_TRUE(main.Trigger("mnuChartDisplay"));
+        auto* field = charts()->chtSel()->findChild<QLineEdit*>(QStringLiteral("txtCode"));
+        ASSERT_NE(field, nullptr);
+        field->setText(QString::fromLatin1(code));
+        QTest::keyClick(field, Qt::Key_Return);
+        QApplication::processEvents();
+    };
+    s.session.download.DataService = 3;
+    open("krm");
+    ASSERT_NE(chts(), nullptr);
+    auto* box = chts()->findChild<QLabel*>(QStringLiteral("txtDetails"));
+    ASSERT_NE(box, nullptr);
+    // Last close 1.41: 1.41 / 0.08 = 17.6 and 0.05 / 1.41 = 3.5%.
+    EXPECT_EQ(box->text().toStdString(), "Issued  47,000,000   PE Ratio  17.6   Yield  3.5%");
+    EXPECT_TRUE(box->isVisibleTo(chts()));
+
+    s.session.download.DataService = 4; // not a service that delivers the details
+    open("krm");
+    EXPECT_FALSE(box->isVisibleTo(chts()));
 }
 
 } // namespace
