@@ -7,14 +7,19 @@
 #include "gui/windows/cht_sel.h"
 #include "gui/windows/dl_list.h"
 #include "gui/windows/download_settings.h"
+#include "gui/windows/fundmnt.h"
 #include "maint/security_details.h"
 
 #include <QButtonGroup>
 #include <QCheckBox>
 #include <QComboBox>
+#include <QDialogButtonBox>
+#include <QLabel>
 #include <QLineEdit>
 #include <QListWidget>
 #include <QPushButton>
+#include <QSpinBox>
+#include <QTableWidget>
 #include <QTest>
 
 namespace kori::test {
@@ -134,6 +139,41 @@ TEST_F(DesktopTest, ChartShowsTheSecurityDetailsTextBox) {
     s.session.download.DataService = 4; // not a service that delivers the details
     open("krm");
     EXPECT_FALSE(box->isVisibleTo(chts()));
+}
+
+// The company details menu item is on only with the details files; its window shows them with
+// the figures, and its display size window sets the table's size.
+TEST_F(DesktopTest, CompanyDetailsOpenFromTheMenuWhenTheDetailsExist) {
+    s.session.download.DataService = 3;
+    main.RebuildMenus();
+    EXPECT_FALSE(main.Trigger("mnuFundamtl")) << "no details files yet";
+    const std::string in = s.root.folder() + "In/";
+    ASSERT_TRUE(app::MakeSampleSecurityDetails(s.session.folders.DataFolder, in));
+    ASSERT_TRUE(maint::RefreshSecurityDetails(s.session.folders.SystemFolder, in).Status);
+    main.RebuildMenus();
+    ASSERT_TRUE(main.Trigger("mnuFundamtl"));
+    QApplication::processEvents();
+    auto* w = main.findChild<gui::Fundmnt*>();
+    ASSERT_NE(w, nullptr);
+    EXPECT_EQ(w->windowTitle().toStdString(), "Fundamentals");
+    auto* t = w->table();
+    EXPECT_EQ(t->horizontalHeaderItem(1)->text().toStdString(), "Description");
+    const int price = w->form().priceColumn();
+    int krm = -1;
+    for (int r = 0; r < t->rowCount(); ++r)
+        if (t->item(r, 0)->text() == QStringLiteral("KRM")) krm = r;
+    ASSERT_GE(krm, 0);
+    EXPECT_TRUE(t->item(krm, price)->text().isEmpty());
+    w->findChild<QAction*>(QStringLiteral("mnYCP"))->trigger();
+    EXPECT_EQ(w->table()->item(krm, price)->text().toStdString(), "1.41");
+
+    w->findChild<QAction*>(QStringLiteral("mnSize"))->trigger();
+    QApplication::processEvents();
+    auto* size = w->findChild<gui::F1Size*>();
+    ASSERT_NE(size, nullptr);
+    size->size()->setValue(12);
+    size->findChild<QDialogButtonBox*>()->button(QDialogButtonBox::Ok)->click();
+    EXPECT_EQ(w->table()->font().pointSize(), 12);
 }
 
 } // namespace

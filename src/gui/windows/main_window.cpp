@@ -1,5 +1,7 @@
 #include "gui/windows/main_window.h"
 
+#include "maint/security_details.h"
+
 #include "app/window_position.h"
 #include "gui/services/qt_progress.h"
 #include "gui/widgets/window_place.h"
@@ -100,7 +102,7 @@ app::MenuConditions MainWindow::Conditions() const {
     c.HideDownloadProgram = m_hideDownloadProgram;
     const std::string sys = m_session.folders.SystemFolder;
     c.MaxScanPresent = platform::FileExists(sys + "KoriMaxScan.exe");
-    c.SecurityDetailsPresent = false; // the company details window is not in this build
+    c.SecurityDetailsPresent = maint::SecurityDetailsAvailable(c.DataService, sys);
     return c;
 }
 

@@ -5,6 +5,7 @@
 #include "gui/windows/chk_dta.h"
 #include "gui/windows/dl_list.h"
 #include "gui/windows/download_settings.h"
+#include "gui/windows/fundmnt.h"
 #include "gui/windows/main_window.h"
 #include "gui/windows/name_data.h"
 #include "gui/windows/show_once.h"
@@ -52,6 +53,20 @@ void RegisterToolWindows(MainWindow& main) {
         case app::DownloadUpdateOpens::Nothing:
             break;
         }
+    });
+    // Without the details the window says so and does not open.
+    main.SetAction("Fundmnt", [&main] {
+        if (auto* open = main.findChild<Fundmnt*>()) {
+            open->raise();
+            return;
+        }
+        auto* w = new Fundmnt(main.session(), &main);
+        w->setAttribute(Qt::WA_DeleteOnClose);
+        if (!w->loaded()) {
+            delete w;
+            return;
+        }
+        w->open();
     });
     Register<ChartBak>(main, "ChartBak", false);
     Register<ChartBak>(main, "ChartBak Restore", true);
