@@ -571,8 +571,19 @@ platform::Status MakeSampleSecurityDetails(const std::string& dataFolder,
     store::NameFile nf(store::NameFile::PathIn(dataFolder));
     if (auto st = nf.ReadAll(names); !st) return st;
     std::string text =
-        "CODE,SHORTDESCRIPTION,SECURITYTYPE,TOTALCLASSISSUE,PARVALUE,ANNUALDIVIDENDRATE,"
-        "EARNINGSPERSHARE,FRANKINGPERCENT,EXDATE,SHORTSELLINDICATOR\r\n";
+        "CODE,SHORTDESCRIPTION,SECURITYTYPE,FIRSTACTIVEDATE,FIRSTQUOTEDDATE,LASTQUOTEDATE,"
+        "SUSPENSIONSTARTDATE,SUSPENSIONENDDATE,TOTALCLASSISSUE,PARVALUE,PAIDUPVALUE,ASSETBACKING,"
+        "DIVENDRATEPERSHARE,EARNINGSPERSHARE,ANNUALDIVIDENDRATE,FRANKINGPERCENT,EXDATE,"
+        "DIVIDENTTYPE\r\n";
+    // Earnings and dividend stand in the 14th and 15th columns, where the details window
+    // reads them.
+    const auto line = [](const std::string& code, const std::string& name, long issue,
+                         const std::string& dividend, const std::string& earnings,
+                         const std::string& franking, const std::string& exDate, bool interim) {
+        return code + "," + name + ",ORD,20100104,20100105,20261120,,," + std::to_string(issue) +
+               ",0,0,0," + dividend + "," + earnings + "," + dividend + "," + franking + "," +
+               exDate + "," + (interim ? "I" : "F") + "\r\n";
+    };
     int i = 0;
     for (const auto& n : names) {
         if (n.RecordType != 4) continue;
@@ -582,15 +593,14 @@ platform::Status MakeSampleSecurityDetails(const std::string& dataFolder,
             i % 5 == 0 ? "0" : platform::Format((i % 9 + 1) * 0.025, "0.00#");
         const std::string earnings =
             i % 7 == 0 ? "0" : platform::Format((i % 11 + 1) * 0.04, "0.00#");
-        text += n.TrimmedCode() + "," + platform::Upper(platform::Trim(n.Name)) + ",ORD," +
-                std::to_string(1000000 * (i * 37 % 900 + 10)) + ",0," + dividend + "," + earnings +
-                "," + (i % 2 ? "100" : "0") + ",2026101" + std::to_string(i % 10) + "," +
-                (i % 3 ? "Y" : "N") + "\r\n";
+        text += line(n.TrimmedCode(), platform::Upper(platform::Trim(n.Name)),
+                     1000000L * (i * 37 % 900 + 10), dividend, earnings, i % 2 ? "100" : "0",
+                     "2026101" + std::to_string(i % 10), i % 3 == 0);
     }
-    text += "PRN,PERENNIAL RESOURCES,ORD,52000000,0,0.01,0.05,100,20260901,Y\r\n";
+    text += line("PRN", "PERENNIAL RESOURCES", 52000000, "0.01", "0.05", "100", "20260901", false);
     // A row whose description runs past what a record keeps.
-    text += "ZLONG,A SECURITY WHOSE DESCRIPTION RUNS ON " + std::string(320, 'X') +
-            ",ORD,1000,0,0,0,0,20260101,N\r\n";
+    text += line("ZLONG", "A SECURITY WHOSE DESCRIPTION RUNS ON " + std::string(320, 'X'), 1000,
+                 "0", "0", "0", "20260101", false);
     platform::CreateFolder(inFolder);
     return platform::WriteFileAtomic(platform::ResolveIn(inFolder, "SecurityDetails.Asx.Stk"),
                                      text);

@@ -166,6 +166,10 @@ TEST_F(DesktopTest, CompanyDetailsOpenFromTheMenuWhenTheDetailsExist) {
     EXPECT_TRUE(t->item(krm, price)->text().isEmpty());
     w->findChild<QAction*>(QStringLiteral("mnYCP"))->trigger();
     EXPECT_EQ(w->table()->item(krm, price)->text().toStdString(), "1.41");
+    // Earnings 0.08 and dividend 0.05 in the 14th and 15th columns: 1.41 / 0.08 = 17.6 and
+    // 0.05 / 1.41 x 100 = 3.5.
+    EXPECT_EQ(w->table()->item(krm, price + 1)->text().toStdString(), "017.6");
+    EXPECT_EQ(w->table()->item(krm, price + 2)->text().toStdString(), "003.5");
 
     w->findChild<QAction*>(QStringLiteral("mnSize"))->trigger();
     QApplication::processEvents();
