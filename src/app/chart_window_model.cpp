@@ -1,5 +1,8 @@
 #include "app/chart_window_model.h"
 
+#include "maint/security_details.h"
+#include "store/price_file.h"
+
 #include "app/chart_window_tools.h"
 #include "chart/chart_tools.h"
 #include "platform/date_text.h"
@@ -56,6 +59,19 @@ ChartWindowModel::ChartWindowModel(Session& session, ChartState& state)
 
 std::string ChartWindowModel::Code() const {
     return platform::Trim(m_name.Code);
+}
+
+std::vector<std::string> ChartWindowModel::SecurityDetailsText() const {
+    const std::string& system = m_session.folders.SystemFolder;
+    if (!m_haveName || !maint::SecurityDetailsAvailable(m_session.download.DataService, system))
+        return {};
+    const auto details = maint::LookUpSecurityDetails(system, Code());
+    if (!details) return {};
+    double close = 0;
+    store::PriceFile f(store::PriceFile::PathFor(m_session.folders.DataFolder, Code()));
+    store::PriceRecord last;
+    if (f.Open() && f.Count() > 0 && f.Read(f.Count(), last)) close = last.Close;
+    return maint::DetailsTextBox(maint::ReadDetailsHeader(system), *details, close);
 }
 
 void ChartWindowModel::LeaveChart() {

@@ -67,6 +67,9 @@ public:
     bool haveSecurity() const { return m_haveName; }
     const store::NameRecord& current() const { return m_name; }
     std::string Code() const;
+    // The text box of the security's details (issue size, PE ratio, yield) when the details
+    // files are there and hold the security; empty otherwise.
+    std::vector<std::string> SecurityDetailsText() const;
 
     // Builds the chart in hand onto `area` (price chart and, when wanted, the panel). A build
     // that fails without having told the user shows its message under "Chart Display".

@@ -4,6 +4,7 @@
 
 #include "app/target_alerts.h"
 #include "intake/download_list.h"
+#include "maint/security_details.h"
 #include "platform/files.h"
 #include "platform/text.h"
 
@@ -26,6 +27,22 @@ intake::UpdateSettings UpdateSettingsOf(const Session& s) {
     return u;
 }
 
+std::string DownloadInFolder(const Session& session) {
+    const std::string in = platform::Trim(session.ini().Read("Download", "In"));
+    return in.empty() || in == platform::kUnknown ? std::string() : platform::FolderWithSlash(in);
+}
+
+intake::UpdateHooks UpdateHooksOf(Session& session) {
+    intake::UpdateHooks hooks;
+    const auto refresh = [&session](auto load) {
+        const auto r = load(session.folders.SystemFolder, DownloadInFolder(session));
+        if (!r.Status) session.dialogs().MsgBox(r.Status.message(), "Downloaded Data");
+    };
+    hooks.RefreshSecurityDetails = [refresh] { refresh(maint::RefreshSecurityDetails); };
+    hooks.RefreshSecurityProperties = [refresh] { refresh(maint::RefreshUKSecurityDetails); };
+    return hooks;
+}
+
 DownloadListForm::DownloadListForm(Session& session) : m_session(session) {}
 
 void DownloadListForm::Build() {
@@ -38,7 +55,9 @@ intake::RunResult DownloadListForm::Run(const std::string& item, bool more) {
     auto settings = UpdateSettingsOf(m_session);
     const intake::UpdateHost host{m_session.dialogs(), m_session.services().progress,
                                   &m_session.services().settings, &m_session.ini()};
-    const auto hooks = AdjustmentHooks(m_session, m_listHasNewItems);
+    intake::UpdateHooks hooks = UpdateHooksOf(m_session);
+    hooks.UpdateAdjustmentsList =
+        AdjustmentHooks(m_session, m_listHasNewItems).UpdateAdjustmentsList;
     const std::string today = m_session.services().clock.Today();
     return intake::RunDownloadUpdate(settings, host, hooks, item,
                                      intake::UpdateDateFromItem(item, today), more);

@@ -11,6 +11,12 @@ namespace kori::app {
 
 // The update's settings as the session holds them.
 intake::UpdateSettings UpdateSettingsOf(const Session& session);
+// The download program's In folder, where its tables wait ([Download] In), whatever the
+// service; empty when not set.
+std::string DownloadInFolder(const Session& session);
+// What a run hands on when it ends: the security details tables of the download program's In
+// folder are loaded (a failure is told under "Downloaded Data").
+intake::UpdateHooks UpdateHooksOf(Session& session);
 
 class DownloadListForm {
 public:

@@ -3,6 +3,7 @@
 #include "platform/date_text.h"
 #include "platform/files.h"
 #include "platform/number_format.h"
+#include "platform/text.h"
 #include "store/chart_list.h"
 #include "store/name_file.h"
 #include "store/price_file.h"
@@ -609,6 +610,47 @@ platform::Status MakeSampleBulletins(const std::string& dataFolder, const std::s
                             "BI,DLTWOZ,ASX.STK,0,Y,23NOV26,1,1\r\n"
                             "NI,KRMLZ6,ASX.OPT,0,Y,KAROO DEC PUT\r\n";
     return platform::WriteFileAtomic(platform::ResolveIn(inFolder, "23NOV26.Asx.Btn"), asx);
+}
+
+platform::Status MakeSampleSecurityDetails(const std::string& dataFolder,
+                                           const std::string& inFolder) {
+    std::vector<store::NameRecord> names;
+    store::NameFile nf(store::NameFile::PathIn(dataFolder));
+    if (auto st = nf.ReadAll(names); !st) return st;
+    std::string text =
+        "CODE,SHORTDESCRIPTION,SECURITYTYPE,FIRSTACTIVEDATE,FIRSTQUOTEDDATE,LASTQUOTEDATE,"
+        "SUSPENSIONSTARTDATE,SUSPENSIONENDDATE,TOTALCLASSISSUE,PARVALUE,PAIDUPVALUE,ASSETBACKING,"
+        "DIVENDRATEPERSHARE,EARNINGSPERSHARE,ANNUALDIVIDENDRATE,FRANKINGPERCENT,EXDATE,"
+        "DIVIDENTTYPE\r\n";
+    // Earnings and dividend stand in the 14th and 15th columns, where the details window
+    // reads them.
+    const auto line = [](const std::string& code, const std::string& name, long issue,
+                         const std::string& dividend, const std::string& earnings,
+                         const std::string& franking, const std::string& exDate, bool interim) {
+        return code + "," + name + ",ORD,20100104,20100105,20261120,,," + std::to_string(issue) +
+               ",0,0,0," + dividend + "," + earnings + "," + dividend + "," + franking + "," +
+               exDate + "," + (interim ? "I" : "F") + "\r\n";
+    };
+    int i = 0;
+    for (const auto& n : names) {
+        if (n.RecordType != 4) continue;
+        ++i;
+        // Every fifth pays nothing and every seventh earns nothing: their figures show "n/a".
+        const std::string dividend =
+            i % 5 == 0 ? "0" : platform::Format((i % 9 + 1) * 0.025, "0.00#");
+        const std::string earnings =
+            i % 7 == 0 ? "0" : platform::Format((i % 11 + 1) * 0.04, "0.00#");
+        text += line(n.TrimmedCode(), platform::Upper(platform::Trim(n.Name)),
+                     1000000L * (i * 37 % 900 + 10), dividend, earnings, i % 2 ? "100" : "0",
+                     "2026101" + std::to_string(i % 10), i % 3 == 0);
+    }
+    text += line("PRN", "PERENNIAL RESOURCES", 52000000, "0.01", "0.05", "100", "20260901", false);
+    // A row whose description runs past what a record keeps.
+    text += line("ZLONG", "A SECURITY WHOSE DESCRIPTION RUNS ON " + std::string(320, 'X'), 1000,
+                 "0", "0", "0", "20260101", false);
+    platform::CreateFolder(inFolder);
+    return platform::WriteFileAtomic(platform::ResolveIn(inFolder, "SecurityDetails.Asx.Stk"),
+                                     text);
 }
 
 } // namespace kori::app

@@ -31,6 +31,12 @@ platform::Status MakeSampleDayFiles(const std::string& dataFolder,
                                     const std::string& downloadFolder,
                                     std::vector<std::string>& made);
 
+// The download program's table of security details for the sample's securities of record
+// type 4, in `inFolder` as SecurityDetails.Asx.Stk: with a row for "PRN" and one line longer
+// than a details record holds. Invented figures, like the prices.
+platform::Status MakeSampleSecurityDetails(const std::string& dataFolder,
+                                           const std::string& inFolder);
+
 // The bundle service's layout: a folder a market segment below `rootFolder` (the stocks are the
 // data folder itself), each with its own Names.dat and price files, their eight paths in the
 // order of ChtPaths.lst, and the next trading day's bundle waiting in `downloadFolder`.

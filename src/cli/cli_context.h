@@ -61,6 +61,7 @@ void AddScaleCommand(CLI::App& app, CliContext& ctx);
 void AddIndicatorCommand(CLI::App& app, CliContext& ctx);
 void AddUpdateCommand(CLI::App& app, CliContext& ctx);
 void AddTargetsCommand(CLI::App& app, CliContext& ctx);
+void AddDetailsCommand(CLI::App& app, CliContext& ctx);
 void AddEntryCommand(CLI::App& app, CliContext& ctx);
 void AddImportCommand(CLI::App& app, CliContext& ctx);
 // scan1, scan2, scan3, scan6, stats, adtotals.

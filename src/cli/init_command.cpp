@@ -98,6 +98,8 @@ std::string BuildRoot(app::Session& session, bool sample, int service) {
     session.download.In = in;
     session.download.Out = out;
     session.adjustments.Divs = 2;
+    // The details table waits in the same In folder.
+    if (st = app::MakeSampleSecurityDetails(f.DataFolder, in); !st) throw CliError{st.message()};
     // The sample's charts keep their volume bars inside the volume panel.
     auto defaults = chart::LoadChartDefaults(session.ini());
     defaults.LimitVolumeHeight = true;

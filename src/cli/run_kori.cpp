@@ -30,6 +30,7 @@ int RunKori(int argc, const char* const* argv, std::ostream& out, std::ostream& 
     AddIndicatorCommand(app, ctx);
     AddUpdateCommand(app, ctx);
     AddTargetsCommand(app, ctx);
+    AddDetailsCommand(app, ctx);
     AddEntryCommand(app, ctx);
     AddImportCommand(app, ctx);
     AddScanCommands(app, ctx);

@@ -112,7 +112,9 @@ void AddUpdateCommand(CLI::App& app, CliContext& ctx) {
         intake::UpdateHost host{dialogs, session.services().progress, &session.services().settings,
                                 &session.ini()};
         bool listHasNewItems = false;
-        const auto hooks = app::AdjustmentHooks(session, listHasNewItems);
+        intake::UpdateHooks hooks = app::UpdateHooksOf(session);
+        hooks.UpdateAdjustmentsList =
+            app::AdjustmentHooks(session, listHasNewItems).UpdateAdjustmentsList;
         const std::string today = session.services().clock.Today();
 
         json files = json::array();

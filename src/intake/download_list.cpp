@@ -158,7 +158,12 @@ std::string UpdateDateFromItem(std::string_view item, const std::string& today) 
     const platform::CivilDate date{(yy < 20 ? 2000 : 1900) + yy, month, day};
     const std::string text = platform::DateText(date);
     // A name that does not read as a calendar date dates its records today.
-    return platform::IsValidDateText(text) ? text : today;
+    if (!platform::IsValidDateText(text)) return today;
+    return platform::DateText({ShortDateYear(yy), month, day});
+}
+
+int ShortDateYear(int yy) {
+    return yy + (yy < 30 ? 2000 : 1900);
 }
 
 } // namespace kori::intake

@@ -24,8 +24,13 @@ std::vector<std::string> BuildDownloadFileList(const std::string& downloadFolder
                                                std::string_view internetFormat,
                                                platform::Dialogs& dialogs);
 
-// The update date of a list item as "yyyymmdd": a trimmed item of 9 characters is read as
-// DDMMMYY with years below 20 in this century; anything else gives `today`.
+// The year of a two-digit year in a "d/m/yy" date as it is read back: below 30 in this century.
+int ShortDateYear(int yy);
+
+// The update date of a list item as "yyyymmdd"; anything but a trimmed item of 9 characters
+// (DDMMMYY plus its extension) gives `today`. The name is taken as a calendar date with years
+// below 20 in this century, but the date is held as "d/m/yy" and so read back as every other
+// short date is (an option's expiry among them): a 2026 file dates its run 2026, not 1926.
 std::string UpdateDateFromItem(std::string_view item, const std::string& today);
 
 } // namespace kori::intake

@@ -1,5 +1,7 @@
 #include "intake/download_update.h"
 
+#include "intake/download_list.h"
+
 #include "platform/date_text.h"
 #include "platform/files.h"
 #include "platform/text.h"
@@ -79,19 +81,40 @@ double DateNumber(std::string_view date) {
 }
 
 // The first `count` records of a price file as bytes, in one read.
-bool ReadRecords(const fs::path& path, int count, std::string& bytes) {
-    bytes.assign(static_cast<std::size_t>(count) * 50, '\0');
-    const int fd = ::open(path.c_str(), O_RDONLY | O_CLOEXEC);
-    if (fd < 0) return false;
-    std::size_t done = 0;
-    while (done < bytes.size()) {
-        const ssize_t n = ::read(fd, bytes.data() + done, bytes.size() - done);
-        if (n <= 0) break;
-        done += static_cast<std::size_t>(n);
+// The records of a price file from record `From` to the last, read further back on demand: an
+// insert near the end reads and rewrites only the part from its place on.
+struct FileTail {
+    const fs::path& Path;
+    int Count;
+    int From;          // 1-based; Count + 1 while nothing is read
+    std::string Bytes; // records From..Count
+
+    // Reads back to record `n` (at least doubling what is held, so a long walk reads the file
+    // a few times at most). False on a read error.
+    bool Reach(int n) {
+        if (n >= From || Count == 0) return true;
+        const int held = Count - From + 1;
+        const int start = std::max(1, std::min(n, From - std::max(held, 64)));
+        std::string more(static_cast<std::size_t>(From - start) * 50, '\0');
+        const int fd = ::open(Path.c_str(), O_RDONLY | O_CLOEXEC);
+        if (fd < 0) return false;
+        std::size_t done = 0;
+        const off_t at = static_cast<off_t>(start - 1) * 50;
+        while (done < more.size()) {
+            const ssize_t r =
+                ::pread(fd, more.data() + done, more.size() - done, at + static_cast<off_t>(done));
+            if (r <= 0) break;
+            done += static_cast<std::size_t>(r);
+        }
+        ::close(fd);
+        if (done != more.size()) return false;
+        Bytes.insert(0, more);
+        From = start;
+        return true;
     }
-    ::close(fd);
-    return done == bytes.size();
-}
+    // Offset in Bytes of record `n` (held).
+    std::size_t At(int n) const { return static_cast<std::size_t>(n - From) * 50; }
+};
 
 std::string Right(std::string_view s, std::size_t n) {
     return std::string(s.size() > n ? s.substr(s.size() - n) : s);
@@ -115,7 +138,7 @@ std::optional<std::int32_t> ShortDateSerial(std::string_view text) {
     const int day = static_cast<int>(Val(t.substr(0, first)));
     const int month = static_cast<int>(Val(t.substr(first + 1, second - first - 1)));
     int year = static_cast<int>(Val(t.substr(second + 1)));
-    if (year < 100) year += year < 30 ? 2000 : 1900;
+    if (year < 100) year = ShortDateYear(year);
     return platform::DaySerial(platform::DateText({year, month, day}));
 }
 
@@ -430,26 +453,28 @@ bool DownloadRun::ApplyDownloadRecord(const DownloadLine& d, const std::string& 
     const bool correctVolume = !target.Options && d.Spare != 0;
     const bool rerunLevels = m_recordType == 3 && searched;
 
-    // The file's bytes, read only when the record does not simply go on the end.
-    std::string bytes;
-    bool haveBytes = false;
-    auto readBytes = [&]() -> bool {
-        if (haveBytes) return true;
-        if (!ReadRecords(path, count, bytes)) return Fail("Cannot read " + path.string());
-        haveBytes = true;
-        return true;
+    // The file's records from where the new one goes, read only when it does not simply go on
+    // the end.
+    FileTail tail{path, count, count + 1, {}};
+    bool readFailed = false;
+    auto reach = [&](int n) {
+        if (!tail.Reach(n)) readFailed = true;
+        return !readFailed;
     };
-    auto dateAt = [&](int n) { return DateNumber({bytes.data() + (n - 1) * 50, 8}); };
+    auto dateAt = [&](int n) {
+        return reach(n) ? DateNumber({tail.Bytes.data() + tail.At(n), 8}) : 0.0;
+    };
+    auto cannotRead = [&] { return Fail("Cannot read " + path.string()); };
 
     double level = 0; // the running advance/decline total
     if (m_recordType == 3 && count > 0) {
-        if (!readBytes()) return false;
-        level = PriceRecord::Decode(bytes.data() + (count - 1) * 50).Close;
+        if (!reach(count)) return cannotRead();
+        level = PriceRecord::Decode(tail.Bytes.data() + tail.At(count)).Close;
     }
     InsertPosition at{count + 1, false};
     if (searched && count > 0) {
-        if (!readBytes()) return false;
         at = FindInsertPosition(count, dateAt, DateNumber(d.Date), m_state);
+        if (readFailed) return cannotRead();
     }
     if (!at.Overwrite && count >= store::kMaxRecords) {
         const std::string text = path.filename().string() +
@@ -486,8 +511,10 @@ bool DownloadRun::ApplyDownloadRecord(const DownloadLine& d, const std::string& 
         ++seg.Records;
         return true;
     }
-    if (!readBytes()) return false;
-    const auto pos = static_cast<std::size_t>(at.Position - 1) * 50;
+    // From the record before the new one: the volume correction and the running level read it.
+    if (count > 0 && !reach(std::max(1, std::min(count, at.Position - 1)))) return cannotRead();
+    std::string& bytes = tail.Bytes;
+    const std::size_t pos = tail.At(at.Position);
     if (at.Overwrite)
         bytes.replace(pos, 50, encoded.data(), encoded.size());
     else
@@ -499,9 +526,9 @@ bool DownloadRun::ApplyDownloadRecord(const DownloadLine& d, const std::string& 
         const auto b = before.Encode();
         bytes.replace(pos - 50, 50, b.data(), b.size());
     }
-    const std::size_t records = bytes.size() / 50;
+    const std::size_t records = static_cast<std::size_t>(tail.From - 1) + bytes.size() / 50;
     if (rerunLevels && records > 1) {
-        double running = pos > 0 ? PriceRecord::Decode(bytes.data() + pos - 50).Close : 0;
+        double running = at.Position > 1 ? PriceRecord::Decode(bytes.data() + pos - 50).Close : 0;
         for (std::size_t at50 = pos; at50 < bytes.size(); at50 += 50) {
             auto r = PriceRecord::Decode(bytes.data() + at50);
             r.Close = static_cast<float>(running + r.High - r.Low);
@@ -510,7 +537,8 @@ bool DownloadRun::ApplyDownloadRecord(const DownloadLine& d, const std::string& 
             bytes.replace(at50, 50, b.data(), b.size());
         }
     }
-    if (auto s = platform::WriteFileAtomic(path, bytes); !s) return Fail(s.message());
+    const auto keep = static_cast<std::uint64_t>(tail.From - 1) * 50;
+    if (auto s = platform::ReplaceFileFrom(path, keep, bytes); !s) return Fail(s.message());
     ++seg.Records;
     return true;
 }

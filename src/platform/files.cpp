@@ -8,8 +8,10 @@
 #include <cstring>
 #include <fcntl.h>
 #include <fstream>
+#include <linux/fs.h>
 #include <optional>
 #include <sstream>
+#include <sys/ioctl.h>
 #include <sys/stat.h>
 #include <system_error>
 #include <unistd.h>
@@ -275,6 +277,83 @@ Status WriteFileAtomic(const fs::path& path, std::string_view content, const Scr
         }
     }
     if (auto s = RenameOver(scratch, target, target); !s) return s;
+    if (!g_deferSync && !SyncFolder(folder))
+        return Status::Error(Cannot(target, "the folder could not be synced"));
+    return Status::Ok();
+}
+
+namespace {
+
+// The first `keep` bytes of `in` into the empty `out`. Whole blocks are shared with the old
+// file where the file system can clone a range (no data written); the rest, or all of it where
+// it cannot, is copied with plain reads and writes (an in-kernel copy is no faster there).
+bool CopyPrefix(int in, int out, std::uint64_t keep, std::uint64_t blockSize) {
+    std::uint64_t done = 0;
+    if (const std::uint64_t whole = keep / blockSize * blockSize; whole > 0) {
+        file_clone_range range{};
+        range.src_fd = in;
+        range.src_length = whole;
+        if (::ioctl(out, FICLONERANGE, &range) == 0) done = whole;
+    }
+    std::string buffer(std::size_t{1} << 16, '\0');
+    while (done < keep) {
+        const auto chunk =
+            static_cast<std::size_t>(std::min<std::uint64_t>(keep - done, buffer.size()));
+        const auto at = static_cast<off_t>(done);
+        const ssize_t n = ::pread(in, buffer.data(), chunk, at);
+        if (n <= 0 || ::pwrite(out, buffer.data(), static_cast<std::size_t>(n), at) != n)
+            return false;
+        done += static_cast<std::uint64_t>(n);
+    }
+    return true;
+}
+
+} // namespace
+
+Status ReplaceFileFrom(const fs::path& path, std::uint64_t keep, std::string_view tail) {
+    const fs::path target = FollowLinks(ResolvePath(path));
+    bool exists = false;
+    mode_t mode = 0;
+    if (auto refusal = RefusalFor(target, exists, mode)) return Status::Error(*refusal);
+    if (!exists) return WriteFileAtomic(path, tail); // nothing to keep
+    const int in = ::open(target.c_str(), O_RDONLY | O_CLOEXEC);
+    if (in < 0) return Status::Error(Cannot(target, std::strerror(errno)));
+    struct stat st {};
+    if (::fstat(in, &st) != 0 || static_cast<std::uint64_t>(st.st_size) < keep) {
+        ::close(in);
+        return Status::Error(Cannot(target, "the file is shorter than the part to keep"));
+    }
+    const fs::path folder = target.has_parent_path() ? target.parent_path() : fs::path(".");
+    fs::path scratch;
+    const int out = CreateUnique(folder, target.filename().string() + ".kori-new", scratch);
+    if (out < 0) {
+        ::close(in);
+        return Status::Error(Cannot(target, std::strerror(errno)));
+    }
+    (void)::fchmod(out, mode);
+    // A failure injected by the tests counts the kept bytes as written content too.
+    const std::size_t total = static_cast<std::size_t>(keep) + tail.size();
+    const std::size_t limit = AllowedBytes(total);
+    Status s;
+    const auto blockSize = static_cast<std::uint64_t>(st.st_blksize > 0 ? st.st_blksize : 4096);
+    if (!CopyPrefix(in, out, std::min<std::uint64_t>(keep, limit), blockSize))
+        s = Status::Error(Cannot(target, std::strerror(errno)));
+    const std::size_t tailLimit = limit > keep ? limit - static_cast<std::size_t>(keep) : 0;
+    if (s && (::lseek(out, static_cast<off_t>(keep), SEEK_SET) < 0 ||
+              !WriteAll(out, tail.data(), std::min(tail.size(), tailLimit))))
+        s = Status::Error(Cannot(target, std::strerror(errno)));
+    if (s) g_writeUsed += static_cast<long long>(std::min(total, limit));
+    if (s && limit < total) s = Status::Error(Cannot(target, "write failed"));
+    if (s && !g_deferSync && ::fsync(out) != 0)
+        s = Status::Error(Cannot(target, std::strerror(errno)));
+    ::close(in);
+    if (::close(out) != 0 && s) s = Status::Error(Cannot(target, std::strerror(errno)));
+    if (!s) {
+        std::error_code ec;
+        fs::remove(scratch, ec);
+        return s;
+    }
+    if (auto r = RenameOver(scratch, target, target); !r) return r;
     if (!g_deferSync && !SyncFolder(folder))
         return Status::Error(Cannot(target, "the folder could not be synced"));
     return Status::Ok();

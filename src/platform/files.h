@@ -49,6 +49,13 @@ struct ScratchNames {
 Status WriteFileAtomic(const fs::path& path, std::string_view content,
                        const ScratchNames& names = {});
 
+// The same gate for a rewrite that keeps the first `keep` bytes of the existing file and puts
+// `tail` after them (a record inserted near the end of a long file). The new file is still made
+// whole beside the old one and renamed over it; the whole blocks of its kept part share the old
+// file's blocks where the file system can clone a range, and are copied where it cannot. `keep`
+// past the end of the file is refused.
+Status ReplaceFileFrom(const fs::path& path, std::uint64_t keep, std::string_view tail);
+
 // Appends bytes in one write (a whole record goes in or nothing does).
 Status AppendToFile(const fs::path& path, std::string_view bytes);
 

@@ -1,4 +1,5 @@
 // The day bundle split by market, and runs cut short by a failing disk.
+#include "intake/download_list.h"
 #include "intake_test_library.h"
 
 #include "platform/settings_store.h"
@@ -52,7 +53,8 @@ TEST(BundleUpdate, SegmentsGoToTheirFoldersInTableOrder) {
         calls.push_back(f + "|" + stem);
     };
     lib.hooks.RefreshSecurityDetails = [&] { calls.push_back("details"); };
-    const auto r = lib.Run("04JAN24.d");
+    // Dated as the update list dates it, so an option of 2024 expires in a run of 2024.
+    const auto r = lib.Run("04JAN24.d", intake::UpdateDateFromItem("04JAN24.d", "20991231"));
 
     ASSERT_EQ(r.Files.size(), 3u);
     EXPECT_EQ(r.Files[0].Segment, "INDICES ");

@@ -72,9 +72,13 @@ TEST(DownloadList, AnUnknownFormLeavesTheListEmpty) {
     EXPECT_EQ(intake::BuildDownloadFileList(root.folder(), 4, "DDMMMYY.D", dialogs).size(), 1u);
 }
 
-TEST(DownloadList, UpdateDateHasItsOwnPivotOfTwenty) {
+TEST(DownloadList, UpdateDateIsReadBackLikeEveryShortDate) {
     EXPECT_EQ(intake::UpdateDateFromItem("15JAN19.D", "20261120"), "20190115");
-    EXPECT_EQ(intake::UpdateDateFromItem(" 15jan20.d ", "20261120"), "19200115");
+    EXPECT_EQ(intake::UpdateDateFromItem(" 15jan20.d ", "20261120"), "20200115");
+    EXPECT_EQ(intake::UpdateDateFromItem("23NOV26.D", "20261120"), "20261123");
+    EXPECT_EQ(intake::UpdateDateFromItem("02MAR30.D", "20261120"), "19300302");
+    EXPECT_EQ(intake::UpdateDateFromItem("29FEB00.D", "20261120"), "20000229");
+    EXPECT_EQ(intake::UpdateDateFromItem("29FEB27.D", "20261120"), "20261120") << "no such day";
     EXPECT_EQ(intake::UpdateDateFromItem("15JAN19.DX", "20261120"), "20261120");
     EXPECT_EQ(intake::UpdateDateFromItem("45XYZ19.D", "20261120"), "20261120");
 }

@@ -1,5 +1,6 @@
 // The update from a day file, worked by hand on libraries of a few records.
 #include "intake_test_library.h"
+#include "platform/date_text.h"
 
 #include "intake/download_list.h"
 #include "platform/text.h"
@@ -144,6 +145,39 @@ TEST(DownloadUpdate, InsertGoesIntoDateOrder) {
     ASSERT_EQ(bbb.size(), 4u);
     EXPECT_EQ(bbb[0].Date, "20240104"); // ahead of record 1, as the rule has it
     EXPECT_FLOAT_EQ(bbb[0].Close, 5);
+}
+
+// Far back in a long file: the search reads back over many records, and the records on both
+// sides of the new one, the volume correction and the file's head all come out right.
+TEST(DownloadUpdate, InsertFarBackInALongFileKeepsEveryOtherRecord) {
+    IntakeLibrary lib;
+    lib.Names({NameOf("LNG")});
+    std::vector<store::PriceRecord> old;
+    const auto first = *platform::DaySerial("20200101");
+    std::vector<std::string> dates;
+    for (int i = 0; i < 300; ++i) { // every second day
+        dates.push_back(*platform::DateTextFromSerial(first + 2 * i));
+        old.push_back(Rec(dates.back().c_str(), 1, 2, 0.5f, static_cast<float>(i), i));
+    }
+    lib.Prices("LNG", old);
+    const std::string day = *platform::DateTextFromSerial(first + 2 * 19 + 1); // after the 20th
+    lib.DayFile("02FEB20.D", "LNG," + day + ",7,8,6,7.5,77,1234\n");
+    lib.dialogs.QueueAnswer(Answer::Ok);
+    const auto r = lib.Run("02FEB20.D", day);
+    ASSERT_EQ(r.Files.at(0).State, FileState::Insert);
+    const auto now = lib.Read("LNG");
+    ASSERT_EQ(now.size(), 301u);
+    for (int i = 0; i < 19; ++i) {
+        EXPECT_EQ(now[i].Date, dates[i]) << i;
+        EXPECT_EQ(now[i].Volume, i) << i;
+    }
+    EXPECT_EQ(now[19].Date, dates[19]);
+    EXPECT_EQ(now[19].Volume, 1234) << "the day before takes the corrected volume";
+    ExpectRecord(now[20], day.c_str(), 7, 8, 6, 7.5f, 77);
+    for (int i = 20; i < 300; ++i) {
+        EXPECT_EQ(now[i + 1].Date, dates[i]) << i;
+        EXPECT_FLOAT_EQ(now[i + 1].Close, static_cast<float>(i)) << i;
+    }
 }
 
 TEST(FindInsertPosition, FollowsTheTable) {

@@ -6,6 +6,8 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
+#include <cstdlib>
+#include <fstream>
 #include <sys/stat.h>
 
 using namespace kori::platform;
@@ -174,4 +176,58 @@ TEST(Files, AFolderIsMadeOnlyInsideOneThatExists) {
     // The install root and folders the user chose are made whole.
     EXPECT_TRUE(CreateFolderPath(root.path() / "a" / "b"));
     EXPECT_TRUE(std::filesystem::is_directory(root.path() / "a" / "b"));
+}
+
+namespace {
+
+// A rewrite that keeps the head of a file, in `folder`: the content, the mode, a link written
+// through, a kept part past the end refused, and an injected failure in the kept part and in the
+// tail each leaving the old file whole with no scratch file behind.
+void CheckReplaceFrom(const std::filesystem::path& folder) {
+    const auto p = folder / "BHP.WDT";
+    std::string old(200000, '\0');
+    for (std::size_t i = 0; i < old.size(); ++i)
+        old[i] = static_cast<char>('a' + i % 26);
+    { std::ofstream(p, std::ios::binary) << old; }
+    std::filesystem::permissions(p, std::filesystem::perms(0640));
+    ASSERT_TRUE(ReplaceFileFrom(p, 150000, "NEW-TAIL").ok());
+    EXPECT_EQ(ReadWholeFile(p).value_or(""), old.substr(0, 150000) + "NEW-TAIL");
+    EXPECT_EQ(std::filesystem::status(p).permissions(), std::filesystem::perms(0640));
+    EXPECT_EQ(FilesIn(folder), std::vector<std::string>{"BHP.WDT"});
+
+    const std::string now = old.substr(0, 150000) + "NEW-TAIL";
+    EXPECT_FALSE(ReplaceFileFrom(p, now.size() + 1, "x").ok()) << "more kept than there is";
+    for (const long long at : {1000LL, 150003LL}) {
+        ScopedWriteFailure fail(at);
+        EXPECT_FALSE(ReplaceFileFrom(p, 150000, "OTHER-TAIL").ok()) << at;
+    }
+    EXPECT_EQ(ReadWholeFile(p).value_or(""), now);
+    EXPECT_EQ(FilesIn(folder), std::vector<std::string>{"BHP.WDT"});
+
+    const auto link = folder / "link.WDT";
+    std::filesystem::create_symlink("BHP.WDT", link);
+    ASSERT_TRUE(ReplaceFileFrom(link, 3, "Z").ok());
+    EXPECT_TRUE(std::filesystem::is_symlink(link));
+    EXPECT_EQ(ReadWholeFile(p).value_or(""), "abcZ");
+    ASSERT_TRUE(ReplaceFileFrom(p, 0, "").ok());
+    EXPECT_EQ(std::filesystem::file_size(p), 0u);
+}
+
+} // namespace
+
+TEST(Files, ReplaceFromKeepsTheHeadAndStaysWholeOnFailure) {
+    TempRoot root;
+    CheckReplaceFrom(root.path());
+}
+
+// The same where the file system shares the kept part's blocks (a folder on XFS or Btrfs, named
+// by KORI_CLONE_FOLDER).
+TEST(Files, ReplaceFromByCloneKeepsTheHeadAndStaysWholeOnFailure) {
+    const char* dir = std::getenv("KORI_CLONE_FOLDER");
+    if (!dir) GTEST_SKIP() << "KORI_CLONE_FOLDER names no folder on a cloning file system";
+    const auto folder = std::filesystem::path(dir) / "replace-from-test";
+    std::filesystem::remove_all(folder);
+    std::filesystem::create_directories(folder);
+    CheckReplaceFrom(folder);
+    std::filesystem::remove_all(folder);
 }

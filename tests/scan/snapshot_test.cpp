@@ -94,8 +94,9 @@ TEST(Snapshot, OscillatorsAreTheChartsOwnOnTheSameBars) {
     const auto macd = osc::ComputeOscillator("MACD", series, settings.Oscillators, {});
     ASSERT_TRUE(macd);
     const auto last = macd->Row(macd->RowCount() - 1);
-    ASSERT_TRUE(row->MacdAboveSignal && last[4] && last[5]);
-    EXPECT_EQ(*row->MacdAboveSignal, *last[4] > *last[5]);
+    ASSERT_EQ(macd->columns, (std::vector<std::string>{"ema1", "ema2", "macd", "signal"}));
+    ASSERT_TRUE(row->MacdAboveSignal && last[2] && last[3]);
+    EXPECT_EQ(*row->MacdAboveSignal, *last[2] > *last[3]);
 }
 
 TEST(Snapshot, TheYearIsTheLast260BarsAndItsExtremesAreNewOnlyWhenPassed) {

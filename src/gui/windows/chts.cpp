@@ -147,6 +147,10 @@ Chts::Chts(app::Session& session, app::ChartState& state, QWidget* parent)
         m_status->addWidget(pane);
         m_panes.push_back(pane);
     }
+    m_details = new QLabel(m_status);
+    m_details->setObjectName(QStringLiteral("txtDetails"));
+    m_details->hide();
+    m_status->addPermanentWidget(m_details);
     layout->addWidget(m_status);
 
     connect(m_picture1, &ChartView::ChartMouseMove, this, &Chts::MouseMove);
@@ -350,6 +354,11 @@ bool Chts::RebuildKeeping(bool keepToolLines) {
     if (m_model.splitShown()) title += "   /   " + m_state.Split.Lower()->Name.TrimmedCode();
     setWindowTitle(Q(title));
     m_singleChart->setEnabled(m_state.Split.Chosen());
+    QString details;
+    for (const auto& line : m_model.SecurityDetailsText())
+        details += (details.isEmpty() ? QString() : QStringLiteral("   ")) + Q(line);
+    m_details->setText(details);
+    m_details->setVisible(!details.isEmpty());
     if (m_koriScroll->isVisible()) {
         m_koriScroll->blockSignals(true);
         m_koriScroll->setRange(1, std::max(1, m_model.PriceRecordCount()));

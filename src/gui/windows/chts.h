@@ -144,6 +144,7 @@ private:
     QScrollBar* m_koriScroll;
     QStatusBar* m_status;
     std::vector<QLabel*> m_panes;
+    QLabel* m_details; // the security's issue size, PE ratio and yield, when known
     QTimer* m_autoTimer;
     QTimer* m_resizeTimer; // a resized area gets a chart of its new size
 };

@@ -1,5 +1,7 @@
 #include "gui/windows/main_window.h"
 
+#include "maint/security_details.h"
+
 #include "app/window_position.h"
 #include "gui/services/qt_progress.h"
 #include "gui/widgets/window_place.h"
@@ -101,7 +103,7 @@ app::MenuConditions MainWindow::Conditions() const {
     const std::string sys = m_session.folders.SystemFolder;
     c.MaxScanPresent = platform::FileExists(platform::ResolveIn(sys, "KoriMaxScan.exe"));
     c.MMAScanPresent = platform::FileExists(platform::ResolveIn(sys, "KoriMMA.EXE"));
-    c.SecurityDetailsPresent = false; // the company details window is not in this build
+    c.SecurityDetailsPresent = maint::SecurityDetailsAvailable(c.DataService, sys);
     return c;
 }
 

@@ -4,6 +4,8 @@
 #include "gui/windows/chart_windows.h"
 #include "gui/windows/chk_dta.h"
 #include "gui/windows/dl_list.h"
+#include "gui/windows/download_settings.h"
+#include "gui/windows/fundmnt.h"
 #include "gui/windows/main_window.h"
 #include "gui/windows/name_data.h"
 #include "gui/windows/scan_windows.h"
@@ -78,7 +80,6 @@ void RegisterToolWindows(MainWindow& main) {
     Register<ChkDta>(main, "ChkDta", ChartsOf(main));
     Register<TextData>(main, "TextData");
     Register<TextFull>(main, "TextFull");
-    Register<DLList>(main, "DLList");
     RegisterScan<ChtScan1>(main, "chtScan1");
     RegisterScan<ChtScan2>(main, "ChtScan2");
     RegisterScan<ChtScan3>(main, "ChtScan3");
@@ -87,6 +88,36 @@ void RegisterToolWindows(MainWindow& main) {
     RegisterScan<ADTotals>(main, "ADTotals");
     RegisterCompanion(main, "KoriMaxScan", "KoriMaxScan.exe");
     RegisterCompanion(main, "KoriMMA", "KoriMMA.EXE");
+    main.SetAction("ModDetails", [&main] {
+        ShowOnce(main, "ModDetails", [&main] { return new ModDetails(main.session(), &main); });
+    });
+    main.SetAction("DLList", [&main] {
+        switch (app::WhatDownloadUpdateOpens(main.session())) {
+        case app::DownloadUpdateOpens::List:
+            ShowOnce(main, "DLList",
+                     [&main] { return new DLList(main.session(), main.progress(), &main); });
+            break;
+        case app::DownloadUpdateOpens::Settings:
+            main.Trigger("mnuDDetails");
+            break;
+        case app::DownloadUpdateOpens::Nothing:
+            break;
+        }
+    });
+    // Without the details the window says so and does not open.
+    main.SetAction("Fundmnt", [&main] {
+        if (auto* open = main.findChild<Fundmnt*>()) {
+            open->raise();
+            return;
+        }
+        auto* w = new Fundmnt(main.session(), &main);
+        w->setAttribute(Qt::WA_DeleteOnClose);
+        if (!w->loaded()) {
+            delete w;
+            return;
+        }
+        w->open();
+    });
     Register<ChartBak>(main, "ChartBak", false);
     Register<ChartBak>(main, "ChartBak Restore", true);
     // The name-file check asks first, as its menu item says.
