@@ -3,6 +3,7 @@
 #include "synthetic_market.h"
 
 #include "platform/progress.h"
+#include "scan/snapshot.h"
 #include "store/security_walk.h"
 
 #include <benchmark/benchmark.h>
@@ -46,6 +47,22 @@ void BM_ForEachSecurity(benchmark::State& state) {
     }
 }
 BENCHMARK(BM_ForEachSecurity)->Unit(benchmark::kMillisecond)->UseRealTime();
+
+// The current snapshot of the whole market: the last 400 records of each file, three
+// oscillators, two averages and the year's range, on both cores.
+void BM_SnapshotWholeMarket(benchmark::State& state) {
+    const store::SecurityList list{bench::DefaultMarket(), 0};
+    platform::NullProgress progress;
+    const auto settings =
+        scan::SnapshotSettingsFrom(platform::IniFile(bench::DefaultMarket() + "Kori.ini"));
+    std::size_t rows = 0;
+    for (auto _ : state) {
+        const auto result = scan::TakeSnapshot(list, settings, progress);
+        rows = result.Rows.size();
+    }
+    state.counters["rows"] = static_cast<double>(rows);
+}
+BENCHMARK(BM_SnapshotWholeMarket)->Unit(benchmark::kMillisecond)->UseRealTime();
 
 } // namespace
 

@@ -8,10 +8,12 @@
 #include "app/osc_service.h"
 #include "chart/chart_defaults.h"
 #include "osc/osc_settings.h"
+#include "platform/date_text.h"
 #include "platform/number_format.h"
 #include "platform/text.h"
 #include "scan/chart_scans.h"
 #include "scan/cht_scan1.h"
+#include "scan/snapshot.h"
 #include "scan/statistics.h"
 #include "store/chart_list.h"
 #include "store/name_file.h"
@@ -406,6 +408,81 @@ void AddADTotals(CLI::App& app, CliContext& ctx) {
     });
 }
 
+// kori snapshot: each security's last day beside its oscillators, and the market's breadth.
+void AddSnapshot(CLI::App& app, CliContext& ctx) {
+    auto* cmd = app.add_subcommand("snapshot", "Each security's last day, oscillators and the "
+                                               "market's breadth");
+    struct Options {
+        std::string list = "full";
+        bool json = false, csv = false;
+    };
+    auto o = std::make_shared<Options>();
+    cmd->add_option("--list", o->list, "full, or a chart list letter");
+    cmd->add_flag("--json", o->json, "JSON output");
+    cmd->add_flag("--csv", o->csv, "The grid as CSV");
+    cmd->callback([&ctx, o] {
+        auto& session = ctx.OpenSession();
+        const store::SecurityList list{session.folders.DataFolder, ListLetter(o->list)};
+        const auto result = scan::TakeSnapshot(list, scan::SnapshotSettingsFrom(session.ini()),
+                                               session.services().progress);
+        if (!result.Status) throw CliError{result.Status.message()};
+        const auto& b = result.Market;
+        if (o->csv) {
+            ctx.out << scan::SnapshotCsv(result);
+        } else if (o->json) {
+            const auto number = [](std::optional<double> v) { return v ? json(*v) : json(); };
+            json rows = json::array();
+            for (const auto& r : result.Rows)
+                rows.push_back(
+                    {{"code", TextJson(r.Code)},
+                     {"name", TextJson(r.Name)},
+                     {"date", r.Date},
+                     {"close", r.Close},
+                     {"change", number(r.Change)},
+                     {"percent", number(r.ChangePercent)},
+                     {"volume_ratio", number(r.VolumeRatio)},
+                     {"rsi", number(r.Rsi)},
+                     {"stochastic_k", number(r.StochasticK)},
+                     {"macd_above_signal", r.MacdAboveSignal ? json(*r.MacdAboveSignal) : json()},
+                     {"above_average1", number(r.AboveAverage1)},
+                     {"above_average2", number(r.AboveAverage2)},
+                     {"year_high", r.YearHigh},
+                     {"year_low", r.YearLow},
+                     {"new_high", r.NewHigh},
+                     {"new_low", r.NewLow}});
+            json out = {{"breadth",
+                         {{"advances", b.Advances},
+                          {"declines", b.Declines},
+                          {"unchanged", b.Unchanged},
+                          {"new_highs", b.NewHighs},
+                          {"new_lows", b.NewLows}}},
+                        {"cancelled", result.Cancelled},
+                        {"rows", rows}};
+            ctx.out << out.dump(2) << "\n";
+        } else {
+            const auto cell = [](std::optional<double> v, const char* format) {
+                return v ? platform::Format(*v, format) : std::string("-");
+            };
+            ctx.out << Printf("%-6s %-10s %9s %8s %7s %6s %6s %5s %8s %8s\n", "Code", "Date",
+                              "Close", "Change%", "Vol/Av", "RSI", "%K", "MACD", "52wHigh",
+                              "52wLow");
+            for (const auto& r : result.Rows)
+                ctx.out << Printf(
+                    "%-6s %-10s %9s %8s %7s %6s %6s %5s %8s %8s\n", r.Code.c_str(),
+                    platform::DateTextToDisplay(r.Date).c_str(),
+                    platform::Format(r.Close, "0.000").c_str(),
+                    cell(r.ChangePercent, "0.00").c_str(), cell(r.VolumeRatio, "0.00").c_str(),
+                    cell(r.Rsi, "0.0").c_str(), cell(r.StochasticK, "0.0").c_str(),
+                    r.MacdAboveSignal ? (*r.MacdAboveSignal ? "above" : "below") : "-",
+                    platform::Format(r.YearHigh, "0.000").c_str(),
+                    platform::Format(r.YearLow, "0.000").c_str());
+            ctx.out << Printf("Advances %d, declines %d, unchanged %d, new highs %d, new lows %d\n",
+                              b.Advances, b.Declines, b.Unchanged, b.NewHighs, b.NewLows);
+        }
+        if (result.Cancelled) throw CliError{"Snapshot cancelled", 3};
+    });
+}
+
 } // namespace
 
 void AddScanCommands(CLI::App& app, CliContext& ctx) {
@@ -415,6 +492,7 @@ void AddScanCommands(CLI::App& app, CliContext& ctx) {
     AddScan6(app, ctx);
     AddStats(app, ctx);
     AddADTotals(app, ctx);
+    AddSnapshot(app, ctx);
 }
 
 } // namespace kori::cli
