@@ -102,6 +102,7 @@ std::vector<MenuItem> BuildMenuTree() {
                         Item("mnuMMAScan", "Chart Scan &4 - Multiple Moving Averages", "KoriMMA"),
                         Item("mnuAvCO", "Chart Scan &5 - Averages Crossover", "ChtScan6"),
                         Item("mnStats", "Market S&tatistics", "Statistics"),
+                        Item("mnuSnapshot", "Current &Snapshot", "Snapshot"),
                         Item("mnuTargets", "Price &Targets (Quoren Alerts)", "Targets", true)}));
     tops.push_back(Top("mnuHelp", "&Help",
                        {Item("mnSHlp", "KORI Charting Help", "Help"),

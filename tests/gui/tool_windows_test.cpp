@@ -6,6 +6,7 @@
 #include "gui/windows/chk_dta.h"
 #include "gui/windows/dl_list.h"
 #include "gui/windows/name_data.h"
+#include "gui/windows/snapshot.h"
 #include "gui/windows/text_data.h"
 #include "store/name_file.h"
 #include "store/price_file.h"
@@ -238,6 +239,45 @@ TEST_F(DesktopTest, BackupThenRestoreFromTheirMenuItems) {
     s.dialogs.QueueAnswer(platform::Answer::Yes);
     restore->Discard();
     EXPECT_TRUE(restore->form().Replaced().empty());
+}
+
+TEST_F(DesktopTest, SnapshotSortsByAColumnAndOpensTheChartOfARow) {
+    ASSERT_TRUE(main.Trigger("mnuSnapshot"));
+    QApplication::processEvents();
+    auto* snap = main.findChild<gui::Snapshot*>();
+    ASSERT_NE(snap, nullptr);
+    snap->Take();
+    const auto& result = snap->form().result();
+    ASSERT_GT(result.Rows.size(), 10u);
+    const auto& b = result.Market;
+    EXPECT_EQ(snap->breadth()->text().toStdString(),
+              "Advances " + std::to_string(b.Advances) + "   Declines " +
+                  std::to_string(b.Declines) + "   Unchanged " + std::to_string(b.Unchanged) +
+                  "   New highs " + std::to_string(b.NewHighs) + "   New lows " +
+                  std::to_string(b.NewLows));
+    EXPECT_EQ(static_cast<std::size_t>(snap->grid()->rowCount()), result.Rows.size());
+
+    // Change % (column 5) twice: largest first, rows without a figure still last.
+    snap->SortBy(5);
+    snap->SortBy(5);
+    std::vector<double> shown;
+    for (const auto& r : snap->form().result().Rows)
+        if (r.ChangePercent) shown.push_back(*r.ChangePercent);
+    EXPECT_TRUE(std::is_sorted(shown.rbegin(), shown.rend()));
+    const std::string top = snap->form().result().Rows[0].Code;
+    EXPECT_EQ(snap->grid()->item(0, 0)->text().toStdString(), top);
+
+    snap->grid()->setCurrentCell(0, 0);
+    snap->ShowChart();
+    QApplication::processEvents();
+    ASSERT_NE(chts(), nullptr);
+    EXPECT_EQ(chts()->model().Code(), top);
+
+    const auto csv = (s.root.path() / "snap.csv").string();
+    ASSERT_TRUE(snap->ExportCsv(csv));
+    const auto text = platform::ReadWholeFile(csv);
+    ASSERT_TRUE(text);
+    EXPECT_EQ(text->substr(text->find('\n') + 1, top.size() + 1), top + ",");
 }
 
 } // namespace

@@ -10,6 +10,7 @@
 #include "gui/windows/name_data.h"
 #include "gui/windows/scan_windows.h"
 #include "gui/windows/show_once.h"
+#include "gui/windows/snapshot.h"
 #include "gui/windows/stats_windows.h"
 #include "gui/windows/text_data.h"
 #include "platform/files.h"
@@ -118,6 +119,7 @@ void RegisterToolWindows(MainWindow& main) {
         }
         w->open();
     });
+    Register<Snapshot>(main, "Snapshot", ChartsOf(main));
     Register<ChartBak>(main, "ChartBak", false);
     Register<ChartBak>(main, "ChartBak Restore", true);
     // The name-file check asks first, as its menu item says.
