@@ -17,6 +17,9 @@
 #include <QListWidget>
 #include <QPushButton>
 #include <QRadioButton>
+#include <QTest>
+
+#include <sys/stat.h>
 
 namespace kori::test {
 namespace {
@@ -278,6 +281,31 @@ TEST_F(DesktopTest, SnapshotSortsByAColumnAndOpensTheChartOfARow) {
     const auto text = platform::ReadWholeFile(csv);
     ASSERT_TRUE(text);
     EXPECT_EQ(text->substr(text->find('\n') + 1, top.size() + 1), top + ",");
+}
+
+// The companion download program: left out until it is installed, then started with "AD"; when
+// it ends, the waiting day files are offered.
+TEST_F(DesktopTest, KoriDownloadStartsTheCompanionProgramAndOffersWhatItLeft) {
+    s.session.download.DataService = 1;
+    main.RebuildMenus();
+    EXPECT_FALSE(main.Trigger("mnuZEVOT")) << "not installed";
+
+    const std::string marker = s.root.folder() + "ran-with";
+    const std::string program = s.session.folders.SystemFolder + "KoriDL8.exe";
+    const std::string download = s.session.folders.DownloadFolder;
+    std::filesystem::create_directories(download);
+    ASSERT_TRUE(platform::WriteFileAtomic(program, "#!/bin/sh\necho \"$1\" > '" + marker +
+                                                       "'\n: > '" + download + "25NOV26.D'\n"));
+    ::chmod(program.c_str(), 0755);
+    gui::RegisterWindows(main);
+    main.RebuildMenus();
+    s.dialogs.QueueAnswer(platform::Answer::Cancel);
+    const auto shownBefore = s.dialogs.shown().size();
+    ASSERT_TRUE(main.Trigger("mnuZEVOT"));
+    EXPECT_TRUE(QTest::qWaitFor([&] { return s.dialogs.shown().size() > shownBefore; }, 10000));
+    EXPECT_EQ(platform::ReadWholeFile(marker).value_or(""), "AD\n");
+    ASSERT_GT(s.dialogs.shown().size(), shownBefore);
+    EXPECT_EQ(s.dialogs.shown().back().title, "Downloaded Data");
 }
 
 } // namespace

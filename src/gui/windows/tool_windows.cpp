@@ -1,5 +1,6 @@
 #include "gui/windows/tool_windows.h"
 
+#include "app/start_up.h"
 #include "gui/windows/chart_bak.h"
 #include "gui/windows/chart_windows.h"
 #include "gui/windows/chk_dta.h"
@@ -75,9 +76,34 @@ void RegisterCompanion(MainWindow& main, const char* opens, const char* program)
     });
 }
 
+// The companion download program, offered only when it is installed. When it ends, the days
+// it left waiting are offered as at start-up, and taken in through the update list.
+void RegisterDownloadProgram(MainWindow& main) {
+    const auto path = platform::ResolveIn(main.session().folders.SystemFolder, "KoriDL8.exe");
+    if (!platform::FileExists(path)) return;
+    main.SetAction("KoriDownload", [&main, path] {
+        auto* process = new QProcess(&main);
+        process->setObjectName(QStringLiteral("KoriDownload"));
+        process->setWorkingDirectory(QString::fromStdString(main.session().folders.SystemFolder));
+        QObject::connect(process, &QProcess::finished, &main, [&main, process] {
+            process->deleteLater();
+            if (app::OfferPendingUpdate(main.session())) main.Trigger("mnuModem");
+        });
+        QObject::connect(process, &QProcess::errorOccurred, &main,
+                         [&main, process, path](QProcess::ProcessError error) {
+                             if (error != QProcess::FailedToStart) return;
+                             process->deleteLater();
+                             main.session().dialogs().MsgBox("Cannot start " + path.string(),
+                                                             "Download");
+                         });
+        process->start(QString::fromStdString(path.string()), {QStringLiteral("AD")});
+    });
+}
+
 } // namespace
 
 void RegisterToolWindows(MainWindow& main) {
+    RegisterDownloadProgram(main);
     Register<ChkDta>(main, "ChkDta", ChartsOf(main));
     Register<TextData>(main, "TextData");
     Register<TextFull>(main, "TextFull");
