@@ -621,15 +621,16 @@ platform::Status MakeSampleSecurityDetails(const std::string& dataFolder,
         "CODE,SHORTDESCRIPTION,SECURITYTYPE,FIRSTACTIVEDATE,FIRSTQUOTEDDATE,LASTQUOTEDATE,"
         "SUSPENSIONSTARTDATE,SUSPENSIONENDDATE,TOTALCLASSISSUE,PARVALUE,PAIDUPVALUE,ASSETBACKING,"
         "DIVENDRATEPERSHARE,EARNINGSPERSHARE,ANNUALDIVIDENDRATE,FRANKINGPERCENT,EXDATE,"
-        "DIVIDENTTYPE\r\n";
+        "DIVIDENTTYPE,GICSSECTORCODE\r\n";
     // Earnings and dividend stand in the 14th and 15th columns, where the details window
     // reads them.
     const auto line = [](const std::string& code, const std::string& name, long issue,
                          const std::string& dividend, const std::string& earnings,
-                         const std::string& franking, const std::string& exDate, bool interim) {
+                         const std::string& franking, const std::string& exDate, bool interim,
+                         const std::string& gics = "") {
         return code + "," + name + ",ORD,20100104,20100105,20261120,,," + std::to_string(issue) +
                ",0,0,0," + dividend + "," + earnings + "," + dividend + "," + franking + "," +
-               exDate + "," + (interim ? "I" : "F") + "\r\n";
+               exDate + "," + (interim ? "I" : "F") + "," + gics + "\r\n";
     };
     int i = 0;
     for (const auto& n : names) {
@@ -642,7 +643,9 @@ platform::Status MakeSampleSecurityDetails(const std::string& dataFolder,
             i % 7 == 0 ? "0" : platform::Format((i % 11 + 1) * 0.04, "0.00#");
         text += line(n.TrimmedCode(), platform::Upper(platform::Trim(n.Name)),
                      1000000L * (i * 37 % 900 + 10), dividend, earnings, i % 2 ? "100" : "0",
-                     "2026101" + std::to_string(i % 10), i % 3 == 0);
+                     "2026101" + std::to_string(i % 10), i % 3 == 0,
+                     // The download knows a sector for the names the sample left without one.
+                     platform::Trim(n.GicsSector).empty() ? "4010" : platform::Trim(n.GicsSector));
     }
     text += line("PRN", "PERENNIAL RESOURCES", 52000000, "0.01", "0.05", "100", "20260901", false);
     // A row whose description runs past what a record keeps.
