@@ -307,6 +307,75 @@ platform::Status AddScanExamples(const std::string& dataFolder,
     return platform::Status::Ok();
 }
 
+// Histories a library gathers damage in, for the data check and the repair tools to find:
+// a file with bad records of every kind, a security whose code changed (its old file stopped,
+// the new one runs on), a history with a hole in it, and the .Old copies an adjustment leaves.
+platform::Status AddDamagedExamples(const std::string& dataFolder,
+                                    const std::vector<std::string>& dates,
+                                    std::vector<store::NameRecord>& names, SampleSummary& summary) {
+    Random rng(4242);
+    const auto add = [&](const Security& s, std::vector<store::PriceRecord> recs) {
+        store::NameRecord n;
+        n.Code = s.code;
+        n.Name = s.name;
+        n.RecordType = s.type;
+        n.IndustryClass = s.industry;
+        n.Category = 1;
+        names.push_back(n);
+        summary.Records += static_cast<int>(recs.size());
+        return store::PriceFile(store::PriceFile::PathFor(dataFolder, s.code)).WriteAll(recs);
+    };
+
+    auto bad = PriceHistory(
+        {"FLT", "Faulty Data Holdings (sample)", 4, "121", "", 1.20, 0.02, 0.30, 300000}, dates,
+        rng);
+    const std::size_t n = bad.size();
+    const store::PriceRecord twice = bad[n - 31];
+    bad.insert(bad.begin() + static_cast<std::ptrdiff_t>(n - 30), twice); // a day twice
+    bad[n - 25].Date = "20261017";                                        // a Saturday
+    std::swap(bad[n - 22].Date, bad[n - 21].Date);                        // two days swapped
+    std::swap(bad[n - 18].High, bad[n - 18].Low);                         // high below low
+    bad[n - 15].Close = bad[n - 15].High * 1.1f;                          // close above the high
+    bad[n - 12].Low = 0;       // a zero price on a traded day
+    bad[n - 8].Volume = -5000; // negative volume
+    if (auto st =
+            add({"FLT", "Faulty Data Holdings (sample)", 4, "121", "", 1.20, 0.02, 0.30, 0}, bad);
+        !st)
+        return st;
+
+    // The old code stopped 40 days before the end; the user joins it to the new one with the
+    // code-change tool.
+    auto before = PriceHistory(
+        {"BRX", "Brook Energy (old code)", 4, "101", "", 0.85, 0.05, 0.35, 900000}, dates, rng);
+    std::vector<store::PriceRecord> after(before.end() - 40, before.end());
+    before.resize(before.size() - 40);
+    if (auto st = add({"BRX", "Brook Energy (old code)", 4, "101", "", 0, 0, 0, 0}, before); !st)
+        return st;
+    names.back().OtherDetails = "Now BRK";
+    if (auto st = add({"BRK", "Brook Energy (sample)", 4, "101", "", 0, 0, 0, 0}, after); !st)
+        return st;
+
+    // Five weeks without a record in the middle of the history.
+    auto holed = PriceHistory(
+        {"GAP", "Gapped History Mining (sample)", 4, "101", "", 2.40, 0.04, 0.40, 150000}, dates,
+        rng);
+    holed.erase(holed.end() - 150, holed.end() - 125);
+    if (auto st = add({"GAP", "Gapped History Mining (sample)", 4, "101", "", 0, 0, 0, 0}, holed);
+        !st)
+        return st;
+
+    // Copies kept by adjustments long done.
+    for (const char* code : {"ALX", "KRM", "HBK"}) {
+        const auto from = store::PriceFile::PathFor(dataFolder, code);
+        auto to = from;
+        to.replace_extension(".Old");
+        const auto bytes = platform::ReadWholeFile(from);
+        if (!bytes) return platform::Status::Error("Cannot read " + from.string());
+        if (auto st = platform::WriteFileAtomic(to, *bytes); !st) return st;
+    }
+    return platform::Status::Ok();
+}
+
 } // namespace
 
 platform::Status MakeSampleLibrary(const std::string& systemFolder, const std::string& dataFolder,
@@ -339,6 +408,7 @@ platform::Status MakeSampleLibrary(const std::string& systemFolder, const std::s
     }
     names[names.size() - 4].OtherDetails = "Exp 30/06/27"; // a warrant's details
     if (auto st = AddScanExamples(dataFolder, dates, names, summary); !st) return st;
+    if (auto st = AddDamagedExamples(dataFolder, dates, names, summary); !st) return st;
     names[3].PercentBandUp = 8;
     names[3].PercentBandDown = 8;
     store::NameFile nf(store::NameFile::PathIn(dataFolder));
