@@ -109,7 +109,14 @@ NameForm::NameForm(app::Session& session, QWidget* parent) : QDialog(parent), m_
     layout->addWidget(m_caption);
     layout->addWidget(m_grid, 1);
     layout->addWidget(m_progress);
+    m_progress->hide();
     resize(980, 560);
+    // Numbers are short; the name is what the user reads the rows by.
+    for (int c = 0; c < store::kNameShownColumns; ++c)
+        m_grid->setColumnWidth(c, 64);
+    m_grid->setColumnWidth(store::kNameRec, 48);
+    m_grid->setColumnWidth(store::kNameName, 250);
+    m_grid->setColumnWidth(store::kNameOther, 120);
     Display();
 }
 
@@ -133,7 +140,11 @@ bool NameForm::Save() {
 }
 
 void NameForm::Sort(store::NameSortOrder order) {
-    if (m_model->Sort(order)) AfterChange();
+    // The bar is there while the sort runs through its scratch files, not while the user edits.
+    m_progress->show();
+    const bool sorted = m_model->Sort(order);
+    m_progress->hide();
+    if (sorted) AfterChange();
 }
 
 std::pair<int, int> NameForm::SelectedRows() const {
