@@ -6,6 +6,7 @@
 #include "gui/services/qt_dialogs.h"
 #include "gui/services/qt_progress.h"
 #include "gui/windows/chart_windows.h"
+#include "gui/windows/help_browser.h"
 #include "gui/windows/logo.h"
 #include "gui/windows/main_window.h"
 #include "gui/windows/register_windows.h"
@@ -81,6 +82,8 @@ int main(int argc, char** argv) {
         // Files waiting in the download folder are offered once the main window stands; OK
         // opens the update list.
         if (kori::app::OfferPendingUpdate(session)) (void)main.Trigger("mnuModem");
+        // Tips come after every start-up question, and never hold the program up.
+        if (!parser.isSet(shotOpt)) kori::gui::ShowTipsIfWanted(main);
         if (parser.isSet(chartOpt))
             if (auto* charts = main.findChild<kori::gui::ChartWindows*>())
                 charts->ShowCode(parser.value(chartOpt).toStdString());

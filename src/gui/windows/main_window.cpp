@@ -5,6 +5,7 @@
 #include "app/window_position.h"
 #include "gui/services/qt_progress.h"
 #include "gui/widgets/window_place.h"
+#include "gui/windows/help_browser.h"
 #include "platform/files.h"
 #include "platform/text.h"
 
@@ -15,7 +16,6 @@
 #include <QMdiArea>
 #include <QMdiSubWindow>
 #include <QMenuBar>
-#include <QMessageBox>
 #include <QScreen>
 #include <QStatusBar>
 
@@ -197,13 +197,18 @@ void MainWindow::closeEvent(QCloseEvent* e) {
 
 QString MainWindow::AboutText() const {
     return QStringLiteral("KORI Charting\nVersion %1\n\nEnd-of-day share-market charting.\n\n"
-                          "System folder: %2\nData folder: %3")
-        .arg(QStringLiteral(KORI_VERSION), Q(m_session.folders.SystemFolder),
-             Q(m_session.folders.DataFolder));
+                          "Install root: %2\nSystem folder: %3\nData folder: %4")
+        .arg(QStringLiteral(KORI_VERSION), QString::fromStdString(m_session.root().string()),
+             Q(m_session.folders.SystemFolder), Q(m_session.folders.DataFolder));
 }
 
 void MainWindow::ShowAbout() {
-    QMessageBox::about(this, QStringLiteral("About KORI"), AboutText());
+    if (auto* open = findChild<AbtKori*>(QStringLiteral("AbtKori"))) {
+        open->raise();
+        open->activateWindow();
+        return;
+    }
+    (new AbtKori(AboutText(), this))->open();
 }
 
 } // namespace kori::gui

@@ -4,6 +4,7 @@
 #include "gui/windows/adjust_windows.h"
 #include "gui/windows/chart_windows.h"
 #include "gui/windows/entry_windows.h"
+#include "gui/windows/help_browser.h"
 #include "gui/windows/list_windows.h"
 #include "gui/windows/main_window.h"
 #include "gui/windows/maint_windows.h"
@@ -22,6 +23,7 @@ void RegisterWindows(MainWindow& main) {
     RegisterAdjListWindows(main);
     RegisterToolWindows(main);
     RegisterEntryWindows(main);
+    RegisterHelpWindows(main);
     main.RebuildMenus();
 }
 
