@@ -43,7 +43,7 @@ TEST(HelpPages, EveryPageIsCarriedWithTitleAndLinksThatResolve) {
                                   QStringLiteral("</h1>")))
             << p.id;
         // Some words beyond the heading: a page is never just a title.
-        EXPECT_GT(html.size(), 400) << p.id;
+        EXPECT_GT(html.size(), 300) << p.id;
         for (auto it = link.globalMatch(html); it.hasNext();) {
             const QString target = it.next().captured(1);
             ASSERT_TRUE(target.endsWith(QStringLiteral(".html"))) << p.id;
