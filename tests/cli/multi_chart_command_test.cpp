@@ -9,16 +9,21 @@
 #include <filesystem>
 #include <fstream>
 #include <sstream>
+#include <string>
 
 namespace kori::test {
 namespace {
 
-// Frames of oscillator panels in a stream: "B" lines that start at x 5.
+// Frames of oscillator panels in a stream: "B" lines that start at x 5 (the price chart's
+// frames start at 4).
 int PanelFrames(const std::filesystem::path& stream) {
     std::ifstream in(stream);
     int n = 0;
-    for (std::string line; std::getline(in, line);)
+    for (std::string line; std::getline(in, line);) {
+        // Numbers stand with the blank of a plain number-to-text in the stream.
+        std::erase(line, ' ');
         if (line.rfind("B,5,", 0) == 0) ++n;
+    }
     return n;
 }
 
