@@ -28,30 +28,20 @@ std::string ShortDate(const std::string& yyyymmdd) {
     return std::to_string(d->day) + "/" + std::to_string(d->month) + "/" + yyyymmdd.substr(2, 2);
 }
 
-// Forwards to the session's dialogs and remembers whether a message box went up, so that a
-// build that failed without a word can still tell the user why.
-class TellingDialogs : public platform::Dialogs {
-public:
-    explicit TellingDialogs(platform::Dialogs& inner) : m_inner(inner) {}
-    platform::Answer MsgBox(std::string_view text, std::string_view title,
-                            platform::Buttons buttons, platform::Icon icon) override {
-        m_told = true;
-        return m_inner.MsgBox(text, title, buttons, icon);
-    }
-    std::optional<std::string> InputBox(std::string_view prompt, std::string_view title,
-                                        std::string_view defaultText) override {
-        return m_inner.InputBox(prompt, title, defaultText);
-    }
-    void Beep() override { m_inner.Beep(); }
-    void SetBusy(bool busy) override { m_inner.SetBusy(busy); }
-    bool told() const { return m_told; }
-
-private:
-    platform::Dialogs& m_inner;
-    bool m_told = false;
-};
-
 } // namespace
+
+std::optional<store::NameRecord> StepChartList(Session& session, ChartWalk& walk, ChartState& state,
+                                               int delta) {
+    if (!walk.Open(state.Request)) {
+        session.dialogs().MsgBox(walk.status().message(), "Chart Display");
+        return std::nullopt;
+    }
+    const bool classWalk = (state.ClassWalk || state.GicsWalk) && state.Request.ListMode == 1;
+    if (!classWalk) return StepChart(walk, state.Request, delta);
+    return StepClassChart(walk, state.Request, delta,
+                          state.GicsWalk ? state.GicsCode : state.ClassCode, state.GicsWalk,
+                          session.dialogs());
+}
 
 ChartWindowModel::ChartWindowModel(Session& session, ChartState& state)
     : m_session(session), m_state(state), m_walk(session),
@@ -82,16 +72,7 @@ void ChartWindowModel::LeaveChart() {
 
 bool ChartWindowModel::NextChart(int delta) {
     LeaveChart();
-    if (!m_walk.Open(m_state.Request)) {
-        m_session.dialogs().MsgBox(m_walk.status().message(), "Chart Display");
-        return false;
-    }
-    const bool classWalk = (m_state.ClassWalk || m_state.GicsWalk) && m_state.Request.ListMode == 1;
-    const auto r = classWalk
-                       ? StepClassChart(m_walk, m_state.Request, delta,
-                                        m_state.GicsWalk ? m_state.GicsCode : m_state.ClassCode,
-                                        m_state.GicsWalk, m_session.dialogs())
-                       : StepChart(m_walk, m_state.Request, delta);
+    const auto r = StepChartList(m_session, m_walk, m_state, delta);
     if (!r) return false;
     m_name = *r;
     m_haveName = true;

@@ -9,6 +9,7 @@
 #include "app/session.h"
 #include "chart/chart.h"
 #include "chart/chart_tools.h"
+#include "platform/dialogs.h"
 #include "platform/surface.h"
 #include "store/name_record.h"
 
@@ -52,6 +53,35 @@ struct ChartEffects {
     bool OscSettings = false;                        // open the oscillator settings box
     std::optional<double> Crosshair;                 // x of the bar under the cursor
 };
+
+// Forwards to the session's dialogs and remembers whether a message box went up, so that a
+// build that failed without a word can still tell the user why.
+class TellingDialogs : public platform::Dialogs {
+public:
+    explicit TellingDialogs(platform::Dialogs& inner) : m_inner(inner) {}
+    platform::Answer MsgBox(std::string_view text, std::string_view title,
+                            platform::Buttons buttons, platform::Icon icon) override {
+        m_told = true;
+        return m_inner.MsgBox(text, title, buttons, icon);
+    }
+    std::optional<std::string> InputBox(std::string_view prompt, std::string_view title,
+                                        std::string_view defaultText) override {
+        return m_inner.InputBox(prompt, title, defaultText);
+    }
+    void Beep() override { m_inner.Beep(); }
+    void SetBusy(bool busy) override { m_inner.SetBusy(busy); }
+    bool told() const { return m_told; }
+
+private:
+    platform::Dialogs& m_inner;
+    bool m_told = false;
+};
+
+// The next-chart command over the list of `state`, as every chart window steps it: the list is
+// opened afresh (its failure told under "Chart Display"), a class or GICS walk steps within its
+// class, any other list by position with a wrap at both ends. nullopt: nothing to show.
+std::optional<store::NameRecord> StepChartList(Session& session, ChartWalk& walk, ChartState& state,
+                                               int delta);
 
 class ChartWindowModel {
 public:

@@ -1,5 +1,6 @@
 #include "app/sample_library.h"
 
+#include "osc/osc_identifiers.h"
 #include "platform/date_text.h"
 #include "platform/files.h"
 #include "platform/number_format.h"
@@ -433,6 +434,13 @@ platform::Status MakeSampleLibrary(const std::string& systemFolder, const std::s
     listNames[1] = "Resources";
     listNames[2] = "Watching";
     store::SaveSLNames(settings, listNames);
+    // Two multi-oscillator sets to look at, unless the user has sets of their own.
+    const osc::MultiOscSet sets[] = {
+        {{"RSI", "MACD", "Stochastic (Slow)", "None", "None"}},
+        {{"ROC", "Directional Movement", "OBV", "Williams %R", "Volatility"}}};
+    for (int set = 1; set <= 2; ++set)
+        if (platform::Trim(settings.Get(osc::MultiOscKey(set), "")).empty())
+            osc::SaveMultiOscSet(settings, set, sets[set - 1]);
     return platform::Status::Ok();
 }
 

@@ -7,6 +7,7 @@
 #include "cli/cli_context.h"
 #include "cli/gui_app.h"
 #include "cli/json_out.h"
+#include "cli/multi_chart.h"
 #include "cli/osc_chart.h"
 #include "gui/paint/pdf_printer.h"
 #include "gui/paint/qt_surface.h"
@@ -45,6 +46,7 @@ struct ChartOptions {
     float boxValue = 0;
     std::string split; // CODE or CODE:PERIOD of the lower half
     OscChartOptions osc;
+    int multi = 0; // 1 or 2: the oscillators of that multi-oscillator set under the chart
 };
 
 void ApplySwing(const std::string& text, app::ChartJob& job) {
@@ -210,7 +212,9 @@ void Run(CliContext& ctx, const ChartOptions& o) {
     job.Page = &page;
     app::SplitChart split;
     if (!o.split.empty()) ApplySplit(session, o.split, o, job, split);
+    if (o.multi != 0) CheckMultiOptions(o.multi, o.osc, !o.split.empty());
     const auto build = [&](chart::Chart& into, platform::Surface& area) {
+        if (o.multi != 0) return BuildMultiChart(session, job, o.multi, into, area, o.osc);
         split.Apply(job.Request);
         return BuildChartWithPanel(session, job, into, area, o.osc);
     };
@@ -302,6 +306,9 @@ void AddChartCommand(CLI::App& app, CliContext& ctx) {
     cmd->add_option("--osc", o->osc.osc, "Oscillator panel under the price chart (RSI, MACD, ...)")
         ->option_text("NAME");
     cmd->add_flag("--slow", o->osc.slow, "Slow stochastic with --osc STO");
+    cmd->add_option("--multi", o->multi,
+                    "The oscillators of multi-oscillator set 1 or 2 stacked under the chart")
+        ->option_text("SET");
     cmd->add_option("--set", o->osc.sets, "Override one OscDef key for this run, such as RsiP=9")
         ->option_text("KEY=VALUE");
     cmd->callback([&ctx, o] { Run(ctx, *o); });

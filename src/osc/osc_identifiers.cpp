@@ -307,6 +307,13 @@ std::span<const std::string_view> MultiOscChoices() {
     return names;
 }
 
+std::optional<OscChoice> FindMultiOscChoice(std::string_view listName) {
+    const std::string name = platform::Trim(listName);
+    for (const auto& choice : kListOrder)
+        if (ListName(choice) == name) return choice;
+    return std::nullopt;
+}
+
 std::string MultiOscKey(int set) {
     return "Multi-Osc " + std::to_string(set);
 }

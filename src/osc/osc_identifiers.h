@@ -68,6 +68,9 @@ std::string_view ListName(const OscChoice& choice);
 
 // The multi-oscillator list: "None" and the 17 names in the order the window offers them.
 std::span<const std::string_view> MultiOscChoices();
+// The oscillator behind a name of that list (trimmed, exact case); nullopt for "None" and for a
+// name the list does not offer.
+std::optional<OscChoice> FindMultiOscChoice(std::string_view listName);
 
 inline constexpr std::size_t kMultiOscSlots = 5;
 struct MultiOscSet {

@@ -27,6 +27,7 @@
 #include "gui/windows/stp_ls.h"
 #include "gui/windows/swing_set.h"
 #include "gui/windows/v_height.h"
+#include "osc/osc_identifiers.h"
 #include "osc/osc_settings.h"
 #include "platform/clock.h"
 #include "platform/dialogs.h"
@@ -499,6 +500,9 @@ TEST_F(SampleRoot, PointAndFigureBoxValueForm) {
 }
 
 TEST_F(SampleRoot, MultiOscillatorSetsAreJoinedIntoTheSettingsStore) {
+    // The sample comes with two sets; this starts from empty ones.
+    osc::SaveMultiOscSet(settings, 1, osc::MultiOscSet{});
+    osc::SaveMultiOscSet(settings, 2, osc::MultiOscSet{});
     gui::MultiOsc w(session, hub);
     EXPECT_EQ(w.choices()->count(), 18);
     EXPECT_EQ(w.set(0)->item(0)->text(), "None");

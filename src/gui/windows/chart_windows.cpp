@@ -6,6 +6,7 @@
 #include "gui/windows/cht_sel.h"
 #include "gui/windows/chts.h"
 #include "gui/windows/main_window.h"
+#include "gui/windows/multi_osc_chart.h"
 #include "gui/windows/settings_windows.h"
 #include "platform/date_text.h"
 #include "store/name_file.h"
@@ -39,6 +40,9 @@ ChartWindows::ChartWindows(MainWindow& main) : QObject(&main), m_main(main) {
         m_state.Request.AutoOsc = !name.isEmpty();
         m_state.Request.AutoOscCode = name.toStdString();
         rebuild();
+    });
+    connect(&hub, &SettingsHub::MultiOscSaved, this, [this] {
+        if (MultiOscChart* m = multiOscChart(); m && m_multiWindow->isVisible()) m->Rebuild();
     });
     // Chart2: the chart on show is split at once; with none on show the next chart comes split.
     connect(&hub, &SettingsHub::SecondChart, this, [this](const QString& code, QChar period) {
@@ -118,6 +122,7 @@ Chts* ChartWindows::EnsureChts() {
     m_chartWindow->setAttribute(Qt::WA_DeleteOnClose);
     connect(c, &Chts::ChartSelectionRequested, this, &ChartWindows::BackToSelection);
     c->SetPrinter(&printer());
+    connect(c, &Chts::MultiOscRequested, this, [this](int set) { OpenMultiOscChart(set); });
     // The oscillator settings box: from the panel, the chart's menu, or before an oscillator
     // picked in the toolbar shows when "Always show oscillator settings box" is ticked.
     connect(c, &Chts::OscSettingsRequested, this, [this] {
@@ -171,8 +176,32 @@ void ChartWindows::BackToSelection() {
     OpenCharts();
 }
 
+MultiOscChart* ChartWindows::multiOscChart() const {
+    return m_multiWindow ? qobject_cast<MultiOscChart*>(m_multiWindow->widget()) : nullptr;
+}
+
+MultiOscChart* ChartWindows::OpenMultiOscChart(int set) {
+    MultiOscChart* m = multiOscChart();
+    if (!m) {
+        m = new MultiOscChart(m_main.session(), m_state, set);
+        m_multiWindow = m_main.mdiArea()->addSubWindow(m);
+        m_multiWindow->setAttribute(Qt::WA_DeleteOnClose);
+        m->SetPrinter(&printer());
+        connect(m, &MultiOscChart::SetupRequested, this, [this] { OpenMultiOsc(m_main); });
+    }
+    m_multiWindow->showMaximized();
+    m_main.mdiArea()->setActiveSubWindow(m_multiWindow);
+    QApplication::sendPostedEvents();
+    QApplication::processEvents();
+    // The chart window's security, drawn once with the set chosen.
+    if (Chts* c = chts(); c && c->model().haveSecurity()) m->model().ShowSecurity(c->current());
+    m->ChooseSet(set);
+    return m;
+}
+
 void ChartWindows::CloseAll() {
     m_closingAll = true;
+    if (m_multiWindow) m_multiWindow->close();
     if (m_chartWindow) m_chartWindow->close();
     if (m_selWindow) m_selWindow->close();
     m_closingAll = false;

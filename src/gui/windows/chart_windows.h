@@ -16,6 +16,7 @@ namespace kori::gui {
 class MainWindow;
 class ChtSel;
 class Chts;
+class MultiOscChart;
 
 class ChartWindows : public QObject {
     Q_OBJECT
@@ -35,6 +36,9 @@ public:
     bool ShowCodeAt(const std::string& code, const std::string& date);
     // "Close" of ChtSel: both windows go.
     void CloseAll();
+    // The multi-oscillator chart of set 1 or 2 for the security of the chart window.
+    MultiOscChart* OpenMultiOscChart(int set);
+    MultiOscChart* multiOscChart() const;
 
     ChtSel* chtSel() const;
     Chts* chts() const;
@@ -49,6 +53,7 @@ private:
     app::ChartState m_state;
     QPointer<QMdiSubWindow> m_selWindow;
     QPointer<QMdiSubWindow> m_chartWindow;
+    QPointer<QMdiSubWindow> m_multiWindow;
     bool m_closingAll = false;
     std::unique_ptr<QPrinter> m_printer;
 };

@@ -121,6 +121,11 @@ Chts::Chts(app::Session& session, app::ChartState& state, QWidget* parent)
         ->addAction(QStringLiteral("&Oscillator Settings ..."), this,
                     [this] { emit OscSettingsRequested(); })
         ->setObjectName(QStringLiteral("cmOscSettings"));
+    for (int set = 1; set <= 2; ++set)
+        overlays
+            ->addAction(QStringLiteral("Multi-Osc %1").arg(set), this,
+                        [this, set] { emit MultiOscRequested(set); })
+            ->setObjectName(QStringLiteral("cmMultiOsc%1").arg(set));
     overlays->addSeparator();
     m_singleChart = overlays->addAction(QStringLiteral("Single C&hart"), this, &Chts::EndSplit);
     m_singleChart->setObjectName(QStringLiteral("cmSingleChart"));

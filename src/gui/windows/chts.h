@@ -107,6 +107,8 @@ signals:
     void ChartSelectionRequested();
     // The oscillator settings box is wanted (the panel was double-clicked).
     void OscSettingsRequested();
+    // "Multi-Osc 1" or "Multi-Osc 2": the chart in hand with the oscillators of that set.
+    void MultiOscRequested(int set);
 
 protected:
     void closeEvent(QCloseEvent* e) override;

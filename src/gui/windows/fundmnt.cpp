@@ -1,6 +1,7 @@
 #include "gui/windows/fundmnt.h"
 
 #include "gui/widgets/grid_view.h"
+#include "gui/widgets/named_controls.h"
 #include "gui/widgets/window_place.h"
 #include "platform/text.h"
 
@@ -37,9 +38,7 @@ Fundmnt::Fundmnt(app::Session& session, QWidget* parent)
     KeepWindowPosition(this, session.services().settings, kDetailsSection);
     m_menus = new QMenuBar(this);
     const auto item = [this](QMenu* menu, const char* caption, const char* name, auto slot) {
-        QAction* a = menu->addAction(QString::fromLatin1(caption));
-        a->setObjectName(QString::fromLatin1(name));
-        connect(a, &QAction::triggered, this, slot);
+        return NamedAction(menu, this, caption, name, slot);
     };
     QMenu* file = m_menus->addMenu(QStringLiteral("&File"));
     item(file, "&Print", "mnPrint", [this] {

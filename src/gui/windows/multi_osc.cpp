@@ -77,6 +77,7 @@ void MultiOsc::Save() {
         }
         osc::SaveMultiOscSet(store, s + 1, set);
     }
+    emit m_hub.MultiOscSaved();
 }
 
 } // namespace kori::gui

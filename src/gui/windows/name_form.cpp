@@ -1,6 +1,7 @@
 #include "gui/windows/name_form.h"
 
 #include "gui/widgets/grid_view.h"
+#include "gui/widgets/named_controls.h"
 #include "gui/widgets/settings_dialog.h"
 #include "gui/widgets/window_place.h"
 #include "gui/windows/repair_progress.h"
@@ -31,11 +32,8 @@ NameForm::NameForm(app::Session& session, QWidget* parent) : QDialog(parent), m_
 
     m_menus = new QMenuBar(this);
     const auto item = [this](QMenu* menu, const char* caption, const char* name, auto slot) {
-        QAction* a = menu ? menu->addAction(QString::fromLatin1(caption))
-                          : m_menus->addAction(QString::fromLatin1(caption));
-        a->setObjectName(QString::fromLatin1(name));
-        connect(a, &QAction::triggered, this, slot);
-        return a;
+        return menu ? NamedAction(menu, this, caption, name, slot)
+                    : NamedAction(m_menus, this, caption, name, slot);
     };
     QMenu* file = m_menus->addMenu(QStringLiteral("&File"));
     item(file, "&Save ", "mnuSave", [this] { Save(); });

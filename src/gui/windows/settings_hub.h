@@ -26,6 +26,8 @@ signals:
     void DataFolderChanged();
     void ColoursChanged();
     void FontsChanged();
+    // "MultiOsc Setup" stored the two sets: a multi-oscillator chart on show is drawn again.
+    void MultiOscSaved();
     // Chart2: the second chart of a split, by code and period ('A', 'W', 'M').
     void SecondChart(const QString& code, QChar period);
     // "Select CANCEL to exit KORI" in the path details.
