@@ -107,6 +107,8 @@ signals:
     void ChartSelectionRequested();
     // The oscillator settings box is wanted (the panel was double-clicked).
     void OscSettingsRequested();
+    // "Add to Watchlist": the shown security into the Watchlist window.
+    void AddToWatchlistRequested(const QString& code);
 
 protected:
     void closeEvent(QCloseEvent* e) override;
