@@ -5,6 +5,7 @@
 #include "platform/files.h"
 #include "platform/number_format.h"
 #include "platform/text.h"
+#include "scan/watchlist.h"
 #include "store/chart_list.h"
 #include "store/name_file.h"
 #include "store/price_file.h"
@@ -240,6 +241,30 @@ platform::Status WriteSampleTargets(const std::string& systemFolder,
     return store::WriteTargetsFile(store::TargetsFilePath(systemFolder), lines);
 }
 
+// Two watchlists: holdings bought below and above the last close, with quantities and notes,
+// among them securities whose targets the last day meets; and a list of codes alone.
+platform::Status WriteSampleWatchlists(const std::string& systemFolder,
+                                       const std::map<std::string, store::PriceRecord>& lastDay) {
+    const auto at = [&](const char* code, double factor) {
+        return std::round(lastDay.at(code).Close * factor * 100) / 100;
+    };
+    scan::WatchlistBook book;
+    if (auto st = book.AddList("Portfolio"); !st) return st;
+    if (auto st = book.AddList("Speculative"); !st) return st;
+    const std::vector<scan::WatchEntry> portfolio = {
+        {"HBK", "20250303", at("HBK", 0.85), 200, "dividend holding"},
+        {"FRG", "20250714", at("FRG", 1.10), 1500, "bought too early, hold"},
+        {"GLN", "20251002", at("GLN", 0.95), 300, ""},
+        {"TWR", "", std::nullopt, std::nullopt, "waiting for the target"},
+    };
+    for (const auto& e : portfolio)
+        if (auto st = book.AddEntry("Portfolio", e); !st) return st;
+    for (const char* code : {"DLT", "BWG", "KRM"})
+        if (auto st = book.AddEntry("Speculative", {code, "", std::nullopt, std::nullopt, ""}); !st)
+            return st;
+    return book.Write(scan::WatchlistBook::PathIn(systemFolder));
+}
+
 // Securities whose last days are placed so that every scan finds something: a rise of exactly
 // 10%, overbought and oversold oscillators, breaks of the parabolic stop up and down, a volume
 // spike, two averages together, and an advance-decline series whose totals need recomputing.
@@ -419,6 +444,7 @@ platform::Status MakeSampleLibrary(const std::string& systemFolder, const std::s
 
     if (auto st = WriteClassFiles(systemFolder); !st) return st;
     if (auto st = WriteSampleTargets(systemFolder, lastDay); !st) return st;
+    if (auto st = WriteSampleWatchlists(systemFolder, lastDay); !st) return st;
     if (auto st = store::SaveListFromCodes(dataFolder, 'A', {"HBK", "IRB", "JNS", "KST", "LMT"});
         !st)
         return st;

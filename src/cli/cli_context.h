@@ -74,5 +74,6 @@ void AddCheckCommand(CLI::App& app, CliContext& ctx);
 void AddCheckNamesCommand(CLI::App& app, CliContext& ctx);
 void AddBackupCommands(CLI::App& app, CliContext& ctx);
 void AddExportCommand(CLI::App& app, CliContext& ctx);
+void AddWatchlistCommand(CLI::App& app, CliContext& ctx);
 
 } // namespace kori::cli

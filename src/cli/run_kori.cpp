@@ -42,6 +42,7 @@ int RunKori(int argc, const char* const* argv, std::ostream& out, std::ostream& 
     AddCheckNamesCommand(app, ctx);
     AddBackupCommands(app, ctx);
     AddExportCommand(app, ctx);
+    AddWatchlistCommand(app, ctx);
 
     try {
         app.parse(argc, argv);

@@ -30,22 +30,8 @@ std::vector<std::string> CheckTargets(const std::filesystem::path& targetsFile,
     for (const auto& line : store::ReadTargetsFile(targetsFile)) {
         store::PriceRecord last;
         if (!ReadLastRecord(dataFolder, line.Code, last)) continue;
-        // The prices are 32-bit floats: the target is compared in the same width, so a target
-        // typed as the day's low (say 1.1) counts as touched.
-        const auto target = static_cast<float>(platform::Val(line.Target));
-        const bool inRange = last.Low <= target && target <= last.High;
-        const std::string direction = platform::Upper(line.Direction);
-        if (direction == "U") {
-            if (inRange)
-                alerts.push_back(line.Code + " - target reached UP");
-            else if (last.Close > target)
-                alerts.push_back(line.Code + " - target exceeded UP");
-        } else if (direction == "D") {
-            if (inRange)
-                alerts.push_back(line.Code + " - target reached DOWN");
-            else if (last.Close < target)
-                alerts.push_back(line.Code + " - target exceeded DOWN");
-        }
+        if (const auto outcome = store::TargetOutcome(line, last); !outcome.empty())
+            alerts.push_back(line.Code + " - " + outcome);
     }
     return alerts;
 }

@@ -1,6 +1,7 @@
 #include "store/targets_file.h"
 
 #include "platform/files.h"
+#include "platform/number_format.h"
 #include "platform/text.h"
 
 #include <array>
@@ -33,6 +34,22 @@ bool HoldsSeparator(std::string_view field) {
 
 std::filesystem::path TargetsFilePath(std::string_view systemFolder) {
     return platform::ResolveIn(systemFolder, "Targets.txt");
+}
+
+std::string TargetOutcome(const TargetLine& line, const PriceRecord& last) {
+    // The prices are 32-bit floats: the target is compared in the same width, so a target
+    // typed as the day's low (say 1.1) counts as touched.
+    const auto target = static_cast<float>(platform::Val(line.Target));
+    const bool inRange = last.Low <= target && target <= last.High;
+    const std::string direction = platform::Upper(line.Direction);
+    if (direction == "U") {
+        if (inRange) return "target reached UP";
+        if (last.Close > target) return "target exceeded UP";
+    } else if (direction == "D") {
+        if (inRange) return "target reached DOWN";
+        if (last.Close < target) return "target exceeded DOWN";
+    }
+    return {};
 }
 
 std::vector<TargetLine> ReadTargetsFile(const std::filesystem::path& file) {

@@ -3,6 +3,7 @@
 // stand on two lines. The alerts after an update, the chart's target lines and the targets
 // window all read it here.
 #include "platform/status.h"
+#include "store/price_file.h"
 
 #include <filesystem>
 #include <string>
@@ -16,6 +17,11 @@ struct TargetLine {
     std::string Target;    // the price as text ("0.00#" when the window wrote it)
     std::string Direction; // "U" or "D" in a good file; anything else is kept as read
 };
+
+// What the last price record says of one target: "target reached UP" when the day's range
+// holds it, else "target exceeded UP" when the close is above it (DOWN: the same range test,
+// else a close below); empty when neither, or when the direction is neither U nor D.
+std::string TargetOutcome(const TargetLine& line, const PriceRecord& last);
 
 // Targets.txt in the system folder, found whatever the case of its name.
 std::filesystem::path TargetsFilePath(std::string_view systemFolder);

@@ -8,6 +8,7 @@
 #include "gui/windows/main_window.h"
 #include "gui/windows/multi_osc_chart.h"
 #include "gui/windows/settings_windows.h"
+#include "gui/windows/watchlist.h"
 #include "platform/date_text.h"
 #include "store/name_file.h"
 
@@ -129,6 +130,10 @@ Chts* ChartWindows::EnsureChts() {
         const auto& r = m_state.Request;
         OpenOscillatorSettings(m_main, r.AutoOsc ? r.AutoOscCode : std::string(), r.ChartStyle,
                                std::string(1, r.ChartPeriod));
+    });
+    connect(c, &Chts::AddToWatchlistRequested, this, [this](const QString& code) {
+        if (!m_main.Open("Watchlist")) return;
+        if (auto* w = m_main.findChild<Watchlist*>()) w->AddFromChart(code.toStdString());
     });
     // Closing the chart window on its own goes back to the selection it came from.
     connect(m_chartWindow, &QObject::destroyed, this, [this] {

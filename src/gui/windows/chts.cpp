@@ -87,6 +87,13 @@ Chts::Chts(app::Session& session, app::ChartState& state, QWidget* parent)
     file->addAction(QStringLiteral("Display Saved Chart"), this, &Chts::DisplaySavedChartDialog)
         ->setObjectName(QStringLiteral("cmShowSaved"));
     file->addSeparator();
+    // The way to the watchlists from a chart, whatever the data service shows in the main menu.
+    QAction* watch = file->addAction(QStringLiteral("Add to &Watchlist"), this, [this] {
+        const auto code = m_model.Code();
+        if (!code.empty()) emit AddToWatchlistRequested(QString::fromStdString(code));
+    });
+    watch->setObjectName(QStringLiteral("cmAddToWatchlist"));
+    watch->setShortcut(QKeySequence(QStringLiteral("Ctrl+Shift+W")));
     file->addAction(QStringLiteral("Chart &Selection"), this, &Chts::NewChart);
     file->addAction(QStringLiteral("&Close"), this, [this] {
         // Inside the frame the window is a sub-window; window() would be the main window.

@@ -109,6 +109,8 @@ signals:
     void OscSettingsRequested();
     // "Multi-Osc 1" or "Multi-Osc 2": the chart in hand with the oscillators of that set.
     void MultiOscRequested(int set);
+    // "Add to Watchlist": the shown security into the Watchlist window.
+    void AddToWatchlistRequested(const QString& code);
 
 protected:
     void closeEvent(QCloseEvent* e) override;

@@ -14,6 +14,7 @@
 #include "gui/windows/snapshot.h"
 #include "gui/windows/stats_windows.h"
 #include "gui/windows/text_data.h"
+#include "gui/windows/watchlist.h"
 #include "platform/files.h"
 
 #include <QProcess>
@@ -146,6 +147,8 @@ void RegisterToolWindows(MainWindow& main) {
         w->open();
     });
     Register<Snapshot>(main, "Snapshot", ChartsOf(main));
+    // Not modal: a row's chart and the list are looked at side by side.
+    RegisterScan<Watchlist>(main, "Watchlist");
     Register<ChartBak>(main, "ChartBak", false);
     Register<ChartBak>(main, "ChartBak Restore", true);
     // The name-file check asks first, as its menu item says.
