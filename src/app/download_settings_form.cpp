@@ -3,6 +3,8 @@
 #include "app/folder_config.h"
 #include "platform/files.h"
 #include "platform/text.h"
+#include "store/master_list.h"
+#include "store/name_editor.h"
 
 #include <algorithm>
 
@@ -203,15 +205,6 @@ std::vector<std::string> Lines(std::string_view text) {
     return lines;
 }
 
-// A master record: the code is its first word, the name what follows it.
-GridModel::Row MasterRow(std::string_view record) {
-    const std::string text = Trim(record);
-    const auto blank = text.find(' ');
-    const std::string code = text.substr(0, blank == std::string::npos ? text.size() : blank);
-    const std::string name = blank == std::string::npos ? std::string() : Trim(text.substr(blank));
-    return {Upper(code), "0", name};
-}
-
 } // namespace
 
 UpdateListForm::UpdateListForm(Session& session)
@@ -240,21 +233,11 @@ void UpdateListForm::Load() {
     }
     m_grid.Load(std::move(rows));
 
-    m_master.clear();
-    const auto master = platform::ReadWholeFile(platform::ResolveIn(system, "KoriName.Mas"));
+    auto master = store::ReadMasterRecords(system);
     m_masterPresent = master.has_value();
-    if (!master) {
-        m_master = {"KORI Master list is missing", "Download from the KORI web page"};
-        return;
-    }
-    constexpr std::size_t kRecord = 62;
-    for (std::size_t at = 0; at + kRecord <= master->size(); at += kRecord) {
-        std::string record = master->substr(at, kRecord);
-        // A record may close with its own line end; it is not part of the text shown.
-        while (!record.empty() && (record.back() == '\n' || record.back() == '\r'))
-            record.pop_back();
-        m_master.push_back(platform::TrimRight(record));
-    }
+    m_master = master ? std::move(*master)
+                      : std::vector<std::string>{std::string(store::kMasterMissing),
+                                                 std::string(store::kMasterDownload)};
 }
 
 void UpdateListForm::ChooseOption(int option) {
@@ -275,7 +258,8 @@ int UpdateListForm::AddMasterItems(const std::vector<int>& indices) {
     for (const int i : indices) {
         if (i < 0 || i >= static_cast<int>(m_master.size())) continue;
         const int row = m_grid.InsertRow(m_grid.rowCount());
-        const auto cells = MasterRow(m_master[static_cast<std::size_t>(i)]);
+        const auto entry = store::ParseMasterRecord(m_master[static_cast<std::size_t>(i)]);
+        const GridModel::Row cells{entry.Code, "0", entry.Name};
         for (int c = 0; c < 3; ++c)
             m_grid.PutCell(row, c, cells[static_cast<std::size_t>(c)]);
         ++added;
@@ -298,11 +282,9 @@ int UpdateListForm::AddRows() {
 bool UpdateListForm::DeleteRows(int first, int last) {
     if (first > last) std::swap(first, last);
     if (first < 0 || last >= m_grid.rowCount()) return false;
-    const std::string question = first == last ? "Delete row " + std::to_string(first + 1) + " ?"
-                                               : "Delete items " + std::to_string(first + 1) +
-                                                     " to " + std::to_string(last + 1);
-    if (m_session.dialogs().MsgBox(question, "Delete Rows", Buttons::YesNo, Icon::Question) !=
-        Answer::Yes)
+    if (m_session.dialogs().MsgBox(store::DeleteRowsQuestion(first + 1, last + 1),
+                                   store::delete_text::kTitle, Buttons::YesNo,
+                                   Icon::Question) != Answer::Yes)
         return false;
     for (int r = last; r >= first; --r)
         m_grid.DeleteRow(r);

@@ -5,7 +5,9 @@
 #include "platform/files.h"
 #include "platform/number_format.h"
 #include "platform/text.h"
+#include "store/chart_list.h"
 #include "store/classifications.h"
+#include "store/name_editor.h"
 #include "store/name_file.h"
 #include "store/price_file.h"
 
@@ -21,6 +23,13 @@ using platform::Val;
 namespace {
 
 constexpr const char* kColumnsSection = "ASX Columns";
+
+std::vector<store::NameRecord> ReadNames(const std::string& dataFolder) {
+    std::vector<store::NameRecord> names;
+    store::NameFile nf(store::NameFile::PathIn(dataFolder));
+    if (!nf.ReadAll(names)) names.clear();
+    return names;
+}
 
 std::string ColumnKey(int column) {
     return "Col" + std::to_string(column);
@@ -67,6 +76,9 @@ bool FundamentalsForm::Load() {
         return false;
     }
     m_headers = header.Labels;
+    m_priceColumn = static_cast<int>(m_headers.size());
+    m_classColumn = -1;
+    m_transferPending = false;
     for (const char* extra : {"Price $", "PE Ratio", "Yield %", "GICS"})
         m_headers.emplace_back(extra);
     const std::size_t width = m_headers.size();
@@ -95,13 +107,8 @@ void FundamentalsForm::ShowFigures() {
     const std::string& data = m_session.folders.DataFolder;
     const std::string& system = m_session.folders.SystemFolder;
     std::map<std::string, std::string> gics;
-    {
-        std::vector<store::NameRecord> names;
-        store::NameFile nf(store::NameFile::PathIn(data));
-        if (nf.ReadAll(names))
-            for (const auto& n : names)
-                gics.emplace(n.TrimmedCode(), Trim(n.GicsSector));
-    }
+    for (const auto& n : ReadNames(data))
+        gics.emplace(n.TrimmedCode(), Trim(n.GicsSector));
     for (auto& row : m_rows) {
         const std::string& code = row[0];
         if (code == "AUX" || code == "1AUX" || code == "PRN" || code == "PRNX") continue;
@@ -136,6 +143,85 @@ void FundamentalsForm::ShowFigures() {
         if (const auto it = gics.find(code); it != gics.end() && !it->second.empty())
             row[static_cast<std::size_t>(price + 3)] = store::SectorNameOf(system, it->second);
     }
+}
+
+void FundamentalsForm::ShowIndustryClasses() {
+    if (m_classColumn < 0) {
+        m_classColumn = static_cast<int>(m_headers.size());
+        m_headers.emplace_back("Ind Class");
+        m_hidden.push_back(false);
+        for (auto& row : m_rows)
+            row.resize(m_headers.size());
+    }
+    std::map<std::string, std::string> classes;
+    for (const auto& n : ReadNames(m_session.folders.DataFolder))
+        classes.emplace(n.TrimmedCode(), Trim(n.IndustryClass));
+    for (auto& row : m_rows) {
+        const auto it = classes.find(row[0]);
+        row[static_cast<std::size_t>(m_classColumn)] = it == classes.end() || it->second.empty()
+                                                           ? std::string()
+                                                           : Format(Val(it->second), "000");
+    }
+}
+
+int FundamentalsForm::AddToScanList(const std::vector<int>& rows) {
+    const std::string& data = m_session.folders.DataFolder;
+    const auto names = ReadNames(data);
+    const auto listPath = store::ListPath(data, 'Z');
+    std::vector<store::ChartListEntry> list;
+    if (platform::FileExists(listPath) && !store::ReadList(listPath, list)) list.clear();
+    int added = 0;
+    for (const int r : rows) {
+        if (r < 0 || r >= static_cast<int>(m_rows.size())) continue;
+        const std::string& code = m_rows[static_cast<std::size_t>(r)][0];
+        for (std::size_t i = 0; i < names.size(); ++i)
+            if (names[i].TrimmedCode() == code) {
+                list.push_back({static_cast<std::int16_t>(i + 1), code});
+                ++added;
+                break;
+            }
+    }
+    if (added > 0) {
+        if (auto st = store::WriteList(listPath, list); !st) {
+            m_session.dialogs().MsgBox(st.message(), kTitle);
+            return 0;
+        }
+    }
+    m_session.dialogs().MsgBox(std::to_string(added) + " added to the scan results list", kTitle);
+    return added;
+}
+
+void FundamentalsForm::BeginTransfer() {
+    m_session.dialogs().MsgBox(kTransferMessage, kTransferTitle);
+    m_transferPending = true;
+}
+
+int FundamentalsForm::HeadingClicked(int column) {
+    if (!m_transferPending) return -1;
+    m_transferPending = false;
+    if (column < 0 || column >= static_cast<int>(m_headers.size())) return -1;
+    std::map<std::string, std::string> values;
+    for (const auto& row : m_rows) {
+        std::string text = row[static_cast<std::size_t>(column)];
+        std::erase(text, ',');
+        values.emplace(row[0], Trim(text.substr(0, store::NameRecord::kOtherDetailsWidth)));
+    }
+    const std::string& data = m_session.folders.DataFolder;
+    auto names = ReadNames(data);
+    int changed = 0;
+    for (auto& n : names)
+        if (const auto it = values.find(n.TrimmedCode());
+            it != values.end() && Trim(n.OtherDetails) != it->second) {
+            n.OtherDetails = it->second;
+            ++changed;
+        }
+    if (changed > 0) {
+        if (auto st = store::SaveNameFile(data, names); !st) {
+            m_session.dialogs().MsgBox(st.message(), kTransferTitle);
+            return -1;
+        }
+    }
+    return changed;
 }
 
 bool FundamentalsForm::hidden(int column) const {

@@ -12,6 +12,10 @@ namespace kori::app {
 class FundamentalsForm {
 public:
     static constexpr const char* kTitle = "Fundamentals";
+    static constexpr const char* kTransferTitle = "Transfer to Name File";
+    static constexpr const char* kTransferMessage =
+        "Click the description of the data that you want transferred to the Other Details "
+        "section of the Name file";
     // The four columns at the end of the table.
     static constexpr int kExtraColumns = 4;
 
@@ -26,10 +30,24 @@ public:
     const std::vector<std::string>& headers() const { return m_headers; }
     const std::vector<std::vector<std::string>>& rows() const { return m_rows; }
     // The first column of the four worked-out ones.
-    int priceColumn() const { return static_cast<int>(m_headers.size()) - kExtraColumns; }
+    int priceColumn() const { return m_priceColumn; }
 
     // "Show Current Price,PE Ratio,Yield and GICS": the four columns for every row.
     void ShowFigures();
+
+    // "Show Industry Groups/Classifications": a column "Ind Class" (added once) with each
+    // security's class from Names.dat, formatted "000".
+    void ShowIndustryClasses();
+    // "Add Highlighted Stocks to Scan Results List": the rows' codes found in Names.dat are
+    // appended to SubListZ.Dat; the number added, told to the user.
+    int AddToScanList(const std::vector<int>& rows);
+    // "Update Name File (Other Details)": the message, then the next heading clicked is copied.
+    void BeginTransfer();
+    bool transferPending() const { return m_transferPending; }
+    // A click on a column heading: while a transfer waits, that column of every row goes to
+    // the other details of the security's name record (cut to the field, commas dropped);
+    // the number of records changed, or -1 when nothing waited or the save failed.
+    int HeadingClicked(int column);
 
     // Columns hidden by the user, kept in the settings store ("ASX Columns").
     bool hidden(int column) const;
@@ -45,6 +63,9 @@ private:
     std::vector<std::string> m_headers;
     std::vector<std::vector<std::string>> m_rows;
     std::vector<bool> m_hidden;
+    int m_priceColumn = 0;
+    int m_classColumn = -1;
+    bool m_transferPending = false;
 };
 
 } // namespace kori::app

@@ -1,8 +1,10 @@
 #include "app/name_form_model.h"
 
+#include "maint/security_details.h"
 #include "platform/files.h"
 #include "platform/text.h"
 #include "store/chart_list_relink.h"
+#include "store/master_list.h"
 #include "store/name_file.h"
 
 namespace kori::app {
@@ -21,10 +23,11 @@ GridModel::CellCheck NameCheck() {
 }
 } // namespace
 
-NameFormModel::NameFormModel(std::string dataFolder, int dataService, platform::Dialogs& dialogs,
-                             platform::Progress& progress, platform::IniFile& ini)
-    : m_folder(platform::FolderWithSlash(dataFolder)), m_dataService(dataService),
-      m_dialogs(dialogs), m_progress(progress), m_ini(ini),
+NameFormModel::NameFormModel(std::string dataFolder, std::string systemFolder, int dataService,
+                             platform::Dialogs& dialogs, platform::Progress& progress,
+                             platform::IniFile& ini)
+    : m_folder(platform::FolderWithSlash(dataFolder)), m_systemFolder(std::move(systemFolder)),
+      m_dataService(dataService), m_dialogs(dialogs), m_progress(progress), m_ini(ini),
       m_grid(store::NameGridHeaders(), NameCheck(), store::kNameHiddenColumns) {
     m_grid.SetReadOnly(store::kNameRec, "Cannot edit this column", std::string(nt::kFileTitle));
 }
@@ -153,6 +156,42 @@ int NameFormModel::GdSpecial() {
     auto rows = m_grid.rows();
     const int changed = store::RefreshOptionDetails(rows);
     if (changed > 0) SetRows(std::move(rows));
+    return changed;
+}
+
+int NameFormModel::UpdateNames() {
+    const auto master = store::ReadMasterRecords(m_systemFolder);
+    if (!master) {
+        m_dialogs.MsgBox(std::string(store::kMasterMissing) + "\n" +
+                             std::string(store::kMasterDownload),
+                         nt::kFileTitle);
+        return -1;
+    }
+    auto rows = m_grid.rows();
+    const int changed = store::UpdateNamesFromMaster(rows, store::MasterNames(*master));
+    if (changed > 0) SetRows(std::move(rows));
+    m_dialogs.MsgBox(std::to_string(changed) + std::string(nt::kNamesUpdated), nt::kFileTitle);
+    return changed;
+}
+
+int NameFormModel::UpdateIC_from_Stock() {
+    auto rows = m_grid.rows();
+    const int changed = store::CopyClassFromUnderlying(rows);
+    if (changed > 0) SetRows(std::move(rows));
+    m_dialogs.MsgBox(std::to_string(changed) + std::string(nt::kClassesUpdated), nt::kFileTitle);
+    return changed;
+}
+
+int NameFormModel::UpdateGICS() {
+    const auto sectors = maint::GicsSectorsFromDetails(m_systemFolder);
+    if (!sectors) {
+        m_dialogs.MsgBox(nt::kNoSectorColumn, nt::kFileTitle);
+        return -1;
+    }
+    auto rows = m_grid.rows();
+    const int changed = store::UpdateGicsSectors(rows, *sectors);
+    if (changed > 0) SetRows(std::move(rows));
+    m_dialogs.MsgBox(std::to_string(changed) + std::string(nt::kSectorsUpdated), nt::kFileTitle);
     return changed;
 }
 

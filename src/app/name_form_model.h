@@ -15,8 +15,10 @@ namespace kori::app {
 
 class NameFormModel {
 public:
-    NameFormModel(std::string dataFolder, int dataService, platform::Dialogs& dialogs,
-                  platform::Progress& progress, platform::IniFile& ini);
+    // The system folder holds the master list and the downloaded security details that the
+    // three "Update ..." commands read.
+    NameFormModel(std::string dataFolder, std::string systemFolder, int dataService,
+                  platform::Dialogs& dialogs, platform::Progress& progress, platform::IniFile& ini);
 
     GridModel& grid() { return m_grid; }
     const GridModel& grid() const { return m_grid; }
@@ -39,6 +41,12 @@ public:
     bool CleanOptionalDetails();
     void TitleCase();
     int GdSpecial();
+    // "Update Names from KORI Master list", "Update Indust.Classifications from underlying
+    // stock", "Update GICS Sectors from download": the rows changed, told to the user; -1 when
+    // the file to read from is missing (also told).
+    int UpdateNames();
+    int UpdateIC_from_Stock();
+    int UpdateGICS();
     // Rows first..last, 1-based as the grid numbers them.
     bool ChangeCategory(int first, int last);
     bool ChangeRecordType(int first, int last);
@@ -54,6 +62,7 @@ private:
     void SetRows(std::vector<store::TextRow> rows);
 
     std::string m_folder;
+    std::string m_systemFolder;
     int m_dataService;
     platform::Dialogs& m_dialogs;
     platform::Progress& m_progress;

@@ -307,6 +307,75 @@ platform::Status AddScanExamples(const std::string& dataFolder,
     return platform::Status::Ok();
 }
 
+// Histories a library gathers damage in, for the data check and the repair tools to find:
+// a file with bad records of every kind, a security whose code changed (its old file stopped,
+// the new one runs on), a history with a hole in it, and the .Old copies an adjustment leaves.
+platform::Status AddDamagedExamples(const std::string& dataFolder,
+                                    const std::vector<std::string>& dates,
+                                    std::vector<store::NameRecord>& names, SampleSummary& summary) {
+    Random rng(4242);
+    const auto add = [&](const Security& s, std::vector<store::PriceRecord> recs) {
+        store::NameRecord n;
+        n.Code = s.code;
+        n.Name = s.name;
+        n.RecordType = s.type;
+        n.IndustryClass = s.industry;
+        n.Category = 1;
+        names.push_back(n);
+        summary.Records += static_cast<int>(recs.size());
+        return store::PriceFile(store::PriceFile::PathFor(dataFolder, s.code)).WriteAll(recs);
+    };
+
+    auto bad = PriceHistory(
+        {"FLT", "Faulty Data Holdings (sample)", 4, "121", "", 1.20, 0.02, 0.30, 300000}, dates,
+        rng);
+    const std::size_t n = bad.size();
+    const store::PriceRecord twice = bad[n - 31];
+    bad.insert(bad.begin() + static_cast<std::ptrdiff_t>(n - 30), twice); // a day twice
+    bad[n - 25].Date = "20261017";                                        // a Saturday
+    std::swap(bad[n - 22].Date, bad[n - 21].Date);                        // two days swapped
+    std::swap(bad[n - 18].High, bad[n - 18].Low);                         // high below low
+    bad[n - 15].Close = bad[n - 15].High * 1.1f;                          // close above the high
+    bad[n - 12].Low = 0;       // a zero price on a traded day
+    bad[n - 8].Volume = -5000; // negative volume
+    if (auto st =
+            add({"FLT", "Faulty Data Holdings (sample)", 4, "121", "", 1.20, 0.02, 0.30, 0}, bad);
+        !st)
+        return st;
+
+    // The old code stopped 40 days before the end; the user joins it to the new one with the
+    // code-change tool.
+    auto before = PriceHistory(
+        {"BRX", "Brook Energy (old code)", 4, "101", "", 0.85, 0.05, 0.35, 900000}, dates, rng);
+    std::vector<store::PriceRecord> after(before.end() - 40, before.end());
+    before.resize(before.size() - 40);
+    if (auto st = add({"BRX", "Brook Energy (old code)", 4, "101", "", 0, 0, 0, 0}, before); !st)
+        return st;
+    names.back().OtherDetails = "Now BRK";
+    if (auto st = add({"BRK", "Brook Energy (sample)", 4, "101", "", 0, 0, 0, 0}, after); !st)
+        return st;
+
+    // Five weeks without a record in the middle of the history.
+    auto holed = PriceHistory(
+        {"GAP", "Gapped History Mining (sample)", 4, "101", "", 2.40, 0.04, 0.40, 150000}, dates,
+        rng);
+    holed.erase(holed.end() - 150, holed.end() - 125);
+    if (auto st = add({"GAP", "Gapped History Mining (sample)", 4, "101", "", 0, 0, 0, 0}, holed);
+        !st)
+        return st;
+
+    // Copies kept by adjustments long done.
+    for (const char* code : {"ALX", "KRM", "HBK"}) {
+        const auto from = store::PriceFile::PathFor(dataFolder, code);
+        auto to = from;
+        to.replace_extension(".Old");
+        const auto bytes = platform::ReadWholeFile(from);
+        if (!bytes) return platform::Status::Error("Cannot read " + from.string());
+        if (auto st = platform::WriteFileAtomic(to, *bytes); !st) return st;
+    }
+    return platform::Status::Ok();
+}
+
 } // namespace
 
 platform::Status MakeSampleLibrary(const std::string& systemFolder, const std::string& dataFolder,
@@ -339,6 +408,7 @@ platform::Status MakeSampleLibrary(const std::string& systemFolder, const std::s
     }
     names[names.size() - 4].OtherDetails = "Exp 30/06/27"; // a warrant's details
     if (auto st = AddScanExamples(dataFolder, dates, names, summary); !st) return st;
+    if (auto st = AddDamagedExamples(dataFolder, dates, names, summary); !st) return st;
     names[3].PercentBandUp = 8;
     names[3].PercentBandDown = 8;
     store::NameFile nf(store::NameFile::PathIn(dataFolder));
@@ -621,15 +691,16 @@ platform::Status MakeSampleSecurityDetails(const std::string& dataFolder,
         "CODE,SHORTDESCRIPTION,SECURITYTYPE,FIRSTACTIVEDATE,FIRSTQUOTEDDATE,LASTQUOTEDATE,"
         "SUSPENSIONSTARTDATE,SUSPENSIONENDDATE,TOTALCLASSISSUE,PARVALUE,PAIDUPVALUE,ASSETBACKING,"
         "DIVENDRATEPERSHARE,EARNINGSPERSHARE,ANNUALDIVIDENDRATE,FRANKINGPERCENT,EXDATE,"
-        "DIVIDENTTYPE\r\n";
+        "DIVIDENTTYPE,GICSSECTORCODE\r\n";
     // Earnings and dividend stand in the 14th and 15th columns, where the details window
     // reads them.
     const auto line = [](const std::string& code, const std::string& name, long issue,
                          const std::string& dividend, const std::string& earnings,
-                         const std::string& franking, const std::string& exDate, bool interim) {
+                         const std::string& franking, const std::string& exDate, bool interim,
+                         const std::string& gics = "") {
         return code + "," + name + ",ORD,20100104,20100105,20261120,,," + std::to_string(issue) +
                ",0,0,0," + dividend + "," + earnings + "," + dividend + "," + franking + "," +
-               exDate + "," + (interim ? "I" : "F") + "\r\n";
+               exDate + "," + (interim ? "I" : "F") + "," + gics + "\r\n";
     };
     int i = 0;
     for (const auto& n : names) {
@@ -642,7 +713,9 @@ platform::Status MakeSampleSecurityDetails(const std::string& dataFolder,
             i % 7 == 0 ? "0" : platform::Format((i % 11 + 1) * 0.04, "0.00#");
         text += line(n.TrimmedCode(), platform::Upper(platform::Trim(n.Name)),
                      1000000L * (i * 37 % 900 + 10), dividend, earnings, i % 2 ? "100" : "0",
-                     "2026101" + std::to_string(i % 10), i % 3 == 0);
+                     "2026101" + std::to_string(i % 10), i % 3 == 0,
+                     // The download knows a sector for the names the sample left without one.
+                     platform::Trim(n.GicsSector).empty() ? "4010" : platform::Trim(n.GicsSector));
     }
     text += line("PRN", "PERENNIAL RESOURCES", 52000000, "0.01", "0.05", "100", "20260901", false);
     // A row whose description runs past what a record keeps.

@@ -32,14 +32,6 @@ void SaveFrame(ScanChoices& c, const scan::ScanFrame& f) {
     c.Put("Class", f.Class);
 }
 
-std::vector<std::string> ListingCodes(const auto& rows) {
-    std::vector<std::string> codes;
-    codes.reserve(rows.size());
-    for (const auto& r : rows)
-        codes.push_back(Trim(r.Code));
-    return codes;
-}
-
 constexpr std::array<const char*, 5> kOscKeys = {"STO", "WMS", "ROC", "MM", "RSI"};
 
 } // namespace
@@ -245,26 +237,41 @@ std::vector<PrintedPage> ListingPages(std::string_view title, const ScanListingL
     });
 }
 
+ListingScanForm::ListingScanForm(Session& session, std::string section, std::string heading,
+                                 bool withLists)
+    : m_session(session), m_choices(session.services().settings, std::move(section)) {
+    if (withLists) {
+        m_captions = ScanListCaptions(session);
+        ListIndex = m_choices.Index("List", static_cast<int>(m_captions.size()));
+    }
+    m_listing.Heading = std::move(heading);
+}
+
+void ListingScanForm::LoadShared(scan::ScanFrame& frame, bool* noWarrants) {
+    LoadFrame(m_choices, frame);
+    if (noWarrants) *noWarrants = m_choices.Tick("NoWarrants", *noWarrants);
+}
+
+void ListingScanForm::SaveShared(const scan::ScanFrame& frame, const bool* noWarrants) {
+    if (!m_captions.empty()) m_choices.Put("List", ListIndex);
+    SaveFrame(m_choices, frame);
+    if (noWarrants) m_choices.Put("NoWarrants", *noWarrants);
+}
+
 Scan2Form::Scan2Form(Session& session)
-    : m_session(session), m_choices(session.services().settings, "Scan2_Other"),
-      m_captions(ScanListCaptions(session)) {
+    : ListingScanForm(session, "Scan2_Other", std::string(scan::kScan2Heading), true) {
     auto& o = Options;
-    ListIndex = m_choices.Index("List", static_cast<int>(m_captions.size()));
-    LoadFrame(m_choices, o.Frame);
-    o.NoWarrants = m_choices.Tick("NoWarrants", o.NoWarrants);
+    LoadShared(o.Frame, &o.NoWarrants);
     o.Volume = m_choices.Tick("Volume", o.Volume);
     o.VolumePercent = m_choices.Text("VolumePercent", o.VolumePercent);
     o.VolumeDays = m_choices.Text("VolumeDays", o.VolumeDays);
     o.Price = m_choices.Tick("Price", o.Price);
     o.PricePercent = m_choices.Text("PricePercent", o.PricePercent);
-    m_listing.Heading = std::string(scan::kScan2Heading);
 }
 
 void Scan2Form::SaveChoices() {
     const auto& o = Options;
-    m_choices.Put("List", ListIndex);
-    SaveFrame(m_choices, o.Frame);
-    m_choices.Put("NoWarrants", o.NoWarrants);
+    SaveShared(o.Frame, &o.NoWarrants);
     m_choices.Put("Volume", o.Volume);
     m_choices.Put("VolumePercent", o.VolumePercent);
     m_choices.Put("VolumeDays", o.VolumeDays);
@@ -281,10 +288,7 @@ const scan::Scan2Result& Scan2Form::Run(platform::Progress& progress) {
     Options.List = ScanListLetter(ListIndex);
     Options.ReportFolder = TempFolder(m_session).string();
     m_result = scan::RunScan2(m_session.folders.DataFolder, Options, progress);
-    m_listing.Lines.clear();
-    for (const auto& r : m_result.Rows)
-        m_listing.Lines.push_back(scan::Scan2Line(r));
-    m_listing.Codes = ListingCodes(m_result.Rows);
+    List(m_result.Rows, scan::Scan2Line);
     return m_result;
 }
 
@@ -293,24 +297,18 @@ std::vector<PrintedPage> Scan2Form::Pages(int linesPerPage) const {
 }
 
 Scan3Form::Scan3Form(Session& session)
-    : m_session(session), m_choices(session.services().settings, "Scan3_Other"),
-      m_captions(ScanListCaptions(session)) {
+    : ListingScanForm(session, "Scan3_Other", std::string(scan::kScan3Heading), true) {
     auto& o = Options;
-    ListIndex = m_choices.Index("List", static_cast<int>(m_captions.size()));
-    LoadFrame(m_choices, o.Frame);
-    o.NoWarrants = m_choices.Tick("NoWarrants", o.NoWarrants);
+    LoadShared(o.Frame, &o.NoWarrants);
     o.Up = m_choices.Tick("Up", o.Up);
     o.Down = m_choices.Tick("Down", o.Down);
     o.CategoryOn = m_choices.Tick("CategoryOn", o.CategoryOn);
     o.Category = m_choices.Text("Category", o.Category);
-    m_listing.Heading = std::string(scan::kScan3Heading);
 }
 
 void Scan3Form::SaveChoices() {
     const auto& o = Options;
-    m_choices.Put("List", ListIndex);
-    SaveFrame(m_choices, o.Frame);
-    m_choices.Put("NoWarrants", o.NoWarrants);
+    SaveShared(o.Frame, &o.NoWarrants);
     m_choices.Put("Up", o.Up);
     m_choices.Put("Down", o.Down);
     m_choices.Put("CategoryOn", o.CategoryOn);
@@ -325,10 +323,7 @@ const scan::Scan3Result& Scan3Form::Run(platform::Progress& progress) {
     SaveChoices();
     Options.List = ScanListLetter(ListIndex);
     m_result = scan::RunScan3(m_session.folders.DataFolder, Options, progress);
-    m_listing.Lines.clear();
-    for (const auto& r : m_result.Rows)
-        m_listing.Lines.push_back(scan::Scan3Line(r));
-    m_listing.Codes = ListingCodes(m_result.Rows);
+    List(m_result.Rows, scan::Scan3Line);
     return m_result;
 }
 
@@ -337,11 +332,10 @@ std::vector<PrintedPage> Scan3Form::Pages(int linesPerPage) const {
 }
 
 Scan6Form::Scan6Form(Session& session)
-    : m_session(session), m_choices(session.services().settings, "Scan6_Other") {
+    : ListingScanForm(session, "Scan6_Other", "Code\tL/Price\tGap %\tName\tClass", false) {
     auto& o = Options;
-    LoadFrame(m_choices, o.Frame);
+    LoadShared(o.Frame, nullptr);
     o.CodeLength = CodeLengths()[static_cast<std::size_t>(m_choices.Index("CodeLength", 5))];
-    m_listing.Heading = "Code\tL/Price\tGap %\tName\tClass";
     ReadAverages();
 }
 
@@ -357,7 +351,7 @@ void Scan6Form::ReadAverages() {
 }
 
 void Scan6Form::SaveChoices() {
-    SaveFrame(m_choices, Options.Frame);
+    SaveShared(Options.Frame, nullptr);
     const auto& lengths = CodeLengths();
     const auto at = std::find(lengths.begin(), lengths.end(), Options.CodeLength);
     m_choices.Put("CodeLength", static_cast<int>(at == lengths.end() ? 0 : at - lengths.begin()));
@@ -374,10 +368,7 @@ const scan::Scan6Result& Scan6Form::Run(platform::Progress& progress) {
     ReadAverages();
     Options.ReportFolder = TempFolder(m_session).string();
     m_result = scan::RunScan6(m_session.folders.DataFolder, Options, progress);
-    m_listing.Lines.clear();
-    for (const auto& r : m_result.Rows)
-        m_listing.Lines.push_back(scan::Scan6Line(r));
-    m_listing.Codes = ListingCodes(m_result.Rows);
+    List(m_result.Rows, scan::Scan6Line);
     return m_result;
 }
 

@@ -5,6 +5,7 @@
 #include "app/grid_model.h"
 #include "app/printed_pages.h"
 #include "app/session.h"
+#include "platform/text.h"
 #include "scan/chart_scans.h"
 #include "scan/cht_scan1.h"
 
@@ -92,49 +93,65 @@ struct ScanListingLines {
 std::vector<PrintedPage> ListingPages(std::string_view title, const ScanListingLines& listing,
                                       int linesPerPage);
 
-class Scan2Form {
+// What the listing scans share: their session, their remembered choices, the list choice
+// (where the scan offers one) and the listing of their finds.
+class ListingScanForm {
 public:
-    explicit Scan2Form(Session& session);
     const std::vector<std::string>& listCaptions() const { return m_captions; }
     int ListIndex = 0;
+    const ScanListingLines& listing() const { return m_listing; }
+
+protected:
+    // `withLists`: the scan walks a chosen list, remembered with its choices.
+    ListingScanForm(Session& session, std::string section, std::string heading, bool withLists);
+    // The list, frame and warrant choices kept with the others.
+    void LoadShared(scan::ScanFrame& frame, bool* noWarrants);
+    void SaveShared(const scan::ScanFrame& frame, const bool* noWarrants);
+    // The finds as lines, with their codes for the charts.
+    template <class Row, class LineOf> void List(const std::vector<Row>& rows, LineOf lineOf) {
+        m_listing.Lines.clear();
+        m_listing.Codes.clear();
+        for (const auto& r : rows) {
+            m_listing.Lines.push_back(lineOf(r));
+            m_listing.Codes.push_back(platform::Trim(r.Code));
+        }
+    }
+
+    Session& m_session;
+    ScanChoices m_choices;
+    std::vector<std::string> m_captions;
+    ScanListingLines m_listing;
+};
+
+class Scan2Form : public ListingScanForm {
+public:
+    explicit Scan2Form(Session& session);
     scan::Scan2Options Options;
 
     std::optional<scan::ScanMessage> Refusal() const;
     const scan::Scan2Result& Run(platform::Progress& progress);
-    const ScanListingLines& listing() const { return m_listing; }
     std::vector<PrintedPage> Pages(int linesPerPage) const;
     void SaveChoices();
 
 private:
-    Session& m_session;
-    ScanChoices m_choices;
-    std::vector<std::string> m_captions;
     scan::Scan2Result m_result;
-    ScanListingLines m_listing;
 };
 
-class Scan3Form {
+class Scan3Form : public ListingScanForm {
 public:
     explicit Scan3Form(Session& session);
-    const std::vector<std::string>& listCaptions() const { return m_captions; }
-    int ListIndex = 0;
     scan::Scan3Options Options;
 
     std::optional<scan::ScanMessage> Refusal() const;
     const scan::Scan3Result& Run(platform::Progress& progress);
-    const ScanListingLines& listing() const { return m_listing; }
     std::vector<PrintedPage> Pages(int linesPerPage) const;
     void SaveChoices();
 
 private:
-    Session& m_session;
-    ScanChoices m_choices;
-    std::vector<std::string> m_captions;
     scan::Scan3Result m_result;
-    ScanListingLines m_listing;
 };
 
-class Scan6Form {
+class Scan6Form : public ListingScanForm {
 public:
     explicit Scan6Form(Session& session);
     // "Code length": "All, 3, 4, 5, 6".
@@ -143,7 +160,6 @@ public:
 
     std::optional<scan::ScanMessage> Refusal();
     const scan::Scan6Result& Run(platform::Progress& progress);
-    const ScanListingLines& listing() const { return m_listing; }
     // The rows the box shows: the last 23 when there are more.
     int FirstShownLine() const;
     std::vector<PrintedPage> Pages(int linesPerPage) const;
@@ -152,10 +168,7 @@ public:
 private:
     void ReadAverages();
 
-    Session& m_session;
-    ScanChoices m_choices;
     scan::Scan6Result m_result;
-    ScanListingLines m_listing;
 };
 
 } // namespace kori::app

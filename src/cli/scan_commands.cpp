@@ -172,6 +172,26 @@ void AddScan1(CLI::App& app, CliContext& ctx) {
     });
 }
 
+// The finds of a listing scan: JSON rows and the closing message, or the listing as the window
+// shows it (under its title and heading where the scan has them) and the message.
+template <class Result, class RowJson, class LineOf>
+void ShowListingResult(CliContext& ctx, bool asJson, const Result& r, std::string_view heading,
+                       RowJson rowJson, LineOf lineOf) {
+    ShowIssues(ctx, r.Issues);
+    Check(r.Status);
+    if (asJson) {
+        json rows = json::array();
+        for (const auto& row : r.Rows)
+            rows.push_back(rowJson(row));
+        ctx.out << json{{"rows", rows}, {"message", MessageText(r.Message)}}.dump() << "\n";
+        return;
+    }
+    if (!heading.empty()) ctx.out << heading;
+    for (const auto& row : r.Rows)
+        ctx.out << lineOf(row) << "\n";
+    PrintMessage(ctx.out, r.Message, r.Cancelled);
+}
+
 void AddScan2(CLI::App& app, CliContext& ctx) {
     auto* cmd = app.add_subcommand("scan2", "Chart Scan 2 (Increases in Volume)");
     struct Options {
@@ -205,22 +225,16 @@ void AddScan2(CLI::App& app, CliContext& ctx) {
         so.ReportFolder = app::TempFolder(session).string();
         if (auto m = scan::ValidateScan2(so)) Refuse(*m);
         const auto r = scan::RunScan2(session.folders.DataFolder, so, session.services().progress);
-        ShowIssues(ctx, r.Issues);
-        Check(r.Status);
-        if (o->json) {
-            json rows = json::array();
-            for (const auto& row : r.Rows)
-                rows.push_back({{"code", TextJson(row.Code)},
-                                {"close", FloatJson(row.Close)},
-                                {"vol_up", row.VolUp ? json(*row.VolUp) : json(nullptr)},
-                                {"change", OptionalNumber(row.Change)}});
-            ctx.out << json{{"rows", rows}, {"message", MessageText(r.Message)}}.dump() << "\n";
-            return;
-        }
-        ctx.out << scan::kScan2Title << "\n" << scan::kScan2Heading << "\n";
-        for (const auto& row : r.Rows)
-            ctx.out << scan::Scan2Line(row) << "\n";
-        PrintMessage(ctx.out, r.Message, r.Cancelled);
+        ShowListingResult(
+            ctx, o->json, r,
+            std::string(scan::kScan2Title) + "\n" + std::string(scan::kScan2Heading) + "\n",
+            [](const scan::Scan2Row& row) {
+                return json{{"code", TextJson(row.Code)},
+                            {"close", FloatJson(row.Close)},
+                            {"vol_up", row.VolUp ? json(*row.VolUp) : json(nullptr)},
+                            {"change", OptionalNumber(row.Change)}};
+            },
+            scan::Scan2Line);
     });
 }
 
@@ -251,21 +265,15 @@ void AddScan3(CLI::App& app, CliContext& ctx) {
         so.NoWarrants = o->noWarrants;
         if (auto m = scan::ValidateScan3(so)) Refuse(*m);
         const auto r = scan::RunScan3(session.folders.DataFolder, so, session.services().progress);
-        ShowIssues(ctx, r.Issues);
-        Check(r.Status);
-        if (o->json) {
-            json rows = json::array();
-            for (const auto& row : r.Rows)
-                rows.push_back({{"code", TextJson(row.Code)},
-                                {"close", FloatJson(row.Close)},
-                                {"direction", row.Direction}});
-            ctx.out << json{{"rows", rows}, {"message", MessageText(r.Message)}}.dump() << "\n";
-            return;
-        }
-        ctx.out << scan::kScan3Title << "\n" << scan::kScan3Heading << "\n";
-        for (const auto& row : r.Rows)
-            ctx.out << scan::Scan3Line(row) << "\n";
-        PrintMessage(ctx.out, r.Message, r.Cancelled);
+        ShowListingResult(
+            ctx, o->json, r,
+            std::string(scan::kScan3Title) + "\n" + std::string(scan::kScan3Heading) + "\n",
+            [](const scan::Scan3Row& row) {
+                return json{{"code", TextJson(row.Code)},
+                            {"close", FloatJson(row.Close)},
+                            {"direction", row.Direction}};
+            },
+            scan::Scan3Line);
     });
 }
 
@@ -292,22 +300,16 @@ void AddScan6(CLI::App& app, CliContext& ctx) {
         if (auto m = scan::ValidateScan6(so)) Refuse(*m);
         so.ReportFolder = app::TempFolder(session).string();
         const auto r = scan::RunScan6(session.folders.DataFolder, so, session.services().progress);
-        ShowIssues(ctx, r.Issues);
-        Check(r.Status);
-        if (o->json) {
-            json rows = json::array();
-            for (const auto& row : r.Rows)
-                rows.push_back({{"code", TextJson(row.Code)},
-                                {"close", FloatJson(row.Close)},
-                                {"gap", row.Gap},
-                                {"name", TextJson(row.Name)},
-                                {"class", TextJson(row.Class)}});
-            ctx.out << json{{"rows", rows}, {"message", MessageText(r.Message)}}.dump() << "\n";
-            return;
-        }
-        for (const auto& row : r.Rows)
-            ctx.out << scan::Scan6Line(row) << "\n";
-        PrintMessage(ctx.out, r.Message, r.Cancelled);
+        ShowListingResult(
+            ctx, o->json, r, "",
+            [](const scan::Scan6Row& row) {
+                return json{{"code", TextJson(row.Code)},
+                            {"close", FloatJson(row.Close)},
+                            {"gap", row.Gap},
+                            {"name", TextJson(row.Name)},
+                            {"class", TextJson(row.Class)}};
+            },
+            scan::Scan6Line);
     });
 }
 

@@ -3,10 +3,13 @@
 #include "platform/date_text.h"
 #include "platform/number_format.h"
 #include "platform/text.h"
+#include "store/two_thread_walk.h"
 
 #include <algorithm>
+#include <array>
 #include <cmath>
 #include <filesystem>
+#include <mutex>
 #include <unordered_map>
 
 namespace kori::maint {
@@ -214,54 +217,70 @@ std::vector<Finding> StoppedTrading(const store::NameRecord& name, std::string_v
 DataCheckResult CheckLibrary(const store::SecurityList& list, const DataCheckSettings& settings,
                              platform::Progress& progress) {
     DataCheckResult result;
-    struct Last {
+    // One slot a place in the walk, filled by whichever thread checked it, so the report keeps
+    // the walk's order.
+    struct Checked {
+        bool Done = false;
         store::NameRecord Name;
-        std::string Date;
-        int Record = 0;
-        std::size_t FindingsEnd = 0; // where its stopped-trading row goes
+        std::vector<Finding> Findings;
+        std::string LastDate;
+        int LastRecord = 0;
     };
-    std::vector<Last> lasts;
-    std::vector<store::PriceRecord> records;
+    std::vector<Checked> slots;
+    std::mutex grow;
+    struct Buffers {
+        std::string Bytes;
+        std::vector<store::PriceRecord> Records;
+    };
+    std::array<Buffers, 2> buffers;
     progress.SetStatus("Checking data");
-    const auto walk = store::ForEachSecurity(list, progress, [&](const store::WalkItem& item) {
-        store::PriceFile file(item.PriceFile);
-        if (auto s = file.ReadAll(records); !s) {
-            result.Findings.push_back({item.Name.TrimmedCode(), platform::Trim(item.Name.Name), "",
-                                       0, std::string(finding::Damaged), s.message()});
-            return store::WalkStep::Continue;
-        }
-        HistoryChecker checker(item.Name, settings);
-        auto found = checker.Run(records);
-        result.Findings.insert(result.Findings.end(), std::make_move_iterator(found.begin()),
-                               std::make_move_iterator(found.end()));
-        Last last{item.Name, checker.lastDate(), checker.lastRecord(), result.Findings.size()};
-        if (last.Date > result.LatestDate) result.LatestDate = last.Date;
-        lasts.push_back(std::move(last));
-        ++result.Checked;
-        return store::WalkStep::Continue;
-    });
+    const auto walk =
+        store::WalkOnTwoThreads(list, progress, [&](int thread, const store::WalkItem& item) {
+            auto& [bytes, records] = buffers[static_cast<std::size_t>(thread)];
+            Checked c;
+            c.Done = true;
+            c.Name = item.Name;
+            records.clear();
+            if (auto s = store::ReadPriceRecords(item.PriceFile, 1, item.PriceRecords, bytes); !s) {
+                c.Findings.push_back({item.Name.TrimmedCode(), platform::Trim(item.Name.Name), "",
+                                      0, std::string(finding::Damaged), s.message()});
+                c.LastRecord = -1; // no history to have stopped
+            } else {
+                for (std::size_t at = 0; at < bytes.size(); at += store::PriceRecord::kSize)
+                    records.push_back(store::PriceRecord::Decode(bytes.data() + at));
+                HistoryChecker checker(item.Name, settings);
+                c.Findings = checker.Run(records);
+                c.LastDate = checker.lastDate();
+                c.LastRecord = checker.lastRecord();
+            }
+            std::lock_guard lock(grow);
+            if (slots.size() < static_cast<std::size_t>(item.Position))
+                slots.resize(static_cast<std::size_t>(item.Position));
+            slots[static_cast<std::size_t>(item.Position - 1)] = std::move(c);
+        });
     result.Status = walk.Status;
     result.Cancelled = walk.Cancelled;
+    for (const auto& c : slots)
+        if (c.Done && c.LastRecord >= 0) {
+            ++result.Checked;
+            if (c.LastDate > result.LatestDate) result.LatestDate = c.LastDate;
+        }
 
     // Stopped trading needs the latest date of all: each row goes after its security's others.
-    std::vector<Finding> merged;
-    merged.reserve(result.Findings.size());
-    std::size_t from = 0;
-    for (const auto& last : lasts) {
-        merged.insert(merged.end(), result.Findings.begin() + static_cast<long>(from),
-                      result.Findings.begin() + static_cast<long>(last.FindingsEnd));
-        from = last.FindingsEnd;
+    for (auto& c : slots) {
+        if (!c.Done) continue;
+        for (auto& f : c.Findings)
+            result.Findings.push_back(std::move(f));
+        if (c.LastRecord < 0) continue;
         for (auto& f :
-             StoppedTrading(last.Name, last.Date, last.Record, result.LatestDate, settings))
-            merged.push_back(std::move(f));
+             StoppedTrading(c.Name, c.LastDate, c.LastRecord, result.LatestDate, settings))
+            result.Findings.push_back(std::move(f));
     }
-    merged.insert(merged.end(), result.Findings.begin() + static_cast<long>(from),
-                  result.Findings.end());
     for (const auto& issue : walk.Issues) {
         const std::string code = std::filesystem::path(issue.file).stem().string();
-        merged.push_back({code, "", "", issue.record, std::string(finding::Damaged), issue.text});
+        result.Findings.push_back(
+            {code, "", "", issue.record, std::string(finding::Damaged), issue.text});
     }
-    result.Findings = std::move(merged);
     return result;
 }
 

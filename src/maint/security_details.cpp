@@ -259,6 +259,23 @@ std::optional<SecurityDetails> LookUpSecurityDetails(const std::string& systemFo
     return found;
 }
 
+std::vector<SecurityDetails> ReadAllSecurityDetails(const std::string& systemFolder) {
+    std::vector<SecurityDetails> all;
+    const auto bytes =
+        platform::ReadWholeFile(platform::ResolveIn(systemFolder, AsxDetailsFiles().Records));
+    if (!bytes) return all;
+    all.reserve(bytes->size() / kDetailsRecord);
+    for (std::size_t at = 0; at + kDetailsRecord <= bytes->size(); at += kDetailsRecord) {
+        const std::string_view rec(bytes->data() + at, kDetailsRecord);
+        SecurityDetails d;
+        d.Code = Trim(rec.substr(0, kDetailsCodeWidth));
+        d.Rest = TrimRight(rec.substr(kDetailsCodeWidth));
+        d.Fields = platform::SplitQuoted(d.Rest);
+        all.push_back(std::move(d));
+    }
+    return all;
+}
+
 DetailsHeader ReadDetailsHeader(const std::string& systemFolder, bool london) {
     DetailsHeader h;
     const auto& files = london ? UkDetailsFiles() : AsxDetailsFiles();
@@ -292,6 +309,23 @@ std::vector<std::string> DetailsTextBox(const DetailsHeader& header, const Secur
                                      ? platform::Format(*dividend / lastClose, "#.0%")
                                      : std::string("n/a")));
     return lines;
+}
+
+std::optional<std::map<std::string, std::string>>
+GicsSectorsFromDetails(const std::string& systemFolder) {
+    const DetailsHeader header = ReadDetailsHeader(systemFolder);
+    // The keys name the fields of the whole line, the code being the first.
+    std::size_t column = 0;
+    for (std::size_t k = 1; k < header.Keys.size() && column == 0; ++k)
+        if (Upper(header.Keys[k]).find("GICS") != std::string::npos) column = k;
+    if (column == 0) return std::nullopt;
+    std::map<std::string, std::string> sectors;
+    for (auto& d : ReadAllSecurityDetails(systemFolder)) {
+        if (column - 1 >= d.Fields.size()) continue;
+        // Both files keep "PRN" in its safe form, so the codes meet as stored.
+        sectors.emplace(d.Code, Trim(d.Fields[column - 1]));
+    }
+    return sectors;
 }
 
 } // namespace kori::maint

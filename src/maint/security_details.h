@@ -4,6 +4,7 @@
 // security's details are found with one short read.
 #include "platform/status.h"
 
+#include <map>
 #include <optional>
 #include <string>
 #include <string_view>
@@ -52,6 +53,9 @@ struct SecurityDetails {
 std::optional<SecurityDetails> LookUpSecurityDetails(const std::string& systemFolder,
                                                      std::string_view code);
 
+// Every record of the details file in file order; empty when it is missing.
+std::vector<SecurityDetails> ReadAllSecurityDetails(const std::string& systemFolder);
+
 // The keys of the header file and their labels (two lines); empty when it is missing.
 struct DetailsHeader {
     std::vector<std::string> Keys;
@@ -64,5 +68,11 @@ DetailsHeader ReadDetailsHeader(const std::string& systemFolder, bool london = f
 // (or, for the ratio, without a price) shows "n/a". The keys of the header name the fields used.
 std::vector<std::string> DetailsTextBox(const DetailsHeader& header, const SecurityDetails& details,
                                         double lastClose);
+
+// The GICS sector digits of each security from the column whose header key names the GICS
+// sector (a key holding "GICS"), keyed by the stored code; nullopt when the
+// downloaded table has no such column.
+std::optional<std::map<std::string, std::string>>
+GicsSectorsFromDetails(const std::string& systemFolder);
 
 } // namespace kori::maint

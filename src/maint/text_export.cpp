@@ -34,26 +34,28 @@ std::string IsoDate(std::string_view d) {
 
 // The record of `date` near the end of a file: the last records are read first, as exports
 // are nearly always of recent days, and the whole file only when the date lies further back.
-std::optional<store::PriceRecord> RecordOn(store::PriceFile& file, std::string_view date) {
+// The record of `date` in a price file of `count` records: the last weeks first, where an export
+// of a recent day finds it in one read; the rest of the file only when the date is older.
+// `bytes` is reused from file to file.
+std::optional<store::PriceRecord> RecordOn(const std::filesystem::path& file, int count,
+                                           std::string_view date, std::string& bytes) {
     constexpr int kTail = 64;
-    const int count = file.Count();
-    std::string bytes;
-    auto search = [&](int first) -> std::optional<store::PriceRecord> {
-        if (!file.ReadRange(first, count, bytes)) return std::nullopt;
-        for (int i = count - first; i >= 0; --i) {
-            const auto r = store::PriceRecord::Decode(bytes.data() + static_cast<std::size_t>(i) *
-                                                                         store::PriceRecord::kSize);
-            if (r.Date == date) return r;
+    auto search = [&](int first, int last) -> std::optional<store::PriceRecord> {
+        if (!store::ReadPriceRecords(file, first, last, bytes)) return std::nullopt;
+        for (int i = last - first; i >= 0; --i) {
+            const char* rec =
+                bytes.data() + static_cast<std::size_t>(i) * store::PriceRecord::kSize;
+            if (std::string_view(rec, date.size()) == date) return store::PriceRecord::Decode(rec);
         }
         return std::nullopt;
     };
+    if (count < 1) return std::nullopt;
     const int first = std::max(1, count - kTail + 1);
-    if (auto r = search(first)) return r;
-    if (first == 1) return std::nullopt;
-    std::string head;
-    if (!file.ReadRange(first, first, head)) return std::nullopt;
-    if (store::PriceRecord::Decode(head.data()).Date < date) return std::nullopt;
-    return search(1);
+    if (auto r = search(first, count)) return r;
+    if (first == 1 || bytes.size() < store::PriceRecord::kSize) return std::nullopt;
+    // The tail starts before the date: had the file held it, the tail would have.
+    if (std::string_view(bytes.data(), date.size()) < date) return std::nullopt;
+    return search(1, first - 1);
 }
 
 const char* const kMonths[] = {"JAN", "FEB", "MAR", "APR", "MAY", "JUN",
@@ -88,10 +90,9 @@ ClosesExport ExportCloses(const store::SecurityList& list, std::string_view date
     }
     out.Csv = "Code,Name,Date,Close,Volume\n";
     progress.SetStatus("Writing the closing prices");
+    std::string bytes;
     const auto walk = store::ForEachSecurity(list, progress, [&](const store::WalkItem& it) {
-        store::PriceFile f(it.PriceFile);
-        std::optional<store::PriceRecord> r;
-        if (f.Open()) r = RecordOn(f, out.Date);
+        const auto r = RecordOn(it.PriceFile, it.PriceRecords, out.Date, bytes);
         if (!r || r->Close == 0) {
             ++out.NotTraded;
             return store::WalkStep::Continue;

@@ -1,9 +1,9 @@
 #include "scan/cht_scan1.h"
 
 #include "platform/text.h"
-#include "scan/two_thread_walk.h"
 #include "store/price_file.h"
 #include "store/security_walk.h"
+#include "store/two_thread_walk.h"
 
 #include <algorithm>
 #include <cmath>
@@ -243,9 +243,10 @@ Scan1Result RunScan1(std::string_view dataFolder, const Scan1Options& o, const o
     walk.category = static_cast<std::int16_t>(platform::Val(o.Category));
     progress.SetStatus(kCheckingData);
     store::SecurityList list{std::string(dataFolder), o.List};
-    const auto walked = WalkOnTwoThreads(list, progress, [&](int thread, const store::WalkItem& i) {
-        walk.Visit(walk.state[thread], i);
-    });
+    const auto walked =
+        store::WalkOnTwoThreads(list, progress, [&](int thread, const store::WalkItem& i) {
+            walk.Visit(walk.state[thread], i);
+        });
     result.Cancelled = walked.Cancelled;
     result.Issues = walked.Issues;
     walk.Gather(result);

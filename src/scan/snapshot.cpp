@@ -4,9 +4,9 @@
 #include "osc/osc_compute.h"
 #include "platform/number_format.h"
 #include "platform/text.h"
-#include "scan/two_thread_walk.h"
 #include "store/load_chart_series.h"
 #include "store/price_file.h"
+#include "store/two_thread_walk.h"
 
 #include <algorithm>
 #include <array>
@@ -155,7 +155,7 @@ SnapshotResult TakeSnapshot(const store::SecurityList& list, const SnapshotSetti
     std::array<std::string, 2> buffers;
     progress.SetStatus("Taking the snapshot");
     const auto walk =
-        WalkOnTwoThreads(list, progress, [&](int thread, const store::WalkItem& item) {
+        store::WalkOnTwoThreads(list, progress, [&](int thread, const store::WalkItem& item) {
             auto& bytes = buffers[static_cast<std::size_t>(thread)];
             const int first = std::max(1, item.PriceRecords - kSnapshotRecords + 1);
             if (!store::ReadPriceRecords(item.PriceFile, first, item.PriceRecords, bytes)) return;

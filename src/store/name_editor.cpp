@@ -460,6 +460,60 @@ int RefreshOptionDetails(std::vector<TextRow>& rows) {
     return changed;
 }
 
+int UpdateNamesFromMaster(std::vector<TextRow>& rows,
+                          const std::map<std::string, std::string>& master) {
+    int changed = 0;
+    for (TextRow& r : rows) {
+        const auto it = master.find(Trim(r[kNameCode]));
+        if (it == master.end()) continue;
+        std::string name = it->second;
+        std::erase(name, ',');
+        name = Trim(name.substr(0, NameRecord::kNameWidth));
+        if (name.empty() || name == r[kNameName]) continue;
+        r[kNameName] = name;
+        ++changed;
+    }
+    return changed;
+}
+
+int CopyClassFromUnderlying(std::vector<TextRow>& rows) {
+    std::map<std::string, std::string> classes;
+    for (const TextRow& r : rows)
+        if (const std::string code = Trim(r[kNameCode]); code.size() == 3)
+            classes.emplace(code, Trim(r[kNameIndustry]));
+    int changed = 0;
+    for (TextRow& r : rows) {
+        const std::string code = Trim(r[kNameCode]);
+        if (code.size() <= 3) continue;
+        const auto it = classes.find(code.substr(0, 3));
+        if (it == classes.end() || it->second.empty() || it->second == Trim(r[kNameIndustry]))
+            continue;
+        r[kNameIndustry] = it->second;
+        ++changed;
+    }
+    return changed;
+}
+
+int UpdateGicsSectors(std::vector<TextRow>& rows,
+                      const std::map<std::string, std::string>& sectors) {
+    int changed = 0;
+    for (TextRow& r : rows) {
+        const auto it = sectors.find(Trim(r[kNameCode]));
+        if (it == sectors.end()) continue;
+        const std::string digits = Trim(it->second);
+        if (digits.empty() || digits.size() > 4 ||
+            !std::all_of(digits.begin(), digits.end(),
+                         [](unsigned char c) { return std::isdigit(c) != 0; }) ||
+            platform::Val(digits) == 0)
+            continue;
+        const std::string sector = platform::Format(platform::Val(digits), "0000");
+        if (sector == Trim(r[kNameGics])) continue;
+        r[kNameGics] = sector;
+        ++changed;
+    }
+    return changed;
+}
+
 std::optional<std::int16_t> CategoryAnswer(std::string_view text) {
     if (const auto v = WholeIn(text, 0, 99)) return static_cast<std::int16_t>(*v);
     return std::nullopt;

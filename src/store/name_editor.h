@@ -9,6 +9,7 @@
 #include "store/name_record.h"
 
 #include <array>
+#include <map>
 #include <optional>
 #include <string>
 #include <string_view>
@@ -119,6 +120,21 @@ std::optional<std::string> OptionDetailsFromName(std::string_view name);
 // The rows changed.
 int RefreshOptionDetails(std::vector<TextRow>& rows);
 
+// "Update Names from KORI Master list": each row whose trimmed code has an entry in `master`
+// (code to name) takes that name, cut to the field and with commas dropped, so that the cell
+// rules still hold. The number of rows changed.
+int UpdateNamesFromMaster(std::vector<TextRow>& rows,
+                          const std::map<std::string, std::string>& master);
+// "Update Indust.Classifications from underlying stock": a derived security (a code longer
+// than three characters whose first three are the code of another row, as options and warrants
+// are coded) takes the industry class of that underlying row when the underlying has one. The
+// number of rows changed.
+int CopyClassFromUnderlying(std::vector<TextRow>& rows);
+// "Update GICS Sectors from download": each row whose code has a numeric, non-zero sector in
+// `sectors` (code to sector digits) takes it formatted "0000". The number of rows changed.
+int UpdateGicsSectors(std::vector<TextRow>& rows,
+                      const std::map<std::string, std::string>& sectors);
+
 // A category typed into the prompt: 0 to 99. A record type: 4 or 5.
 std::optional<std::int16_t> CategoryAnswer(std::string_view text);
 std::optional<std::int16_t> RecordTypeAnswer(std::string_view text);
@@ -161,6 +177,11 @@ inline constexpr std::string_view kChangedQuestion = "File has changed. SAVE Cha
 inline constexpr std::string_view kNoRecords = "There are no records in ";
 inline constexpr std::string_view kNoRecordsTitle = "Name File List";
 inline constexpr std::string_view kCaption = "NAMES.DAT";
+inline constexpr std::string_view kNamesUpdated = " names updated from the master list";
+inline constexpr std::string_view kClassesUpdated = " industry classifications updated";
+inline constexpr std::string_view kSectorsUpdated = " GICS sectors updated";
+inline constexpr std::string_view kNoSectorColumn =
+    "The downloaded security details hold no GICS sector column";
 inline constexpr std::string_view kNoTradeCaption =
     "NAMES.DAT         During update a NoTrade record will NOT be added to stock categories 90 "
     "to 99 ";

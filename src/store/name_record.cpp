@@ -11,8 +11,8 @@ std::array<char, NameRecord::kSize> NameRecord::Encode() const {
     Put(b.data() + 0, Status);
     PutText(b.data() + 2, Code, 6);
     Put(b.data() + 8, RecordType);
-    PutText(b.data() + 10, Name, 35);
-    PutText(b.data() + 45, OtherDetails, 15);
+    PutText(b.data() + 10, Name, kNameWidth);
+    PutText(b.data() + 45, OtherDetails, kOtherDetailsWidth);
     Put(b.data() + 60, Base);
     Put(b.data() + 64, Top);
     Put(b.data() + 68, PFIncrement);
@@ -34,8 +34,8 @@ NameRecord NameRecord::Decode(const char* p) {
     r.Status = Get<std::int16_t>(p + 0);
     r.Code = GetText(p + 2, 6);
     r.RecordType = Get<std::int16_t>(p + 8);
-    r.Name = GetText(p + 10, 35);
-    r.OtherDetails = GetText(p + 45, 15);
+    r.Name = GetText(p + 10, kNameWidth);
+    r.OtherDetails = GetText(p + 45, kOtherDetailsWidth);
     r.Base = Get<float>(p + 60);
     r.Top = Get<float>(p + 64);
     r.PFIncrement = Get<float>(p + 68);

@@ -15,6 +15,8 @@ constexpr bool IsCloseOnly(int recordType) {
 
 struct NameRecord {
     static constexpr std::size_t kSize = 96;
+    static constexpr std::size_t kNameWidth = 35;
+    static constexpr std::size_t kOtherDetailsWidth = 15;
 
     std::int16_t Status = 0;     // 0 ordinary, 1 deleted, 9 dealt with by the adjustment run
     std::string Code;            // 6, upper case; also the price file's base name

@@ -76,7 +76,7 @@ public:
         if (count > 0) {
             const auto content = platform::ReadWholeFile(m_path);
             if (!content) return platform::Status::Error("Cannot read " + m_path.string());
-            bytes = *content;
+            bytes = std::move(*content);
         }
         out.reserve(static_cast<std::size_t>(count));
         for (int i = 0; i < count; ++i)

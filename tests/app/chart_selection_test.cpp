@@ -39,7 +39,7 @@ TEST_F(Selection, FirstLoadReadsTheSettingsWithTheirLimitsAndShowsRecordOne) {
     EXPECT_EQ(f.PeriodIndex, 0);
     EXPECT_EQ(f.ListCaption, " FULL LIST   (Names.Dat)");
     EXPECT_EQ(f.Position, 1);
-    EXPECT_EQ(f.Count, 50);
+    EXPECT_EQ(f.Count, 54);
     // Record 1 is an index (type 1): it cannot be a bar chart whatever Type says.
     EXPECT_EQ(f.Code, "XAO");
     EXPECT_EQ(f.StyleIndex, 2);
@@ -100,7 +100,7 @@ TEST_F(Selection, ScrollBarAndSpacingWrap) {
     sel.ScrollTo(10);
     EXPECT_EQ(sel.form().Position, 10);
     EXPECT_EQ(Beeps(), 0);
-    sel.ScrollTo(51);
+    sel.ScrollTo(55);
     EXPECT_EQ(sel.form().Position, 1);
     EXPECT_EQ(Beeps(), 1);
 
@@ -209,7 +209,7 @@ TEST_F(Selection, ChartListsAndTheEmptyListFallback) {
     sel.Activate();
     EXPECT_EQ(state.Request.ListMode, 1);
     EXPECT_EQ(sel.form().ListCaption, " FULL LIST   (Names.Dat)");
-    EXPECT_EQ(sel.form().Count, 50);
+    EXPECT_EQ(sel.form().Count, 54);
     EXPECT_FALSE(s.dialogs.messages().empty());
 }
 

@@ -1,6 +1,8 @@
 #include "app/data_form_model.h"
 #include "app/name_form_model.h"
 #include "platform/files.h"
+#include "platform/text.h"
+#include "store/master_list.h"
 #include "store/name_file.h"
 #include "store/store_builders.h"
 #include "support/temp_root.h"
@@ -20,7 +22,7 @@ struct NameEditor {
     platform::ScriptedDialogs dialogs;
     platform::NullProgress progress;
     platform::IniFile ini{root.path() / "Kori.ini"};
-    app::NameFormModel model{root.folder(), 2, dialogs, progress, ini};
+    app::NameFormModel model{root.folder(), root.folder(), 2, dialogs, progress, ini};
 
     void Write(const std::vector<store::NameRecord>& names) {
         ASSERT_TRUE(store::NameFile(store::NameFile::PathIn(root.folder())).WriteAll(names).ok());
@@ -34,6 +36,10 @@ struct NameEditor {
         return out;
     }
 };
+
+std::filesystem::path RootFile(NameEditor& e, const char* name) {
+    return platform::ResolveIn(e.root.folder(), name);
+}
 
 } // namespace
 
@@ -175,4 +181,65 @@ TEST(DataFormModel, ColumnsRefusedVolModAndSaveWithTempWrk) {
     dialogs.QueueAnswer(platform::Answer::No);
     EXPECT_TRUE(m.Close());
     EXPECT_EQ(dialogs.messages().back(), "Data File has changed\nSAVE ABC?");
+}
+
+TEST(NameFormModel, UpdatesFromTheMasterListUnderlyingStockAndDownloadedSectors) {
+    NameEditor e;
+    auto bhp = Name("BHP", "old name");
+    bhp.IndustryClass = "121";
+    auto option = Name("BHPKO6", "BHP DEC CALL");
+    option.IndustryClass = "000";
+    auto warrant = Name("BHPWOZ", "warrant");
+    auto orphan = Name("ZZZWXY", "no underlying");
+    e.Write({bhp, option, warrant, orphan, Name("KRM", "Karoo")});
+    ASSERT_TRUE(e.model.ShowNames());
+
+    // Without a master list nothing changes and the user is told where to get one.
+    EXPECT_EQ(e.model.UpdateNames(), -1);
+    EXPECT_EQ(e.dialogs.messages().back(),
+              "KORI Master list is missing\nDownload from the KORI web page");
+    // 62-byte records: code, blanks, name; a comma in a name cannot reach the cell.
+    const auto record = [](std::string text) {
+        text.resize(store::kMasterRecord, ' ');
+        return text;
+    };
+    ASSERT_TRUE(
+        platform::WriteFileAtomic(RootFile(e, "KoriName.Mas"), record("BHP   BHP GROUP, LIMITED") +
+                                                                   record("XYZ   NOT IN THE FILE") +
+                                                                   record("KRM   Karoo"))
+            .ok());
+    EXPECT_EQ(e.model.UpdateNames(), 1); // KRM already carries its master name
+    EXPECT_EQ(e.model.grid().cell(0, store::kNameName), "BHP GROUP LIMITED");
+    EXPECT_EQ(e.dialogs.messages().back(), "1 names updated from the master list");
+
+    // The option and the warrant take BHP's class; a code without its stock keeps its own.
+    EXPECT_EQ(e.model.UpdateIC_from_Stock(), 2);
+    EXPECT_EQ(e.model.grid().cell(1, store::kNameIndustry), "121");
+    EXPECT_EQ(e.model.grid().cell(2, store::kNameIndustry), "121");
+    EXPECT_EQ(e.model.grid().cell(3, store::kNameIndustry), "");
+    EXPECT_EQ(e.model.UpdateIC_from_Stock(), 0);
+
+    // Sectors come from the downloaded details' GICS column, formatted to four digits.
+    EXPECT_EQ(e.model.UpdateGICS(), -1);
+    EXPECT_EQ(e.dialogs.messages().back(),
+              "The downloaded security details hold no GICS sector column");
+    ASSERT_TRUE(platform::WriteFileAtomic(RootFile(e, "STKHeader.txt"),
+                                          "CODE,SHORTDESCRIPTION,GICSSECTORCODE\r\n"
+                                          "CODE,Description,GICSSECTORCODE\r\n")
+                    .ok());
+    const auto details = [](std::string code, std::string rest) {
+        code.resize(6, ' ');
+        rest.resize(306, ' ');
+        return code + rest;
+    };
+    ASSERT_TRUE(platform::WriteFileAtomic(RootFile(e, "SecurityDetails.Stx"),
+                                          details("BHP", "BHP GROUP,1510") +
+                                              details("KRM", "KAROO,abc") +
+                                              details("ZZZWXY", "WARRANT,0"))
+                    .ok());
+    EXPECT_EQ(e.model.UpdateGICS(), 1);
+    EXPECT_EQ(e.model.grid().cell(0, store::kNameGics), "1510");
+    EXPECT_EQ(platform::Trim(e.model.grid().cell(4, store::kNameGics)), ""); // not digits
+    EXPECT_EQ(e.dialogs.messages().back(), "1 GICS sectors updated");
+    EXPECT_TRUE(e.model.grid().changed());
 }

@@ -2,6 +2,9 @@
 // out beside each row, and the columns the user hid.
 #include "app/fundamentals_form.h"
 #include "maint/security_details.h"
+#include "platform/files.h"
+#include "platform/text.h"
+#include "store/chart_list.h"
 #include "store/name_file.h"
 #include "store/price_file.h"
 #include "support/temp_root.h"
@@ -93,6 +96,58 @@ TEST_F(FundamentalsTest, RowsConvertedAndFiguresWorkedOutFromTheLastClose) {
     const auto& p = f.rows()[3];
     EXPECT_EQ(std::vector<std::string>(p.begin() + 18, p.begin() + 21),
               (std::vector<std::string>{"", "", ""}));
+}
+
+TEST_F(FundamentalsTest, ClassesScanListAndTransferToTheNameFile) {
+    Details();
+    auto bbb = store::NameRecord{};
+    bbb.Code = "BBB";
+    bbb.Name = "Beta";
+    bbb.IndustryClass = "7";
+    auto aaa = bbb;
+    aaa.Code = "AAA";
+    aaa.Name = "Alpha";
+    aaa.IndustryClass = "";
+    aaa.OtherDetails = "keep me";
+    const std::string data = session.folders.DataFolder;
+    ASSERT_TRUE(store::NameFile(store::NameFile::PathIn(data)).WriteAll({bbb, aaa}).ok());
+    FundamentalsForm f(session);
+    ASSERT_TRUE(f.Load());
+
+    f.ShowIndustryClasses();
+    f.ShowIndustryClasses(); // the column comes once
+    ASSERT_EQ(f.headers().size(), 23u);
+    EXPECT_EQ(f.headers()[22], "Ind Class");
+    EXPECT_EQ(f.priceColumn(), 18);
+    EXPECT_EQ(f.rows()[1][22], "007");
+    EXPECT_EQ(f.rows()[0][22], "") << "a blank class stays blank";
+    EXPECT_EQ(f.rows()[2][22], "") << "not in the name file";
+
+    // Rows 0 and 1 are in the name file, row 2 (CCC) is not; the list grows at its end.
+    ASSERT_TRUE(store::WriteList(store::ListPath(data, 'Z'), {{5, "OLD"}}).ok());
+    EXPECT_EQ(f.AddToScanList({0, 1, 2, 99}), 2);
+    std::vector<store::ChartListEntry> list;
+    ASSERT_TRUE(store::ReadList(store::ListPath(data, 'Z'), list).ok());
+    ASSERT_EQ(list.size(), 3u);
+    EXPECT_EQ(list[1].NameRecord, 2);
+    EXPECT_EQ(platform::Trim(list[1].Code), "AAA");
+    EXPECT_EQ(list[2].NameRecord, 1);
+
+    // A heading click without the menu item first does nothing.
+    EXPECT_EQ(f.HeadingClicked(17), -1);
+    f.BeginTransfer();
+    EXPECT_EQ(dialogs.shown().back().title, "Transfer to Name File");
+    EXPECT_EQ(dialogs.shown().back().text,
+              "Click the description of the data that you want transferred to the Other "
+              "Details section of the Name file");
+    EXPECT_EQ(f.HeadingClicked(17), 2); // "Interim" for AAA, "Final" for BBB
+    EXPECT_FALSE(f.transferPending());
+    std::vector<store::NameRecord> names;
+    ASSERT_TRUE(store::NameFile(store::NameFile::PathIn(data)).ReadAll(names).ok());
+    EXPECT_EQ(platform::Trim(names[0].OtherDetails), "Final");
+    EXPECT_EQ(platform::Trim(names[1].OtherDetails), "Interim");
+    EXPECT_EQ(platform::Trim(names[1].Name), "Alpha") << "the rest of the record kept";
+    EXPECT_TRUE(platform::FileExists(platform::ResolveIn(data, "names.bak")));
 }
 
 TEST_F(FundamentalsTest, HiddenColumnsStayHiddenUntilAllAreShown) {

@@ -3,6 +3,8 @@
 # each item; the same list run again to the end gives exactly the files of a run never stopped.
 set -euo pipefail
 kori="$1"
+# shellcheck source=kill_checks.sh
+source "$(dirname "$0")/kill_checks.sh"
 root=$(mktemp -d)
 trap 'rm -rf "$root"' EXIT
 # Two copies of the same sample: one run undisturbed, one killed again and again.
@@ -16,30 +18,7 @@ cp "$root/list" "$root/ref/data/Adjust.Lst"
 cp "$root/list" "$root/k/data/Adjust.Lst"
 "$kori" adjlist --apply --root "$root/ref" >/dev/null
 
-check_whole() {
-  perl -e '
-    my ($dir) = @ARGV; my $bad = 0;
-    my $n = -s "$dir/Names.dat";
-    if ($n % 96) { print "Names.dat is $n bytes\n"; $bad = 1 }
-    for my $f (glob "$dir/*.WDT") {
-      my $size = -s $f;
-      if ($size % 50) { print "$f is $size bytes\n"; $bad = 1; next }
-      next unless $size;
-      open my $h, "<:raw", $f or die; seek $h, $size - 50, 0; read $h, my $rec, 50;
-      if ($rec !~ /^[0-9]{8}/) { print "$f: last record broken\n"; $bad = 1 }
-    }
-    exit $bad;' "$1"
-}
-
-killed=0
-for delay in 0.3 0.8 1.5; do
-  "$kori" adjlist --apply --root "$root/k" >/dev/null 2>&1 &
-  pid=$!
-  sleep "$delay"
-  if kill -9 "$pid" 2>/dev/null; then killed=$((killed + 1)); fi
-  wait "$pid" 2>/dev/null || true
-  check_whole "$root/k/data"
-done
+kill_after_each "$root/k/data" "0.3 0.8 1.5" "$kori" adjlist --apply --root "$root/k"
 ((killed > 0)) || { echo "the run ended before any kill; nothing was proved"; exit 1; }
 "$kori" adjlist --apply --root "$root/k" >/dev/null
 check_whole "$root/k/data"

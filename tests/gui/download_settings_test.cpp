@@ -9,14 +9,19 @@
 #include "gui/windows/download_settings.h"
 #include "gui/windows/fundmnt.h"
 #include "maint/security_details.h"
+#include "platform/text.h"
+#include "store/chart_list.h"
+#include "store/name_file.h"
 
 #include <QButtonGroup>
 #include <QCheckBox>
 #include <QComboBox>
 #include <QDialogButtonBox>
+#include <QHeaderView>
 #include <QLabel>
 #include <QLineEdit>
 #include <QListWidget>
+#include <QPrinter>
 #include <QPushButton>
 #include <QSpinBox>
 #include <QTableWidget>
@@ -178,6 +183,36 @@ TEST_F(DesktopTest, CompanyDetailsOpenFromTheMenuWhenTheDetailsExist) {
     size->size()->setValue(12);
     size->findChild<QDialogButtonBox*>()->button(QDialogButtonBox::Ok)->click();
     EXPECT_EQ(w->table()->font().pointSize(), 12);
+
+    // The class column, the scan list from the highlighted row, and a heading click that
+    // sends a column to the name file's other details.
+    w->findChild<QAction*>(QStringLiteral("mnInGrp"))->trigger();
+    const int classes = w->table()->columnCount() - 1;
+    EXPECT_EQ(w->table()->horizontalHeaderItem(classes)->text().toStdString(), "Ind Class");
+    t = w->table();
+    t->selectRow(krm);
+    w->findChild<QAction*>(QStringLiteral("mnScanList"))->trigger();
+    std::vector<std::string> listed;
+    ASSERT_TRUE(store::ShowList(s.session.folders.DataFolder, 'Z', listed).ok());
+    ASSERT_FALSE(listed.empty());
+    EXPECT_EQ(listed.back(), "KRM");
+    w->findChild<QAction*>(QStringLiteral("mnUpName"))->trigger();
+    EXPECT_EQ(s.dialogs.shown().back().title, "Transfer to Name File");
+    auto* header = t->horizontalHeader();
+    QTest::mouseClick(header->viewport(), Qt::LeftButton, {},
+                      QPoint(header->sectionViewportPosition(2) + 5, header->height() / 2));
+    EXPECT_NE(s.dialogs.shown().back().text.find(" name records updated"), std::string::npos);
+    platform::Status status;
+    const auto found = store::FindCode(s.session.folders.DataFolder, "KRM", status);
+    ASSERT_TRUE(found.has_value());
+    EXPECT_EQ(platform::Trim(found->Record.OtherDetails), "ORD") << "the Type column";
+
+    QPrinter printer;
+    printer.setOutputFormat(QPrinter::PdfFormat);
+    const std::string pdf = s.root.folder() + "details.pdf";
+    printer.setOutputFileName(QString::fromStdString(pdf));
+    w->PrintTo(printer);
+    EXPECT_GT(std::filesystem::file_size(pdf), 1000u);
 }
 
 } // namespace

@@ -119,7 +119,7 @@ TEST_F(Lists, EditorAddsOrdersDeletesAndAsksBeforeLeavingAChangedList) {
     // First time: list A, under the display name the settings give it.
     EXPECT_EQ(panel.chooser()->currentText(), "Banks and Finance");
     EXPECT_EQ(Shown(panel.list()), (std::vector<std::string>{"HBK", "IRB", "JNS", "KST", "LMT"}));
-    EXPECT_EQ(w.stocks()->count(), 50);
+    EXPECT_EQ(w.stocks()->count(), 54);
 
     w.codeField()->setText("qqq");
     Click(w, "cmdAdd");

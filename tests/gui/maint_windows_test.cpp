@@ -103,6 +103,8 @@ TEST_F(Maint, RepairWindowsFromTheirMenus) {
     dup->close();
 
     // No '.Old' files: the message alone.
+    for (const char* old : {"ALX.Old", "KRM.Old", "HBK.Old"}) // the sample's own
+        std::filesystem::remove(data() + old);
     s.dialogs.clear();
     EXPECT_TRUE(main.Trigger("mnuRemOld"));
     ASSERT_EQ(s.dialogs.shown().size(), 1u);

@@ -111,23 +111,30 @@ bool GridView::CheckAll() {
     return true;
 }
 
-void GridView::PrintTo(QPrinter& printer, const QString& caption) const {
+void PrintTable(QPrinter& printer, const QString& caption, const std::vector<std::string>& headers,
+                const std::vector<std::vector<std::string>>& rows,
+                const std::function<bool(int)>& shown) {
+    const auto show = [&](std::size_t c) { return !shown || shown(static_cast<int>(c)); };
     QString html = QStringLiteral("<h3>%1</h3><table border=\"1\" cellspacing=\"0\" "
                                   "cellpadding=\"3\"><tr>")
                        .arg(caption.toHtmlEscaped());
-    for (const auto& h : m_model.headers())
-        html += QStringLiteral("<th>%1</th>").arg(Q(h).toHtmlEscaped());
+    for (std::size_t c = 0; c < headers.size(); ++c)
+        if (show(c)) html += QStringLiteral("<th>%1</th>").arg(Q(headers[c]).toHtmlEscaped());
     html += QStringLiteral("</tr>");
-    for (const auto& row : m_model.rows()) {
+    for (const auto& row : rows) {
         html += QStringLiteral("<tr>");
-        for (const auto& text : row)
-            html += QStringLiteral("<td>%1</td>").arg(Q(text).toHtmlEscaped());
+        for (std::size_t c = 0; c < row.size() && c < headers.size(); ++c)
+            if (show(c)) html += QStringLiteral("<td>%1</td>").arg(Q(row[c]).toHtmlEscaped());
         html += QStringLiteral("</tr>");
     }
     html += QStringLiteral("</table>");
     QTextDocument doc;
     doc.setHtml(html);
     doc.print(&printer);
+}
+
+void GridView::PrintTo(QPrinter& printer, const QString& caption) const {
+    PrintTable(printer, caption, m_model.headers(), m_model.rows());
 }
 
 } // namespace kori::gui

@@ -7,11 +7,19 @@
 
 #include <QTableWidget>
 
+#include <functional>
 #include <string>
+#include <vector>
 
 class QPrinter;
 
 namespace kori::gui {
+
+// Rows of texts printed as one table under a caption; `shown(column)` leaves out the columns
+// the user hid (all shown without it).
+void PrintTable(QPrinter& printer, const QString& caption, const std::vector<std::string>& headers,
+                const std::vector<std::vector<std::string>>& rows,
+                const std::function<bool(int)>& shown = {});
 
 class GridView : public QTableWidget {
     Q_OBJECT

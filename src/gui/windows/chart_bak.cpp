@@ -1,6 +1,7 @@
 #include "gui/windows/chart_bak.h"
 
 #include "gui/services/qt_progress.h"
+#include "gui/widgets/named_controls.h"
 
 #include <QDialogButtonBox>
 #include <QFormLayout>
@@ -26,10 +27,7 @@ ChartBak::ChartBak(app::Session& session, QtProgress& progress, bool restore, QW
     auto* layout = new QVBoxLayout(this);
     auto* buttons = new QDialogButtonBox(this);
     auto add = [&](const char* caption, const char* name, auto slot) {
-        auto* b = buttons->addButton(QString::fromLatin1(caption), QDialogButtonBox::ActionRole);
-        b->setObjectName(QString::fromLatin1(name));
-        connect(b, &QPushButton::clicked, this, slot);
-        return b;
+        return NamedButton(buttons, this, caption, name, slot);
     };
     if (!restore) {
         auto* intro = new QLabel(

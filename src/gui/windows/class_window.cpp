@@ -1,6 +1,7 @@
 #include "gui/windows/class_window.h"
 
 #include "gui/widgets/grid_view.h"
+#include "gui/widgets/named_controls.h"
 #include "gui/widgets/settings_dialog.h"
 #include "gui/widgets/window_place.h"
 #include "gui/windows/gics_class.h"
@@ -51,10 +52,7 @@ ClassWindow::ClassWindow(app::Session& session, const Kind& kind, bool pick, QWi
 
     m_menus = new QMenuBar(this);
     const auto item = [this](const char* caption, const char* name, auto slot) {
-        QAction* a = m_menus->addAction(QString::fromLatin1(caption));
-        a->setObjectName(QString::fromLatin1(name));
-        connect(a, &QAction::triggered, this, slot);
-        return a;
+        return NamedAction(m_menus, this, caption, name, slot);
     };
     item("&Add Row", "mnuAddRow", [this] { AddRow(); })->setEnabled(!pick);
     item("&Delete Row", "mnuDeleteRow", [this] { DeleteRow(); })->setEnabled(!pick);

@@ -1,6 +1,7 @@
 #include "gui/windows/data_form.h"
 
 #include "gui/widgets/grid_view.h"
+#include "gui/widgets/named_controls.h"
 #include "gui/widgets/window_place.h"
 #include "gui/windows/repair_progress.h"
 #include "platform/text.h"
@@ -64,10 +65,7 @@ DataForm::DataForm(app::Session& session, std::filesystem::path file, std::strin
 
     m_menus = new QMenuBar(this);
     const auto item = [this](const char* caption, const char* name, auto slot) {
-        QAction* a = m_menus->addAction(QString::fromLatin1(caption));
-        a->setObjectName(QString::fromLatin1(name));
-        connect(a, &QAction::triggered, this, slot);
-        return a;
+        return NamedAction(m_menus, this, caption, name, slot);
     };
     item("&Save", "mnuSave", [this] {
         if (!m_model->SaveData() && m_model->refusal())

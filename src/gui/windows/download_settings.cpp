@@ -1,6 +1,7 @@
 #include "gui/windows/download_settings.h"
 
 #include "gui/widgets/grid_view.h"
+#include "gui/widgets/named_controls.h"
 #include "gui/widgets/window_place.h"
 
 #include <QButtonGroup>
@@ -189,9 +190,7 @@ INUpList::INUpList(app::Session& session, QWidget* parent) : QDialog(parent), m_
 
     m_menus = new QMenuBar(this);
     const auto item = [this](QMenu* menu, const char* caption, const char* name, auto slot) {
-        QAction* a = menu->addAction(QString::fromLatin1(caption));
-        a->setObjectName(QString::fromLatin1(name));
-        connect(a, &QAction::triggered, this, slot);
+        return NamedAction(menu, this, caption, name, slot);
     };
     QMenu* file = m_menus->addMenu(QStringLiteral("&File"));
     item(file, "&Save", "ulSave", [this] { Save(); });

@@ -1,5 +1,7 @@
 #include "gui/windows/fundmnt.h"
 
+#include "gui/widgets/grid_view.h"
+#include "gui/widgets/named_controls.h"
 #include "gui/widgets/window_place.h"
 #include "platform/text.h"
 
@@ -9,9 +11,13 @@
 #include <QLabel>
 #include <QMenu>
 #include <QMenuBar>
+#include <QPrintDialog>
+#include <QPrinter>
 #include <QSpinBox>
 #include <QTableWidget>
 #include <QVBoxLayout>
+
+#include <algorithm>
 
 namespace kori::gui {
 
@@ -32,12 +38,27 @@ Fundmnt::Fundmnt(app::Session& session, QWidget* parent)
     KeepWindowPosition(this, session.services().settings, kDetailsSection);
     m_menus = new QMenuBar(this);
     const auto item = [this](QMenu* menu, const char* caption, const char* name, auto slot) {
-        QAction* a = menu->addAction(QString::fromLatin1(caption));
-        a->setObjectName(QString::fromLatin1(name));
-        connect(a, &QAction::triggered, this, slot);
+        return NamedAction(menu, this, caption, name, slot);
     };
+    QMenu* file = m_menus->addMenu(QStringLiteral("&File"));
+    item(file, "&Print", "mnPrint", [this] {
+        QPrinter printer(QPrinter::HighResolution);
+        printer.setPageOrientation(QPageLayout::Landscape);
+        QPrintDialog dialog(&printer, this);
+        if (dialog.exec() == QDialog::Accepted) PrintTo(printer);
+    });
+    item(file, "&Close", "mnClose", [this] { reject(); });
     QMenu* show = m_menus->addMenu(QStringLiteral("&Options"));
     item(show, "Show Current Price,PE Ratio,Yield and GICS", "mnYCP", [this] { ShowFigures(); });
+    item(show, "Show Industry Groups/Classifications", "mnInGrp", [this] {
+        QApplication::setOverrideCursor(Qt::WaitCursor);
+        m_form.ShowIndustryClasses();
+        QApplication::restoreOverrideCursor();
+        Fill();
+    });
+    item(show, "Add Highlighted Stocks to Scan Results List", "mnScanList",
+         [this] { m_form.AddToScanList(SelectedRows()); });
+    item(show, "Update Name File (Other Details)", "mnUpName", [this] { m_form.BeginTransfer(); });
     item(show, "Change Display Size", "mnSize", [this] {
         auto* w = new F1Size(*this, m_table->font().pointSize());
         w->setAttribute(Qt::WA_DeleteOnClose);
@@ -49,6 +70,17 @@ Fundmnt::Fundmnt(app::Session& session, QWidget* parent)
     m_table = new QTableWidget(this);
     m_table->setObjectName(QStringLiteral("grdDetails"));
     m_table->setEditTriggers(QAbstractItemView::NoEditTriggers);
+    m_table->setSelectionBehavior(QAbstractItemView::SelectRows);
+    m_table->setSelectionMode(QAbstractItemView::ExtendedSelection);
+    connect(m_table->horizontalHeader(), &QHeaderView::sectionClicked, this, [this](int column) {
+        if (!m_form.transferPending()) return;
+        QApplication::setOverrideCursor(Qt::WaitCursor);
+        const int changed = m_form.HeadingClicked(column);
+        QApplication::restoreOverrideCursor();
+        if (changed >= 0)
+            m_session.dialogs().MsgBox(std::to_string(changed) + " name records updated",
+                                       app::FundamentalsForm::kTransferTitle);
+    });
     auto* layout = new QVBoxLayout(this);
     layout->setMenuBar(m_menus);
     layout->addWidget(m_table);
@@ -80,6 +112,19 @@ void Fundmnt::Fill() {
     }
     for (int c = 0; c < m_table->columnCount(); ++c)
         m_table->setColumnHidden(c, m_form.hidden(c));
+}
+
+std::vector<int> Fundmnt::SelectedRows() const {
+    std::vector<int> rows;
+    for (const QModelIndex& i : m_table->selectionModel()->selectedRows())
+        rows.push_back(i.row());
+    std::sort(rows.begin(), rows.end());
+    return rows;
+}
+
+void Fundmnt::PrintTo(QPrinter& printer) const {
+    PrintTable(printer, windowTitle(), m_form.headers(), m_form.rows(),
+               [this](int c) { return !m_form.hidden(c); });
 }
 
 void Fundmnt::ShowFigures() {

@@ -6,7 +6,10 @@
 
 #include <QDialog>
 
+#include <vector>
+
 class QMenuBar;
+class QPrinter;
 class QSpinBox;
 class QTableWidget;
 
@@ -26,6 +29,8 @@ public:
     void HideCurrentColumn();
     void ShowAllColumns();
     void SetDisplaySize(int points);
+    void PrintTo(QPrinter& printer) const;
+    std::vector<int> SelectedRows() const;
 
 private:
     void Fill();

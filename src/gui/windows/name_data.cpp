@@ -2,6 +2,7 @@
 
 #include "gui/services/qt_progress.h"
 #include "gui/widgets/grid_view.h"
+#include "gui/widgets/named_controls.h"
 
 #include <QDialogButtonBox>
 #include <QHeaderView>
@@ -31,10 +32,7 @@ NameData::NameData(app::Session& session, QtProgress& progress, QWidget* parent)
 
     auto* buttons = new QDialogButtonBox(this);
     auto add = [&](const char* caption, const char* name, auto slot) {
-        auto* b = buttons->addButton(QString::fromLatin1(caption), QDialogButtonBox::ActionRole);
-        b->setObjectName(QString::fromLatin1(name));
-        connect(b, &QPushButton::clicked, this, slot);
-        return b;
+        return NamedButton(buttons, this, caption, name, slot);
     };
     m_add = add("&Add Missing Name Records", "cmdAdd", [this] { AddMissing(); });
     m_remove = add("&Remove Entries Without Data", "cmdRemove", [this] { RemoveWithoutData(); });

@@ -1,6 +1,7 @@
 #include "gui/windows/name_form.h"
 
 #include "gui/widgets/grid_view.h"
+#include "gui/widgets/named_controls.h"
 #include "gui/widgets/settings_dialog.h"
 #include "gui/widgets/window_place.h"
 #include "gui/windows/repair_progress.h"
@@ -19,9 +20,9 @@ NameForm::NameForm(app::Session& session, QWidget* parent) : QDialog(parent), m_
     setWindowTitle(QStringLiteral("Name File"));
     KeepWindowPosition(this, session.services().settings, "NameForm");
     m_progress = new RepairProgress(this);
-    m_model = std::make_unique<app::NameFormModel>(session.folders.DataFolder,
-                                                   session.download.DataService, session.dialogs(),
-                                                   *m_progress, session.ini());
+    m_model = std::make_unique<app::NameFormModel>(
+        session.folders.DataFolder, session.folders.SystemFolder, session.download.DataService,
+        session.dialogs(), *m_progress, session.ini());
     m_caption = new QLabel(QString::fromLatin1(m_model->Caption().c_str()), this);
     m_caption->setObjectName(QStringLiteral("lblCaption"));
     m_grid = new GridView(m_model->grid(), session.dialogs(), "Name File", this);
@@ -31,11 +32,8 @@ NameForm::NameForm(app::Session& session, QWidget* parent) : QDialog(parent), m_
 
     m_menus = new QMenuBar(this);
     const auto item = [this](QMenu* menu, const char* caption, const char* name, auto slot) {
-        QAction* a = menu ? menu->addAction(QString::fromLatin1(caption))
-                          : m_menus->addAction(QString::fromLatin1(caption));
-        a->setObjectName(QString::fromLatin1(name));
-        connect(a, &QAction::triggered, this, slot);
-        return a;
+        return menu ? NamedAction(menu, this, caption, name, slot)
+                    : NamedAction(m_menus, this, caption, name, slot);
     };
     QMenu* file = m_menus->addMenu(QStringLiteral("&File"));
     item(file, "&Save ", "mnuSave", [this] { Save(); });
@@ -64,8 +62,17 @@ NameForm::NameForm(app::Session& session, QWidget* parent) : QDialog(parent), m_
     item(sort, "Sort By GICS Classification", "mnuSortGics",
          [this] { Sort(store::NameSortOrder::Gics); });
     QMenu* tools = m_menus->addMenu(QStringLiteral("&Tools"));
+    item(tools, "&Update Names from KORI Master list", "mnuUpdateNames", [this] {
+        if (m_model->UpdateNames() > 0) AfterChange();
+    });
     item(tools, "Check for Du&plicate Entries", "mnuDupNames", [this] {
         if (m_model->Dupnames() >= 0) AfterChange();
+    });
+    item(tools, "Update Indust.Classifications from underlying stock", "mnuUpdateIC", [this] {
+        if (m_model->UpdateIC_from_Stock() > 0) AfterChange();
+    });
+    item(tools, "Update GICS Sectors from download", "mnuUpdateGics", [this] {
+        if (m_model->UpdateGICS() > 0) AfterChange();
     });
     item(tools, "&Change Case to Title Case", "mnuTitleCase", [this] {
         m_model->TitleCase();
@@ -100,7 +107,14 @@ NameForm::NameForm(app::Session& session, QWidget* parent) : QDialog(parent), m_
     layout->addWidget(m_caption);
     layout->addWidget(m_grid, 1);
     layout->addWidget(m_progress);
+    m_progress->hide();
     resize(980, 560);
+    // Numbers are short; the name is what the user reads the rows by.
+    for (int c = 0; c < store::kNameShownColumns; ++c)
+        m_grid->setColumnWidth(c, 64);
+    m_grid->setColumnWidth(store::kNameRec, 48);
+    m_grid->setColumnWidth(store::kNameName, 250);
+    m_grid->setColumnWidth(store::kNameOther, 120);
     Display();
 }
 
@@ -124,7 +138,11 @@ bool NameForm::Save() {
 }
 
 void NameForm::Sort(store::NameSortOrder order) {
-    if (m_model->Sort(order)) AfterChange();
+    // The bar is there while the sort runs through its scratch files, not while the user edits.
+    m_progress->show();
+    const bool sorted = m_model->Sort(order);
+    m_progress->hide();
+    if (sorted) AfterChange();
 }
 
 std::pair<int, int> NameForm::SelectedRows() const {

@@ -423,21 +423,18 @@ void ListingScanWindow::ShowChart() {
     m_showChart(m_codes[static_cast<std::size_t>(row)]);
 }
 
-namespace {
-
-bool PrintListing(QPrinter& printer, platform::Dialogs& dialogs, QLabel* status,
-                  const std::function<std::vector<app::PrintedPage>(int)>& pages, bool empty) {
+bool ListingScanWindow::PrintPages(QPrinter& printer,
+                                   const std::function<std::vector<app::PrintedPage>(int)>& pages,
+                                   bool empty) {
     if (empty) {
-        dialogs.MsgBox("No records to print", " Chart Scan");
+        m_session.dialogs().MsgBox("No records to print", " Chart Scan");
         return false;
     }
-    status->setText(QStringLiteral("PRINTING  -  WAIT"));
+    m_status->setText(QStringLiteral("PRINTING  -  WAIT"));
     const bool ok = PrintTextPages(printer, ListingFont(), pages);
-    status->clear();
+    m_status->clear();
     return ok;
 }
-
-} // namespace
 
 // ---- ChtScan2 ----
 
@@ -484,18 +481,11 @@ bool ChtScan2::Proceed() {
     o.VolumeDays = S(m_volumeDays);
     o.Price = m_price->isChecked();
     o.PricePercent = S(m_pricePercent);
-    if (Refused(m_form.Refusal())) return false;
-    const scan::ScanListing* r = nullptr;
-    RunWalk([&] { r = &m_form.Run(progress()); });
-    ShowListing(m_form.listing());
-    Finish(*r);
-    return true;
+    return RunListing(m_form);
 }
 
 bool ChtScan2::PrintTo(QPrinter& printer) {
-    return PrintListing(
-        printer, m_session.dialogs(), m_status, [this](int n) { return m_form.Pages(n); },
-        m_form.listing().Lines.empty());
+    return PrintListing(printer, m_form);
 }
 
 // ---- ChtScan3 ----
@@ -535,18 +525,11 @@ bool ChtScan3::Proceed() {
     o.Down = m_down->isChecked();
     o.CategoryOn = m_categoryOn->isChecked();
     o.Category = S(m_category);
-    if (Refused(m_form.Refusal())) return false;
-    const scan::ScanListing* r = nullptr;
-    RunWalk([&] { r = &m_form.Run(progress()); });
-    ShowListing(m_form.listing());
-    Finish(*r);
-    return true;
+    return RunListing(m_form);
 }
 
 bool ChtScan3::PrintTo(QPrinter& printer) {
-    return PrintListing(
-        printer, m_session.dialogs(), m_status, [this](int n) { return m_form.Pages(n); },
-        m_form.listing().Lines.empty());
+    return PrintListing(printer, m_form);
 }
 
 // ---- ChtScan6 ----
@@ -585,18 +568,11 @@ bool ChtScan6::Proceed() {
     auto& o = m_form.Options;
     TakeFrame(m_frame, o.Frame);
     o.CodeLength = m_codeLength->currentText().toStdString();
-    if (Refused(m_form.Refusal())) return false;
-    const scan::ScanListing* r = nullptr;
-    RunWalk([&] { r = &m_form.Run(progress()); });
-    ShowListing(m_form.listing(), m_form.FirstShownLine());
-    Finish(*r);
-    return true;
+    return RunListing(m_form);
 }
 
 bool ChtScan6::PrintTo(QPrinter& printer) {
-    return PrintListing(
-        printer, m_session.dialogs(), m_status, [this](int n) { return m_form.Pages(n); },
-        m_form.listing().Lines.empty());
+    return PrintListing(printer, m_form);
 }
 
 } // namespace kori::gui

@@ -132,6 +132,26 @@ protected:
     void ShowListing(const app::ScanListingLines& listing, int firstShown = 0);
     // The closing message of a walk, or its failure.
     void Finish(const scan::ScanListing& r);
+    // What each listing scan does once its choices are in the form: refuse them, or walk and
+    // show the finds (the last lines, where the form keeps to them).
+    template <class Form> bool RunListing(Form& form) {
+        if (Refused(form.Refusal())) return false;
+        const scan::ScanListing* r = nullptr;
+        RunWalk([&] { r = &form.Run(progress()); });
+        if constexpr (requires { form.FirstShownLine(); })
+            ShowListing(form.listing(), form.FirstShownLine());
+        else
+            ShowListing(form.listing());
+        Finish(*r);
+        return true;
+    }
+    // The listing on paper, or the message that there is none.
+    bool PrintPages(QPrinter& printer,
+                    const std::function<std::vector<app::PrintedPage>(int)>& pages, bool empty);
+    template <class Form> bool PrintListing(QPrinter& printer, const Form& form) {
+        return PrintPages(
+            printer, [&form](int n) { return form.Pages(n); }, form.listing().Lines.empty());
+    }
 
 private:
     QLabel* m_heading = nullptr;

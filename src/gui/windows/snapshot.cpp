@@ -2,6 +2,7 @@
 
 #include "gui/services/qt_progress.h"
 #include "gui/widgets/grid_view.h"
+#include "gui/widgets/named_controls.h"
 #include "platform/files.h"
 
 #include <QComboBox>
@@ -48,9 +49,7 @@ Snapshot::Snapshot(app::Session& session, QtProgress& progress, ShowChartAt show
     layout->addWidget(m_grid, 1);
     auto* buttons = new QDialogButtonBox(this);
     auto add = [&](const char* caption, const char* name, auto slot) {
-        auto* b = buttons->addButton(QString::fromLatin1(caption), QDialogButtonBox::ActionRole);
-        b->setObjectName(QString::fromLatin1(name));
-        connect(b, &QPushButton::clicked, this, slot);
+        return NamedButton(buttons, this, caption, name, slot);
     };
     add("Show &Chart", "cmdChart", [this] { ShowChart(); });
     add("&Export CSV ...", "cmdExport", [this] { ChooseExportFile(); });

@@ -1,6 +1,7 @@
 #include "gui/windows/targets.h"
 
 #include "gui/widgets/grid_view.h"
+#include "gui/widgets/named_controls.h"
 #include "gui/widgets/window_place.h"
 
 #include <QLabel>
@@ -19,9 +20,7 @@ Targets::Targets(app::Session& session, QWidget* parent)
 
     m_menus = new QMenuBar(this);
     const auto item = [this](QMenu* menu, const char* caption, const char* name, auto slot) {
-        QAction* a = menu->addAction(QString::fromLatin1(caption));
-        a->setObjectName(QString::fromLatin1(name));
-        connect(a, &QAction::triggered, this, slot);
+        return NamedAction(menu, this, caption, name, slot);
     };
     QMenu* file = m_menus->addMenu(QStringLiteral("&File"));
     file->setObjectName(QStringLiteral("mnuFile"));

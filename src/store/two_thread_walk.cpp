@@ -1,10 +1,10 @@
-#include "scan/two_thread_walk.h"
+#include "store/two_thread_walk.h"
 
 #include <atomic>
 #include <thread>
 #include <vector>
 
-namespace kori::scan {
+namespace kori::store {
 
 namespace {
 
@@ -25,13 +25,13 @@ private:
 
 } // namespace
 
-store::WalkResult WalkOnTwoThreads(const store::SecurityList& list, platform::Progress& progress,
-                                   const std::function<void(int, const store::WalkItem&)>& work) {
-    std::vector<store::WalkItem> items;
+WalkResult WalkOnTwoThreads(const SecurityList& list, platform::Progress& progress,
+                            const std::function<void(int, const WalkItem&)>& work) {
+    std::vector<WalkItem> items;
     GatherProgress gather(progress);
-    store::WalkResult result = store::ForEachSecurity(list, gather, [&](const store::WalkItem& i) {
+    WalkResult result = ForEachSecurity(list, gather, [&](const WalkItem& i) {
         items.push_back(i);
-        return store::WalkStep::Continue;
+        return WalkStep::Continue;
     });
     if (!result.Status || result.Cancelled || items.empty()) return result;
 
@@ -63,4 +63,4 @@ store::WalkResult WalkOnTwoThreads(const store::SecurityList& list, platform::Pr
     return result;
 }
 
-} // namespace kori::scan
+} // namespace kori::store
