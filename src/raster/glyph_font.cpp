@@ -119,4 +119,14 @@ const Glyph& GlyphFont::Get(unsigned char ch, int phase) {
     return g;
 }
 
+int GlyphFont::Kerning(unsigned char left, unsigned char right) {
+    const FT_Face face = m_impl->face;
+    if (!FT_HAS_KERNING(face)) return 0;
+    FT_Vector kern{0, 0};
+    if (FT_Get_Kerning(face, FT_Get_Char_Index(face, left), FT_Get_Char_Index(face, right),
+                       FT_KERNING_UNFITTED, &kern) != 0)
+        return 0;
+    return static_cast<int>(kern.x);
+}
+
 } // namespace kori::raster

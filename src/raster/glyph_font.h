@@ -31,6 +31,8 @@ public:
     // One byte of stream text (Latin-1); `phase` is the quarter pixel the pen stands at.
     const Glyph& Get(unsigned char ch, int phase);
     int Advance(unsigned char ch) { return Get(ch, 0).advance; }
+    // Pair kerning between two bytes, 1/64 pixel.
+    int Kerning(unsigned char left, unsigned char right);
 
 private:
     struct Impl;

@@ -109,22 +109,12 @@ void RasterSurface::ThinLine(double x1, double y1, double x2, double y2, std::ui
     n += ((first * 64 + 32 - m1) * step) >> 6;
 
     const DashPattern pattern = PatternOf(m_style);
-    long offset = 0;
-    if (pattern.length > 0) {
-        const long within = (m1 & 63) - 32;
-        offset = reversed ? pattern.length - (m2 - m1) - within : -within;
-        offset %= pattern.length;
-        if (offset < 0) offset += pattern.length;
-    }
     for (long m = first; m < end; ++m, n += step) {
-        bool on = true;
         if (pattern.length > 0) {
-            // Running backwards the pattern is met from its end.
-            const long at = reversed ? pattern.length - 1 - offset : offset;
-            on = at < pattern.parts[0];
-            offset = (offset + 64) % pattern.length;
+            // The pattern starts on the pixel of the first point, whichever way the line runs.
+            const long from = reversed ? end - 1 - m : m - first;
+            if ((from * 64) % pattern.length >= pattern.parts[0]) continue;
         }
-        if (!on) continue;
         const long minor = static_cast<long>(n >> 16);
         if (alongY)
             Plot(static_cast<int>(minor), static_cast<int>(m), pixel);
@@ -244,8 +234,11 @@ void RasterSurface::PrintText(std::string_view text) {
     const std::uint32_t pixel = ToPixel(m_fore);
     long pen = Fixed(m_textX);
     const long baseline = RoundHalfUp(m_textY + font->ascent() / 64.0);
+    unsigned char before = 0;
     for (const char ch : text) {
         const auto byte = static_cast<unsigned char>(ch);
+        if (before != 0) pen += font->Kerning(before, byte);
+        before = byte;
         const int phase = static_cast<int>((pen & 63) >> 4);
         const Glyph& g = font->Get(byte, phase);
         const long left = (pen >> 6) + g.left;
@@ -263,8 +256,13 @@ double RasterSurface::TextWidth(std::string_view text) {
     GlyphFont* font = Font();
     if (font == nullptr) return 0;
     long width = 0;
-    for (const char ch : text)
-        width += font->Advance(static_cast<unsigned char>(ch));
+    unsigned char before = 0;
+    for (const char ch : text) {
+        const auto byte = static_cast<unsigned char>(ch);
+        if (before != 0) width += font->Kerning(before, byte);
+        width += font->Advance(byte);
+        before = byte;
+    }
     return width / 64.0;
 }
 
