@@ -5,16 +5,15 @@
 #include "chart/scale.h"
 #include "chart/swing.h"
 #include "cli/cli_context.h"
-#include "cli/gui_app.h"
 #include "cli/json_out.h"
 #include "cli/multi_chart.h"
 #include "cli/osc_chart.h"
-#include "gui/paint/pdf_printer.h"
-#include "gui/paint/qt_surface.h"
+#include "cli/pdf_output.h"
 #include "platform/date_text.h"
 #include "platform/files.h"
 #include "platform/svg_surface.h"
 #include "platform/text.h"
+#include "raster/raster_surface.h"
 #include "store/name_file.h"
 
 #include <CLI/CLI.hpp>
@@ -221,7 +220,6 @@ void Run(CliContext& ctx, const ChartOptions& o) {
 
     chart::Chart c;
     platform::Status built;
-    if (!o.png.empty() || !o.pdf.empty()) EnsureGuiApplication();
     if (!o.svg.empty()) {
         platform::SvgSurface area(w, h);
         built = build(c, area);
@@ -235,11 +233,10 @@ void Run(CliContext& ctx, const ChartOptions& o) {
         built = build(c, area);
     }
     if (built && !o.png.empty()) {
-        gui::ImageSurface area(w, h);
+        raster::RasterSurface area(w, h);
         built = build(c, area);
-        const QImage& picture = area.Finish();
-        if (built && !o.png.empty()) {
-            if (auto s = gui::SavePng(picture, o.png); !s) throw CliError{s.message()};
+        if (built) {
+            if (auto s = area.SavePng(o.png); !s) throw CliError{s.message()};
         }
     }
     if (!built) throw CliError{built.message()};
@@ -247,14 +244,12 @@ void Run(CliContext& ctx, const ChartOptions& o) {
         chart::PrintSettings settings = chart::LoadPrintSettings(session.ini());
         settings.PrintColour = session.printer.PrintColour;
         settings.PrintColourLines = session.printer.PrintColourLines;
-        gui::PdfPrinter printer;
-        const chart::PaperJob paper{printer, session.palette, session.fonts, static_cast<double>(w),
-                                    static_cast<double>(h)};
-        if (chart::PrintChart(app::ChartStreamPath(session), paper, settings) !=
-            chart::PlayOutcome::Played)
+        PdfPage page{session.palette, session.fonts, static_cast<double>(w), static_cast<double>(h),
+                     settings};
+        std::string document;
+        if (PlayPdf(app::ChartStreamPath(session), page, document) != chart::PlayOutcome::Played)
             throw CliError{"Cannot print the chart to " + o.pdf};
-        if (auto s = platform::WriteFileAtomic(o.pdf, printer.Document()); !s)
-            throw CliError{s.message()};
+        if (auto s = platform::WriteFileAtomic(o.pdf, document); !s) throw CliError{s.message()};
     }
     if (!o.stream.empty()) CopyStream(session, o.stream);
     if (o.json) PrintNumbers(ctx.out, c);

@@ -4,12 +4,11 @@
 #include "chart/print_chart.h"
 #include "chart/screen_player.h"
 #include "cli/cli_context.h"
-#include "cli/gui_app.h"
-#include "gui/paint/pdf_printer.h"
-#include "gui/paint/qt_surface.h"
+#include "cli/pdf_output.h"
 #include "platform/files.h"
 #include "platform/svg_surface.h"
 #include "platform/text.h"
+#include "raster/raster_surface.h"
 
 #include <CLI/CLI.hpp>
 
@@ -81,25 +80,22 @@ void PlayToScreenPicture(const PlayOptions& o, int w, int h) {
         if (auto s = area.Save(o.svg); !s) throw CliError{s.message()};
         return;
     }
-    EnsureGuiApplication();
-    gui::ImageSurface area(w, h);
+    raster::RasterSurface area(w, h);
     show(area);
-    if (auto s = gui::SavePng(area.Finish(), o.png); !s) throw CliError{s.message()};
+    if (auto s = area.SavePng(o.png); !s) throw CliError{s.message()};
 }
 
 void PlayToPaper(const CliContext& ctx, const PlayOptions& o, int w, int h) {
-    EnsureGuiApplication();
     const auto palette = BuiltInPalette();
     const platform::ChartFonts fonts;
-    chart::PrintSettings settings = PrintSettingsFor(ctx, o.landscape);
-    gui::PdfPrinter printer;
-    const chart::PaperJob job{printer, palette, fonts, static_cast<double>(w),
-                              static_cast<double>(h)};
-    const chart::PlayOutcome outcome = chart::PrintChart(o.source, job, settings);
+    PdfPage page{palette, fonts, static_cast<double>(w), static_cast<double>(h),
+                 PrintSettingsFor(ctx, o.landscape)};
+    std::string document;
+    const chart::PlayOutcome outcome = PlayPdf(o.source, page, document);
     if (outcome == chart::PlayOutcome::PrinterFailed) Fail("Cannot write " + o.pdf);
     if (outcome != chart::PlayOutcome::Played) Fail(chart::kFormatInvalidText);
     // Only a page played whole replaces the file.
-    if (auto s = platform::WriteFileAtomic(o.pdf, printer.Document()); !s) Fail(s.message());
+    if (auto s = platform::WriteFileAtomic(o.pdf, document); !s) Fail(s.message());
 }
 
 } // namespace

@@ -1,7 +1,8 @@
 #include "gui/paint/qt_surface.h"
 
-#include "gui/paint/large_buffer.h"
 #include "platform/files.h"
+#include "raster/large_buffer.h"
+#include "raster/png.h"
 
 #include <QBuffer>
 #include <QFontMetricsF>
@@ -11,7 +12,6 @@
 
 #include <cmath>
 #include <cstdint>
-#include <libdeflate.h>
 #include <memory>
 
 namespace kori::gui {
@@ -126,13 +126,13 @@ double QtSurface::TextHeight(std::string_view) {
 namespace {
 
 void DeleteLargeBuffer(void* buffer) {
-    delete static_cast<LargeBuffer*>(buffer);
+    delete static_cast<raster::LargeBuffer*>(buffer);
 }
 
 // The picture's pixels in large pages; the picture frees them when its last copy goes.
 QImage MakePicture(int width, int height) {
     const qsizetype bytesPerLine = static_cast<qsizetype>(width) * 4;
-    auto* buffer = new LargeBuffer(static_cast<std::size_t>(bytesPerLine) * height);
+    auto* buffer = new raster::LargeBuffer(static_cast<std::size_t>(bytesPerLine) * height);
     if (!*buffer) {
         delete buffer;
         return QImage(width, height, QImage::Format_RGB32);
@@ -166,100 +166,19 @@ const QImage& ImageSurface::Finish() {
     return m_canvas->image;
 }
 
-namespace {
-
-void PutBigEndian(unsigned char* out, std::uint32_t value) {
-    out[0] = static_cast<unsigned char>(value >> 24);
-    out[1] = static_cast<unsigned char>(value >> 16);
-    out[2] = static_cast<unsigned char>(value >> 8);
-    out[3] = static_cast<unsigned char>(value);
-}
-
-// One chunk: length, type, data, then the CRC of type and data.
-void AppendChunk(QByteArray& bytes, const char (&type)[5], const unsigned char* data,
-                 std::size_t length) {
-    unsigned char word[4];
-    PutBigEndian(word, static_cast<std::uint32_t>(length));
-    bytes.append(reinterpret_cast<const char*>(word), 4);
-    bytes.append(type, 4);
-    if (length > 0)
-        bytes.append(reinterpret_cast<const char*>(data), static_cast<qsizetype>(length));
-    std::uint32_t crc = libdeflate_crc32(0, type, 4);
-    if (length > 0) crc = libdeflate_crc32(crc, data, length);
-    PutBigEndian(word, crc);
-    bytes.append(reinterpret_cast<const char*>(word), 4);
-}
-
-// Opaque pictures, the charts, written here rather than through a general writer: each row
-// less the row above (flat areas and grids become runs of zeros), all rows compressed in one
-// call with run-length matching at the fastest level. A general writer feeding the compressor
-// row by row, or trying every filter, costs two to three times as much for the same pixels.
-bool EncodeOpaquePng(const QImage& image, QByteArray& bytes) {
-    const int width = image.width();
-    const int height = image.height();
-    if (width <= 0 || height <= 0) return false;
-    const std::size_t stride = static_cast<std::size_t>(width) * 3 + 1;
-    const std::size_t rowBytes = stride * static_cast<std::size_t>(height);
-    thread_local LargeBuffer rows;
-    thread_local LargeBuffer packed;
-    if (!rows.Reserve(rowBytes)) return false;
-    unsigned char* out = rows.data();
-    const QRgb* above = nullptr;
-    for (int y = 0; y < height; ++y) {
-        const auto* pixels = reinterpret_cast<const QRgb*>(image.constScanLine(y));
-        *out++ = 2; // filter "up"
-        if (above == nullptr) {
-            for (int x = 0; x < width; ++x) {
-                *out++ = static_cast<unsigned char>(qRed(pixels[x]));
-                *out++ = static_cast<unsigned char>(qGreen(pixels[x]));
-                *out++ = static_cast<unsigned char>(qBlue(pixels[x]));
-            }
-        } else {
-            for (int x = 0; x < width; ++x) {
-                *out++ = static_cast<unsigned char>(qRed(pixels[x]) - qRed(above[x]));
-                *out++ = static_cast<unsigned char>(qGreen(pixels[x]) - qGreen(above[x]));
-                *out++ = static_cast<unsigned char>(qBlue(pixels[x]) - qBlue(above[x]));
-            }
-        }
-        above = pixels;
-    }
-
-    // Level 2 of this compressor: faster than the usual library's fastest, and smaller.
-    thread_local std::unique_ptr<libdeflate_compressor, void (*)(libdeflate_compressor*)>
-        compressor(libdeflate_alloc_compressor(2), libdeflate_free_compressor);
-    if (!compressor) return false;
-    if (!packed.Reserve(libdeflate_zlib_compress_bound(compressor.get(), rowBytes))) return false;
-    const std::size_t packedSize = libdeflate_zlib_compress(compressor.get(), rows.data(), rowBytes,
-                                                            packed.data(), packed.size());
-    if (packedSize == 0) return false;
-
-    static constexpr unsigned char kSignature[8] = {0x89, 'P', 'N', 'G', '\r', '\n', 0x1A, '\n'};
-    bytes.reserve(static_cast<qsizetype>(packedSize + 128));
-    bytes.append(reinterpret_cast<const char*>(kSignature), 8);
-    unsigned char header[13];
-    PutBigEndian(header, static_cast<std::uint32_t>(width));
-    PutBigEndian(header + 4, static_cast<std::uint32_t>(height));
-    header[8] = 8;  // bits a sample
-    header[9] = 2;  // RGB
-    header[10] = 0; // deflate
-    header[11] = 0; // adaptive filtering
-    header[12] = 0; // not interlaced
-    AppendChunk(bytes, "IHDR", header, sizeof header);
-    unsigned char physical[9];
-    PutBigEndian(physical, static_cast<std::uint32_t>(image.dotsPerMeterX()));
-    PutBigEndian(physical + 4, static_cast<std::uint32_t>(image.dotsPerMeterY()));
-    physical[8] = 1; // metres
-    AppendChunk(bytes, "pHYs", physical, sizeof physical);
-    AppendChunk(bytes, "IDAT", packed.data(), packedSize);
-    AppendChunk(bytes, "IEND", nullptr, 0);
-    return true;
-}
-
-} // namespace
-
 bool EncodePng(const QImage& image, QByteArray& bytes) {
     bytes.clear();
-    if (image.format() == QImage::Format_RGB32) return EncodeOpaquePng(image, bytes);
+    if (image.format() == QImage::Format_RGB32) {
+        // The one encoder of chart pictures, shared with the raster surface.
+        std::string encoded;
+        const raster::PixelRows rows{reinterpret_cast<const std::uint32_t*>(image.constBits()),
+                                     image.width(), image.height(),
+                                     static_cast<std::size_t>(image.bytesPerLine()) / 4,
+                                     image.dotsPerMeterX()};
+        if (!raster::EncodeOpaquePng(rows, encoded)) return false;
+        bytes = QByteArray(encoded.data(), static_cast<qsizetype>(encoded.size()));
+        return true;
+    }
     QBuffer buffer(&bytes);
     buffer.open(QIODevice::WriteOnly);
     return image.save(&buffer, "PNG");

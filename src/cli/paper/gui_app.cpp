@@ -1,4 +1,4 @@
-#include "cli/gui_app.h"
+#include "cli/paper/gui_app.h"
 
 #include <QGuiApplication>
 

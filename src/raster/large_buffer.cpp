@@ -1,4 +1,4 @@
-#include "gui/paint/large_buffer.h"
+#include "raster/large_buffer.h"
 
 #include <cstdint>
 #include <new>
@@ -8,7 +8,7 @@
 #include <sys/mman.h>
 #endif
 
-namespace kori::gui {
+namespace kori::raster {
 
 namespace {
 constexpr std::size_t kLargePage = std::size_t{2} << 20;
@@ -80,4 +80,4 @@ void LargeBuffer::Release() {
     m_size = 0;
 }
 
-} // namespace kori::gui
+} // namespace kori::raster

@@ -5,7 +5,7 @@
 // hundreds of traps into one or two.
 #include <cstddef>
 
-namespace kori::gui {
+namespace kori::raster {
 
 class LargeBuffer {
 public:
@@ -32,4 +32,4 @@ private:
     std::size_t m_size = 0;
 };
 
-} // namespace kori::gui
+} // namespace kori::raster
