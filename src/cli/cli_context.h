@@ -52,6 +52,7 @@ std::string Printf(const char* format, ...) __attribute__((format(printf, 1, 2))
 
 // One function per subcommand; each adds itself to the app.
 void AddInitCommand(CLI::App& app, CliContext& ctx);
+void AddAboutCommand(CLI::App& app, CliContext& ctx);
 void AddNamesCommand(CLI::App& app, CliContext& ctx);
 void AddBarsCommand(CLI::App& app, CliContext& ctx);
 void AddListsCommand(CLI::App& app, CliContext& ctx);

@@ -1,5 +1,6 @@
 #include "cli/cli_context.h"
 
+#include "app/about.h"
 #include "app/folder_config.h"
 #include "app/install_root.h"
 #include "app/osc_service.h"
@@ -167,6 +168,11 @@ void AddInitCommand(CLI::App& app, CliContext& ctx) {
         }
         ctx.out << "Install root ready at " << root.string() << "\n" << report;
     });
+}
+
+void AddAboutCommand(CLI::App& app, CliContext& ctx) {
+    auto* cmd = app.add_subcommand("about", "The version, the install root and the folders in use");
+    cmd->callback([&ctx] { ctx.out << app::AboutText(ctx.OpenSession()) << "\n"; });
 }
 
 } // namespace kori::cli

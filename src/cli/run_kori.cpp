@@ -1,10 +1,12 @@
 #include "cli/run_kori.h"
 
+#include "app/about.h"
 #include "cli/cli_context.h"
 
 #include <CLI/CLI.hpp>
 
 #include <ostream>
+#include <string>
 
 namespace kori::cli {
 
@@ -12,7 +14,7 @@ int RunKori(int argc, const char* const* argv, std::ostream& out, std::ostream& 
     CLI::App app{"kori - KORI Charting from the command line"};
     app.require_subcommand(1);
     app.fallthrough(); // global options may follow the subcommand: kori names --root DIR
-    app.set_version_flag("--version", "kori 8.0");
+    app.set_version_flag("--version", "kori " + std::string(app::Version()));
     CliContext ctx(out, err);
     app.add_option("--root", ctx.root,
                    "Install root (holds Kori.ini); default $KORI_ROOT or ~/.local/share/kori")
@@ -21,6 +23,7 @@ int RunKori(int argc, const char* const* argv, std::ostream& out, std::ostream& 
         ->option_text("DIR");
 
     AddInitCommand(app, ctx);
+    AddAboutCommand(app, ctx);
     AddNamesCommand(app, ctx);
     AddBarsCommand(app, ctx);
     AddListsCommand(app, ctx);

@@ -69,6 +69,15 @@ protected:
 };
 TempRoot* KoriCommands::s_dir = nullptr;
 
+TEST_F(KoriCommands, AboutNamesTheVersionAndTheFolders) {
+    const auto r = Kori({"about"});
+    ASSERT_EQ(r.status, 0) << r.err;
+    EXPECT_EQ(r.out.rfind("KORI Charting\nVersion 8.0\n", 0), 0u) << r.out;
+    EXPECT_NE(r.out.find("Install root: " + Root() + "\n"), std::string::npos) << r.out;
+    EXPECT_NE(r.out.find("Data folder: " + Root() + "/data/"), std::string::npos) << r.out;
+    EXPECT_EQ(RunKoriWith({"--version"}).out, "kori 8.0\n");
+}
+
 TEST_F(KoriCommands, NamesInThreeFormats) {
     const auto codes = Kori({"names", "--codes"});
     ASSERT_EQ(codes.status, 0);

@@ -2,6 +2,7 @@
 
 #include "maint/security_details.h"
 
+#include "app/about.h"
 #include "app/window_position.h"
 #include "gui/services/qt_progress.h"
 #include "gui/widgets/window_place.h"
@@ -196,10 +197,7 @@ void MainWindow::closeEvent(QCloseEvent* e) {
 }
 
 QString MainWindow::AboutText() const {
-    return QStringLiteral("KORI Charting\nVersion %1\n\nEnd-of-day share-market charting.\n\n"
-                          "Install root: %2\nSystem folder: %3\nData folder: %4")
-        .arg(QStringLiteral(KORI_VERSION), QString::fromStdString(m_session.root().string()),
-             Q(m_session.folders.SystemFolder), Q(m_session.folders.DataFolder));
+    return QString::fromStdString(app::AboutText(m_session));
 }
 
 void MainWindow::ShowAbout() {
