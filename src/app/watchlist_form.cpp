@@ -1,5 +1,6 @@
 #include "app/watchlist_form.h"
 
+#include "platform/text.h"
 #include "store/targets_file.h"
 
 #include <algorithm>
@@ -132,6 +133,42 @@ int WatchlistForm::RowOf(const std::string& code) const {
     for (std::size_t i = 0; i < m_rows.size(); ++i)
         if (m_rows[i].Entry.Code == code) return static_cast<int>(i);
     return -1;
+}
+
+namespace {
+// A stored size: a whole number of twips from one pixel up to a large screen.
+int Twips(std::string_view text) {
+    const std::string t = platform::Trim(text);
+    if (t.empty() || t.find_first_not_of("0123456789") != std::string::npos || t.size() > 6)
+        return 0;
+    const int v = std::stoi(t);
+    return v >= 15 && v <= 200000 ? v : 0;
+}
+} // namespace
+
+WatchWindowPlace LoadWatchWindowPlace(const platform::SettingsStore& store) {
+    WatchWindowPlace place;
+    place.Width = Twips(store.Get("WatchWth", ""));
+    place.Height = Twips(store.Get("WatchHgt", ""));
+    const std::string cols = store.Get("WatchCols", "");
+    std::size_t start = 0;
+    while (start <= cols.size() && !cols.empty()) {
+        const std::size_t comma = std::min(cols.find(',', start), cols.size());
+        const int w = Twips(std::string_view(cols).substr(start, comma - start));
+        if (w == 0) return {place.Width, place.Height, {}}; // one bad width spoils the row
+        place.Columns.push_back(w);
+        start = comma + 1;
+    }
+    return place;
+}
+
+void SaveWatchWindowPlace(platform::SettingsStore& store, const WatchWindowPlace& place) {
+    store.Save("WatchWth", std::to_string(place.Width));
+    store.Save("WatchHgt", std::to_string(place.Height));
+    std::string cols;
+    for (const int w : place.Columns)
+        cols += (cols.empty() ? "" : ",") + std::to_string(w);
+    store.Save("WatchCols", cols);
 }
 
 } // namespace kori::app

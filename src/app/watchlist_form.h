@@ -12,6 +12,17 @@ namespace kori::app {
 
 inline constexpr const char* kWatchlistTitle = "Watchlist";
 
+// The window's size and column widths in the window store ("WatchWth", "WatchHgt" in twips,
+// "WatchCols" the widths in twips joined by commas); zeros and an empty list where nothing is
+// stored or a value does not read as a size.
+struct WatchWindowPlace {
+    int Width = 0;
+    int Height = 0;
+    std::vector<int> Columns;
+};
+WatchWindowPlace LoadWatchWindowPlace(const platform::SettingsStore& store);
+void SaveWatchWindowPlace(platform::SettingsStore& store, const WatchWindowPlace& place);
+
 class WatchlistForm {
 public:
     explicit WatchlistForm(Session& session);

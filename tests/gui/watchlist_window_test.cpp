@@ -102,5 +102,33 @@ TEST_F(DesktopTest, ChartWindowAddsItsSecurityAndOpensTheWatchlist) {
     EXPECT_NE(s.root.Read("Watchlists.txt").find("KRM,,,,"), std::string::npos);
 }
 
+// The window store keeps the size and column widths the user left it at, in twips; a stored
+// value that does not read as a size is passed over.
+TEST_F(DesktopTest, WatchlistReopensAtTheSizeAndColumnWidthsItWasLeftAt) {
+    auto& store = s.session.services().settings;
+    {
+        gui::Watchlist w(s.session, {});
+        w.resize(700, 500);
+        w.grid()->setColumnWidth(1, 180);
+        w.show();
+        w.hide();
+    }
+    EXPECT_EQ(store.Get("WatchWth", ""), "10500");
+    EXPECT_EQ(store.Get("WatchHgt", ""), "7500");
+    const auto place = app::LoadWatchWindowPlace(store);
+    ASSERT_GT(place.Columns.size(), 2u);
+    EXPECT_EQ(place.Columns[1], 180 * 15);
+    gui::Watchlist again(s.session, {});
+    EXPECT_EQ(again.size(), QSize(700, 500));
+    EXPECT_EQ(again.grid()->columnWidth(1), 180);
+
+    store.Save("WatchWth", "wide");
+    store.Save("WatchCols", "900,x,300");
+    const auto bad = app::LoadWatchWindowPlace(store);
+    EXPECT_EQ(bad.Width, 0);
+    EXPECT_EQ(bad.Height, 7500);
+    EXPECT_TRUE(bad.Columns.empty());
+}
+
 } // namespace
 } // namespace kori::test

@@ -1,6 +1,7 @@
 #include "gui/windows/watchlist.h"
 
 #include "gui/widgets/grid_view.h"
+#include "gui/widgets/window_place.h"
 #include "platform/date_text.h"
 #include "platform/files.h"
 #include "platform/text.h"
@@ -9,6 +10,7 @@
 #include <QFileDialog>
 #include <QHBoxLayout>
 #include <QHeaderView>
+#include <QHideEvent>
 #include <QLabel>
 #include <QLineEdit>
 #include <QPushButton>
@@ -137,7 +139,21 @@ Watchlist::Watchlist(app::Session& session, ShowChartOf showChart, QWidget* pare
         Show();
     });
     Show();
-    resize(620, 440);
+    // The size and column widths the user left it at, as the window store keeps them.
+    const auto place = app::LoadWatchWindowPlace(session.services().settings);
+    resize(place.Width > 0 ? place.Width / kTwipsPerPixel : 620,
+           place.Height > 0 ? place.Height / kTwipsPerPixel : 440);
+    if (static_cast<int>(place.Columns.size()) == m_grid->columnCount())
+        for (int c = 0; c < m_grid->columnCount(); ++c)
+            m_grid->setColumnWidth(c, place.Columns[static_cast<std::size_t>(c)] / kTwipsPerPixel);
+}
+
+void Watchlist::hideEvent(QHideEvent* e) {
+    app::WatchWindowPlace place{width() * kTwipsPerPixel, height() * kTwipsPerPixel, {}};
+    for (int c = 0; c < m_grid->columnCount(); ++c)
+        place.Columns.push_back(m_grid->columnWidth(c) * kTwipsPerPixel);
+    app::SaveWatchWindowPlace(m_session.services().settings, place);
+    QDialog::hideEvent(e);
 }
 
 void Watchlist::FillLists() {

@@ -36,6 +36,9 @@ public:
     void ShowChart();
     bool ExportCsv(const std::string& path);
 
+protected:
+    void hideEvent(QHideEvent* e) override;
+
 private:
     void FillLists();
     void Show();
