@@ -8,8 +8,8 @@
 #include "chart/screen_player.h"
 #include "chart/swing.h"
 #include "gui/paint/qt_surface.h"
-#include "gui/services/qt_printer.h"
 #include "gui/widgets/chart_view.h"
+#include "gui/windows/chart_paper.h"
 #include "gui/windows/cht_page.h"
 #include "osc/osc_identifiers.h"
 #include "platform/date_text.h"
@@ -540,38 +540,17 @@ void Chts::Zoom(double x, double y) {
     zoom->show();
 }
 
-void Chts::EnsurePrinterColours() {
-    const std::string path = m_session.folders.SystemFolder + "koriprn.dat";
-    if (auto colours = app::ReadPrinterFile(path)) {
-        m_session.printer = *colours;
-        return;
-    }
-    m_session.printer = app::AskPrinterColours(m_session.dialogs());
-    (void)app::WritePrinterFile(path, m_session.printer);
-}
-
 bool Chts::PrintTo(QPrinter& printer) {
-    EnsurePrinterColours();
-    if (!m_print) m_print = chart::LoadPrintSettings(m_session.ini());
-    m_print->PrintColour = m_session.printer.PrintColour;
-    m_print->PrintColourLines = m_session.printer.PrintColourLines;
     const QString before = m_panes[0]->text();
     SetPanes({chart::kPrintingStatus});
     QApplication::setOverrideCursor(Qt::WaitCursor);
-    QtPrinter paper(printer);
-    const QImage& shown = m_picture1->picture();
-    chart::PaperJob job{paper, m_session.palette, m_session.fonts,
-                        static_cast<double>(shown.width()), static_cast<double>(shown.height())};
     const std::filesystem::path source = m_model.showingSaved() ? std::filesystem::path(m_savedPath)
                                                                 : app::ChartStreamPath(m_session);
-    const auto outcome = chart::PrintChart(source, job, *m_print);
+    const bool printed =
+        PrintChartStream(m_session, m_print, source, printer, m_picture1->picture().size());
     QApplication::restoreOverrideCursor();
     m_panes[0]->setText(before);
-    if (outcome == chart::PlayOutcome::PrinterFailed) {
-        m_session.dialogs().MsgBox("The chart could not be printed", "Print Chart");
-        return false;
-    }
-    return true;
+    return printed;
 }
 
 void Chts::Print() {

@@ -122,7 +122,6 @@ private:
     void WithPicture(const std::function<void(platform::Surface&)>& draw);
     bool RebuildKeeping(bool keepToolLines);
     void DrawLegend();
-    void EnsurePrinterColours();
     void LeaveChart();
     std::string Code() const;
     QSize AreaSize() const;

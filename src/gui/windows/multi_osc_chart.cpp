@@ -4,8 +4,8 @@
 #include "chart/saved_chart.h"
 #include "chart/screen_player.h"
 #include "gui/paint/qt_surface.h"
-#include "gui/services/qt_printer.h"
 #include "gui/widgets/chart_view.h"
+#include "gui/windows/chart_paper.h"
 #include "platform/files.h"
 #include "platform/text.h"
 
@@ -153,31 +153,14 @@ bool MultiOscChart::Rebuild() {
 }
 
 bool MultiOscChart::PrintTo(QPrinter& printer) {
-    const std::string file = m_session.folders.SystemFolder + "koriprn.dat";
-    if (auto colours = app::ReadPrinterFile(file)) {
-        m_session.printer = *colours;
-    } else {
-        m_session.printer = app::AskPrinterColours(m_session.dialogs());
-        (void)app::WritePrinterFile(file, m_session.printer);
-    }
-    if (!m_print) m_print = chart::LoadPrintSettings(m_session.ini());
-    m_print->PrintColour = m_session.printer.PrintColour;
-    m_print->PrintColourLines = m_session.printer.PrintColourLines;
     const QString before = m_status->text();
     m_status->setText(QString::fromLatin1(chart::kPrintingStatus));
-    QtPrinter paper(printer);
-    const QImage& shown = m_picture->picture();
-    chart::PaperJob job{paper, m_session.palette, m_session.fonts,
-                        static_cast<double>(shown.width()), static_cast<double>(shown.height())};
     const std::filesystem::path source =
         showingSavedChart() ? std::filesystem::path(m_savedPath) : m_model.StreamPath();
-    const auto outcome = chart::PrintChart(source, job, *m_print);
+    const bool printed =
+        PrintChartStream(m_session, m_print, source, printer, m_picture->picture().size());
     m_status->setText(before);
-    if (outcome == chart::PlayOutcome::PrinterFailed) {
-        m_session.dialogs().MsgBox("The chart could not be printed", "Print Chart");
-        return false;
-    }
-    return true;
+    return printed;
 }
 
 void MultiOscChart::Print() {
